@@ -1,0 +1,257 @@
+#include "PropertyList/PlistValue.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+// Up to this many keys a walk over the entries is faster than a hash.
+constexpr std::size_t linearSearchLimit = 16;
+
+struct KeyHash {
+    using is_transparent = void;
+    std::size_t operator()(std::string_view key) const
+    {
+        return std::hash<std::string_view>{}(key);
+    }
+};
+
+} // namespace
+
+std::string PlistInteger::decimal() const
+{
+    return _negative ? fmt::format("{}", signedBits()) : fmt::format("{}", _bits);
+}
+
+PlistArray::PlistArray() : _values(std::make_shared<Storage>()) {}
+
+PlistArray::PlistArray(std::initializer_list<PlistValue> values)
+    : _values(std::make_shared<Storage>(values))
+{
+}
+
+std::size_t PlistArray::size() const
+{
+    return _values->size();
+}
+
+const PlistValue& PlistArray::operator[](std::size_t index) const
+{
+    return _values->at(index);
+}
+
+const PlistValue* PlistArray::begin() const
+{
+    return _values->data();
+}
+
+const PlistValue* PlistArray::end() const
+{
+    return _values->data() + _values->size();
+}
+
+void PlistArray::append(PlistValue value)
+{
+    _values->push_back(std::move(value));
+}
+
+void PlistArray::removeFirst(std::size_t count)
+{
+    const auto first = _values->begin();
+    _values->erase(first, first + static_cast<std::ptrdiff_t>(std::min(count, size())));
+}
+
+void PlistArray::clear()
+{
+    _values->clear();
+}
+
+void PlistArray::reserve(std::size_t count)
+{
+    _values->reserve(count);
+}
+
+PlistArray PlistArray::copy() const
+{
+    return PlistArray(std::make_shared<Storage>(*_values));
+}
+
+bool PlistArray::operator==(const PlistArray& other) const
+{
+    return isSameContainer(other) || *_values == *other._values;
+}
+
+struct PlistDictionary::Storage {
+    std::vector<Entry> entries;
+    // Key to place in `entries`; kept only once there are more than `linearSearchLimit` of them.
+    std::unordered_map<std::string, std::size_t, KeyHash, std::equal_to<>> places;
+
+    std::optional<std::size_t> place(std::string_view key) const
+    {
+        if (!places.empty()) {
+            const auto found = places.find(key);
+            return found == places.end() ? std::nullopt : std::optional(found->second);
+        }
+        for (std::size_t i = 0; i < entries.size(); ++i)
+            if (entries[i].key == key)
+                return i;
+        return std::nullopt;
+    }
+
+    void rebuildPlaces()
+    {
+        places.clear();
+        if (entries.size() > linearSearchLimit)
+            for (std::size_t i = 0; i < entries.size(); ++i)
+                places.emplace(entries[i].key, i);
+    }
+};
+
+PlistDictionary::PlistDictionary() : _storage(std::make_shared<Storage>()) {}
+
+PlistDictionary::PlistDictionary(
+    std::initializer_list<std::pair<std::string_view, PlistValue>> entries)
+    : PlistDictionary()
+{
+    for (const auto& [key, value] : entries)
+        set(key, value);
+}
+
+std::size_t PlistDictionary::size() const
+{
+    return _storage->entries.size();
+}
+
+const PlistValue* PlistDictionary::find(std::string_view key) const
+{
+    const auto place = _storage->place(key);
+    return place ? &_storage->entries[*place].value : nullptr;
+}
+
+PlistValue* PlistDictionary::find(std::string_view key)
+{
+    const auto place = _storage->place(key);
+    return place ? &_storage->entries[*place].value : nullptr;
+}
+
+void PlistDictionary::set(std::string_view key, PlistValue value)
+{
+    if (PlistValue* existing = find(key)) {
+        *existing = std::move(value);
+        return;
+    }
+    auto& [entries, places] = *_storage;
+    entries.push_back({std::string(key), std::move(value)});
+    if (!places.empty())
+        places.emplace(key, entries.size() - 1);
+    else if (entries.size() > linearSearchLimit)
+        _storage->rebuildPlaces();
+}
+
+bool PlistDictionary::remove(std::string_view key)
+{
+    const auto place = _storage->place(key);
+    if (!place)
+        return false;
+    _storage->entries.erase(_storage->entries.begin() + static_cast<std::ptrdiff_t>(*place));
+    _storage->rebuildPlaces();
+    return true;
+}
+
+void PlistDictionary::clear()
+{
+    _storage->entries.clear();
+    _storage->places.clear();
+}
+
+const PlistDictionary::Entry* PlistDictionary::begin() const
+{
+    return _storage->entries.data();
+}
+
+const PlistDictionary::Entry* PlistDictionary::end() const
+{
+    return _storage->entries.data() + _storage->entries.size();
+}
+
+PlistDictionary PlistDictionary::copy() const
+{
+    return PlistDictionary(std::make_shared<Storage>(*_storage));
+}
+
+bool PlistDictionary::operator==(const PlistDictionary& other) const
+{
+    if (isSameContainer(other))
+        return true;
+    return size() == other.size() && std::all_of(begin(), end(), [&](const Entry& entry) {
+               const PlistValue* value = other.find(entry.key);
+               return value != nullptr && *value == entry.value;
+           });
+}
+
+std::string_view PlistValue::kindName() const
+{
+    static constexpr std::array<std::string_view, 8> names{
+        "string", "integer", "real", "boolean", "date", "data", "array", "dictionary"};
+    return names.at(_value.index());
+}
+
+const Bytes* PlistValue::data() const
+{
+    const auto* data = std::get_if<std::shared_ptr<const Bytes>>(&_value);
+    return data ? data->get() : nullptr;
+}
+
+PlistValue PlistValue::copy() const
+{
+    if (const PlistArray* values = array())
+        return values->copy();
+    if (const PlistDictionary* entries = dictionary())
+        return entries->copy();
+    return *this;
+}
+
+bool PlistValue::operator==(const PlistValue& other) const
+{
+    if (kind() != other.kind())
+        return false;
+    if (const Bytes* bytes = data())
+        return *bytes == *other.data();
+    if (const double* number = real(); number && std::isnan(*number))
+        return std::isnan(*other.real());
+    return _value == other._value;
+}
+
+WeakContainer::WeakContainer(const PlistValue& value)
+{
+    if (const PlistArray* values = value.array())
+        _array = values->_values;
+    else if (const PlistDictionary* entries = value.dictionary())
+        _dictionary = entries->_storage;
+}
+
+std::optional<PlistArray> WeakContainer::array() const
+{
+    auto values = _array.lock();
+    return values ? std::optional(PlistArray(std::move(values))) : std::nullopt;
+}
+
+std::optional<PlistDictionary> WeakContainer::dictionary() const
+{
+    auto storage = _dictionary.lock();
+    return storage ? std::optional(PlistDictionary(std::move(storage))) : std::nullopt;
+}
+
+bool WeakContainer::refersTo(const PlistDictionary& dictionary) const
+{
+    return _dictionary.lock() == dictionary._storage;
+}
+
+} // namespace ventrik

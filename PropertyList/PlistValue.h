@@ -1,0 +1,196 @@
+#pragma once
+
+#include <concepts>
+#include <cstddef>
+#include <cstdint>
+#include <limits>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
+#include <variant>
+#include <vector>
+
+namespace ventrik
+{
+
+using Bytes = std::vector<std::uint8_t>;
+using ByteView = std::span<const std::uint8_t>;
+
+class PlistValue;
+
+/// A moment, in seconds since 1970-01-01 00:00 UTC.
+struct PlistDate {
+    double secondsSince1970 = 0;
+    bool operator==(const PlistDate&) const = default;
+};
+
+/// A whole number from -2^63 to 2^64 - 1, the range that property lists share.
+class PlistInteger
+{
+  public:
+    template <std::integral T>
+    requires(!std::same_as<T, bool>) constexpr PlistInteger(
+        T value) // NOLINT(google-explicit-constructor): a number is a number
+        : _bits(static_cast<std::uint64_t>(value)), _negative(std::cmp_less(value, 0))
+    {
+    }
+
+    /// The low 64 bits as a signed number: the value itself up to 2^63 - 1.
+    constexpr std::int64_t signedBits() const { return static_cast<std::int64_t>(_bits); }
+    constexpr std::uint64_t bits() const { return _bits; }
+    constexpr bool isNegative() const { return _negative; }
+    std::string decimal() const;
+    bool operator==(const PlistInteger&) const = default;
+
+  private:
+    std::uint64_t _bits;
+    bool _negative;
+};
+
+/// An ordered list of values. A handle: copies share one container; `copy` makes a new one.
+class PlistArray
+{
+  public:
+    PlistArray();
+    PlistArray(std::initializer_list<PlistValue> values);
+
+    std::size_t size() const;
+    bool empty() const { return size() == 0; }
+    const PlistValue& operator[](std::size_t index) const;
+    const PlistValue* begin() const;
+    const PlistValue* end() const;
+
+    void append(PlistValue value);
+    void removeFirst(std::size_t count);
+    void clear();
+    void reserve(std::size_t count);
+
+    /// A new array of the same elements; nested containers stay shared.
+    PlistArray copy() const;
+    bool isSameContainer(const PlistArray& other) const { return _values == other._values; }
+    bool operator==(const PlistArray& other) const;
+
+  private:
+    friend class WeakContainer;
+    using Storage = std::vector<PlistValue>;
+    explicit PlistArray(std::shared_ptr<Storage> values) : _values(std::move(values)) {}
+
+    std::shared_ptr<Storage> _values;
+};
+
+/// Values under string keys, in the order in which the keys were first set. A handle: copies share
+/// one container; `copy` makes a new one. Finding a key takes constant time.
+class PlistDictionary
+{
+  public:
+    struct Entry;
+
+    PlistDictionary();
+    PlistDictionary(std::initializer_list<std::pair<std::string_view, PlistValue>> entries);
+
+    std::size_t size() const;
+    bool empty() const { return size() == 0; }
+    bool contains(std::string_view key) const { return find(key) != nullptr; }
+
+    /// The value under the key, or null. Valid until the dictionary changes.
+    const PlistValue* find(std::string_view key) const;
+    PlistValue* find(std::string_view key);
+
+    /// Replaces the key's value in its place, or adds the key at the end.
+    void set(std::string_view key, PlistValue value);
+    bool remove(std::string_view key);
+    void clear();
+
+    const Entry* begin() const;
+    const Entry* end() const;
+
+    /// A new dictionary of the same entries; nested containers stay shared.
+    PlistDictionary copy() const;
+    bool isSameContainer(const PlistDictionary& other) const { return _storage == other._storage; }
+    /// Equal keys with equal values, in any order.
+    bool operator==(const PlistDictionary& other) const;
+
+  private:
+    friend class WeakContainer;
+    struct Storage;
+    explicit PlistDictionary(std::shared_ptr<Storage> storage) : _storage(std::move(storage)) {}
+
+    std::shared_ptr<Storage> _storage;
+};
+
+/// A property-list value. Copies of arrays and dictionaries share their container; strings and data
+/// are values (data is never changed once inside, so copies share its bytes).
+class PlistValue
+{
+  public:
+    enum class Kind { String, Integer, Real, Boolean, Date, Data, Array, Dictionary };
+
+    PlistValue(std::string value) : _value(std::move(value)) {}
+    PlistValue(std::string_view value) : _value(std::string(value)) {}
+    PlistValue(const char* value) : _value(std::string(value)) {}
+    template <std::integral T>
+    requires(!std::same_as<T, bool>) PlistValue(T value) : _value(PlistInteger(value)) {}
+    PlistValue(PlistInteger value) : _value(value) {}
+    PlistValue(double value) : _value(value) {}
+    PlistValue(std::same_as<bool> auto value) : _value(value) {}
+    PlistValue(PlistDate value) : _value(value) {}
+    PlistValue(Bytes value) : _value(std::make_shared<const Bytes>(std::move(value))) {}
+    PlistValue(PlistArray value) : _value(std::move(value)) {}
+    PlistValue(PlistDictionary value) : _value(std::move(value)) {}
+
+    Kind kind() const { return static_cast<Kind>(_value.index()); }
+    /// "string", "integer", "real", "boolean", "date", "data", "array" or "dictionary".
+    std::string_view kindName() const;
+
+    // Each gives the content when the value is of that kind, else null.
+    const std::string* string() const { return std::get_if<std::string>(&_value); }
+    const PlistInteger* integer() const { return std::get_if<PlistInteger>(&_value); }
+    const double* real() const { return std::get_if<double>(&_value); }
+    const bool* boolean() const { return std::get_if<bool>(&_value); }
+    const PlistDate* date() const { return std::get_if<PlistDate>(&_value); }
+    const Bytes* data() const;
+    const PlistArray* array() const { return std::get_if<PlistArray>(&_value); }
+    PlistArray* array() { return std::get_if<PlistArray>(&_value); }
+    const PlistDictionary* dictionary() const { return std::get_if<PlistDictionary>(&_value); }
+    PlistDictionary* dictionary() { return std::get_if<PlistDictionary>(&_value); }
+
+    /// The same value; an array's or dictionary's top level is new, nested containers stay shared.
+    PlistValue copy() const;
+
+    /// Deep equality; reals that are both not-a-number count as equal.
+    bool operator==(const PlistValue& other) const;
+
+  private:
+    std::variant<std::string, PlistInteger, double, bool, PlistDate, std::shared_ptr<const Bytes>,
+                 PlistArray, PlistDictionary>
+        _value;
+};
+
+struct PlistDictionary::Entry {
+    std::string key;
+    PlistValue value;
+};
+
+/// Refers to an array or a dictionary without keeping it alive.
+class WeakContainer
+{
+  public:
+    WeakContainer() = default;
+    /// Refers to nothing when the value is neither an array nor a dictionary.
+    explicit WeakContainer(const PlistValue& value);
+
+    /// The container, while somebody still owns it.
+    std::optional<PlistArray> array() const;
+    std::optional<PlistDictionary> dictionary() const;
+    bool refersTo(const PlistDictionary& dictionary) const;
+
+  private:
+    std::weak_ptr<PlistArray::Storage> _array;
+    std::weak_ptr<PlistDictionary::Storage> _dictionary;
+};
+
+} // namespace ventrik

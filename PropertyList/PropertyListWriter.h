@@ -1,0 +1,24 @@
+#pragma once
+
+#include "PropertyList/PlistValue.h"
+
+#include <optional>
+#include <string>
+
+namespace ventrik
+{
+
+/// The XML text, or one line that says which value could not be written.
+struct PropertyListWriting {
+    std::optional<std::string> text;
+    std::string error;
+
+    explicit operator bool() const { return text.has_value(); }
+};
+
+/// Writes the XML form: declaration, `<plist version="1.0">`, no document type line, tabs for
+/// levels. Refused: strings that are not UTF-8 or hold a character that XML cannot carry, dates
+/// outside the years 1 to 9999, nesting beyond `propertyListMaximumDepth`.
+PropertyListWriting writeXmlPropertyList(const PlistValue& value);
+
+} // namespace ventrik

@@ -1,0 +1,175 @@
+#include "PropertyList/PropertyListWriter.h"
+
+#include "PropertyList/Base64.h"
+#include "PropertyList/IsoDate.h"
+#include "PropertyList/NumberText.h"
+#include "PropertyList/PropertyListError.h"
+#include "PropertyList/PropertyListReader.h"
+#include "PropertyList/XmlText.h"
+
+#include <variant>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr std::size_t dataLineLength = 76;
+
+// Writes one document, knowing the way to the value at hand for indentation and errors.
+class XmlWriter
+{
+  public:
+    std::string write(const PlistValue& value)
+    {
+        _text = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">\n";
+        writeValue(value);
+        return std::move(_text) + "</plist>\n";
+    }
+
+  private:
+    using Step = std::variant<std::string_view, std::size_t>;
+
+    void writeValue(const PlistValue& value)
+    {
+        switch (value.kind()) {
+        case PlistValue::Kind::String:
+            return writeText("string", *value.string());
+        case PlistValue::Kind::Integer:
+            return writeElement("integer", value.integer()->decimal());
+        case PlistValue::Kind::Real:
+            return writeElement("real", formatReal(*value.real()));
+        case PlistValue::Kind::Boolean:
+            return writeLine(*value.boolean() ? "<true/>" : "<false/>");
+        case PlistValue::Kind::Date:
+            return writeDate(*value.date());
+        case PlistValue::Kind::Data:
+            return writeData(*value.data());
+        case PlistValue::Kind::Array:
+            return writeArray(*value.array());
+        case PlistValue::Kind::Dictionary:
+            return writeDictionary(*value.dictionary());
+        }
+    }
+
+    void indent() { _text.append(_path.size(), '\t'); }
+
+    void writeLine(std::string_view line)
+    {
+        indent();
+        _text += line;
+        _text += '\n';
+    }
+
+    void writeElement(std::string_view name, std::string_view content)
+    {
+        writeLine(fmt::format("<{0}>{1}</{0}>", name, content));
+    }
+
+    void writeText(std::string_view name, std::string_view text)
+    {
+        if (const auto problem = xmlTextProblem(text))
+            fail(fmt::format("in the {}, {}", name, *problem));
+        std::string escaped;
+        appendEscaped(escaped, text);
+        writeElement(name, escaped);
+    }
+
+    void writeDate(PlistDate date)
+    {
+        const auto text = formatIsoDate(date);
+        if (!text)
+            fail("the date is outside the years 1 to 9999");
+        writeElement("date", *text);
+    }
+
+    void writeData(const Bytes& data)
+    {
+        writeLine("<data>");
+        const std::string text = encodeBase64(data);
+        for (std::size_t start = 0; start < text.size(); start += dataLineLength)
+            writeLine(std::string_view(text).substr(start, dataLineLength));
+        writeLine("</data>");
+    }
+
+    void writeArray(const PlistArray& array)
+    {
+        if (array.empty())
+            return writeEmpty("<array/>");
+        writeLine("<array>");
+        for (std::size_t i = 0; i < array.size(); ++i) {
+            enter(i);
+            writeValue(array[i]);
+            _path.pop_back();
+        }
+        writeLine("</array>");
+    }
+
+    void writeDictionary(const PlistDictionary& dictionary)
+    {
+        if (dictionary.empty())
+            return writeEmpty("<dict/>");
+        writeLine("<dict>");
+        for (const PlistDictionary::Entry& entry : dictionary) {
+            enter(std::string_view(entry.key));
+            writeText("key", entry.key);
+            writeValue(entry.value);
+            _path.pop_back();
+        }
+        writeLine("</dict>");
+    }
+
+    void writeEmpty(std::string_view line)
+    {
+        checkDepth();
+        writeLine(line);
+    }
+
+    void enter(Step step)
+    {
+        checkDepth();
+        _path.push_back(step);
+    }
+
+    // A container at the path needs a level of its own.
+    void checkDepth() const
+    {
+        if (_path.size() == propertyListMaximumDepth)
+            fail(fmt::format("nesting deeper than {}", propertyListMaximumDepth));
+    }
+
+    [[noreturn]] void fail(std::string_view problem) const
+    {
+        failPropertyList("{}: {}", path(), problem);
+    }
+
+    // "/Key/0/Key", the way from the top to the value at hand; "/" is the top itself.
+    std::string path() const
+    {
+        std::string path;
+        for (const Step& step : _path) {
+            if (const auto* key = std::get_if<std::string_view>(&step))
+                path += "/" + printable(*key);
+            else
+                path += fmt::format("/{}", std::get<std::size_t>(step));
+        }
+        return path.empty() ? "/" : path;
+    }
+
+    std::string _text;
+    std::vector<Step> _path;
+};
+
+} // namespace
+
+PropertyListWriting writeXmlPropertyList(const PlistValue& value)
+{
+    try {
+        return {XmlWriter().write(value), {}};
+    } catch (const PropertyListError& error) {
+        return {std::nullopt, fmt::format("property list not written: {}", error.what())};
+    }
+}
+
+} // namespace ventrik

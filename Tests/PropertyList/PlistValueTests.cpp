@@ -1,0 +1,200 @@
+#include "PropertyList/PlistValue.h"
+
+#include <cmath>
+#include <limits>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+std::vector<std::string> keysOf(const PlistDictionary& dictionary)
+{
+    std::vector<std::string> keys;
+    for (const auto& entry : dictionary)
+        keys.push_back(entry.key);
+    return keys;
+}
+
+std::string numberedKey(int number)
+{
+    return "key" + std::to_string(number);
+}
+
+PlistDictionary numberedDictionary(int count)
+{
+    PlistDictionary dictionary;
+    for (int i = 0; i < count; ++i)
+        dictionary.set(numberedKey(i), i);
+    return dictionary;
+}
+
+} // namespace
+
+TEST(PlistValue, CopiesShareTheirContainer)
+{
+    PlistValue one = PlistArray{1, 2};
+    const PlistValue other = one;
+    one.array()->append(3);
+    EXPECT_EQ(other.array()->size(), 3U);
+    EXPECT_TRUE(one.array()->isSameContainer(*other.array()));
+}
+
+TEST(PlistValue, CopyMakesANewTopLevelAndSharesWhatIsNested)
+{
+    PlistValue inner = PlistDictionary{{"a", 1}};
+    PlistValue outer = PlistDictionary{{"inner", inner}};
+    PlistValue copy = outer.copy();
+    copy.dictionary()->set("more", true);
+    inner.dictionary()->set("a", 2);
+    EXPECT_FALSE(outer.dictionary()->contains("more"));
+    EXPECT_EQ(*copy.dictionary()->find("inner")->dictionary()->find("a"), PlistValue(2));
+}
+
+TEST(PlistValue, CopyOfAnArrayIsIndependent)
+{
+    PlistArray array{1};
+    PlistArray copy = array.copy();
+    copy.append(2);
+    EXPECT_EQ(array.size(), 1U);
+    EXPECT_FALSE(copy.isSameContainer(array));
+}
+
+TEST(PlistValue, NamesItsKind)
+{
+    EXPECT_EQ(PlistValue("a").kindName(), "string");
+    EXPECT_EQ(PlistValue(1).kindName(), "integer");
+    EXPECT_EQ(PlistValue(1.0).kindName(), "real");
+    EXPECT_EQ(PlistValue(true).kindName(), "boolean");
+    EXPECT_EQ(PlistValue(PlistDate{}).kindName(), "date");
+    EXPECT_EQ(PlistValue(Bytes{}).kindName(), "data");
+    EXPECT_EQ(PlistValue(PlistArray()).kindName(), "array");
+    EXPECT_EQ(PlistValue(PlistDictionary()).kindName(), "dictionary");
+}
+
+TEST(PlistValue, IsEqualDeeply)
+{
+    const auto make = [](int last) {
+        return PlistValue(PlistArray{PlistDictionary{{"a", PlistArray{"x", last}}}, Bytes{1, 2}});
+    };
+    EXPECT_EQ(make(1), make(1));
+    EXPECT_FALSE(make(1) == make(2));
+}
+
+TEST(PlistValue, IsNotEqualToAnotherKind)
+{
+    EXPECT_FALSE(PlistValue(1) == PlistValue(1.0));
+    EXPECT_FALSE(PlistValue(1) == PlistValue(true));
+    EXPECT_FALSE(PlistValue("1") == PlistValue(Bytes{'1'}));
+}
+
+TEST(PlistValue, NotANumberEqualsItself)
+{
+    EXPECT_EQ(PlistValue(std::nan("")), PlistValue(-std::nan("")));
+    EXPECT_FALSE(PlistValue(std::nan("")) == PlistValue(0.0));
+}
+
+TEST(PlistInteger, TellsLargeFromNegative)
+{
+    EXPECT_FALSE(PlistInteger(std::uint64_t{0xffffffffffffffff}) == PlistInteger(-1));
+    EXPECT_EQ(PlistInteger(std::uint64_t{0xffffffffffffffff}).decimal(), "18446744073709551615");
+    EXPECT_EQ(PlistInteger(std::numeric_limits<std::int64_t>::min()).decimal(),
+              "-9223372036854775808");
+}
+
+TEST(PlistArray, RemovesFromTheFront)
+{
+    PlistArray array{1, 2, 3};
+    array.removeFirst(2);
+    EXPECT_EQ(array, (PlistArray{3}));
+    array.removeFirst(5);
+    EXPECT_TRUE(array.empty());
+}
+
+TEST(PlistDictionary, KeepsTheOrderOfInsertionWhenAValueIsReplaced)
+{
+    PlistDictionary dictionary{{"b", 1}, {"a", 2}, {"c", 3}};
+    dictionary.set("b", 4);
+    EXPECT_THAT(keysOf(dictionary), testing::ElementsAre("b", "a", "c"));
+    EXPECT_EQ(*dictionary.find("b"), PlistValue(4));
+}
+
+TEST(PlistDictionary, RemovesKeysAndAddsThemAgainAtTheEnd)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}};
+    EXPECT_TRUE(dictionary.remove("a"));
+    EXPECT_FALSE(dictionary.remove("a"));
+    dictionary.set("a", 3);
+    EXPECT_THAT(keysOf(dictionary), testing::ElementsAre("b", "a"));
+}
+
+TEST(PlistDictionary, FindsEveryOfManyKeys)
+{
+    const PlistDictionary dictionary = numberedDictionary(40);
+    for (int i = 0; i < 40; ++i) {
+        ASSERT_TRUE(dictionary.contains(numberedKey(i)));
+        EXPECT_EQ(*dictionary.find(numberedKey(i)), PlistValue(i));
+    }
+    EXPECT_FALSE(dictionary.contains(numberedKey(40)));
+}
+
+TEST(PlistDictionary, FindsTheRestWhenManyKeysBecomeFew)
+{
+    PlistDictionary dictionary = numberedDictionary(18);
+    for (int i = 0; i < 4; ++i)
+        EXPECT_TRUE(dictionary.remove(numberedKey(i)));
+    EXPECT_EQ(dictionary.size(), 14U);
+    EXPECT_FALSE(dictionary.contains(numberedKey(3)));
+    EXPECT_EQ(*dictionary.find(numberedKey(17)), PlistValue(17));
+}
+
+TEST(PlistDictionary, IsEmptyAndUsableAfterClear)
+{
+    PlistDictionary dictionary = numberedDictionary(20);
+    dictionary.clear();
+    EXPECT_TRUE(dictionary.empty());
+    EXPECT_FALSE(dictionary.contains(numberedKey(1)));
+    dictionary.set("new", 1);
+    EXPECT_THAT(keysOf(dictionary), testing::ElementsAre("new"));
+}
+
+TEST(PlistDictionary, IsEqualInAnyOrder)
+{
+    EXPECT_EQ((PlistDictionary{{"a", 1}, {"b", 2}}), (PlistDictionary{{"b", 2}, {"a", 1}}));
+    EXPECT_FALSE((PlistDictionary{{"a", 1}}) == (PlistDictionary{{"b", 1}}));
+    EXPECT_FALSE((PlistDictionary{{"a", 1}}) == (PlistDictionary{{"a", 1}, {"b", 2}}));
+}
+
+TEST(WeakContainer, GivesTheContainerWhileSomebodyOwnsIt)
+{
+    std::optional<PlistValue> array = PlistArray{1};
+    const WeakContainer weak(*array);
+    ASSERT_TRUE(weak.array());
+    EXPECT_TRUE(weak.array()->isSameContainer(*array->array()));
+    EXPECT_FALSE(weak.dictionary());
+    array.reset();
+    EXPECT_FALSE(weak.array());
+}
+
+TEST(WeakContainer, KnowsItsDictionary)
+{
+    std::optional<PlistDictionary> dictionary = PlistDictionary();
+    const WeakContainer weak{PlistValue(*dictionary)};
+    EXPECT_TRUE(weak.refersTo(*dictionary));
+    EXPECT_FALSE(weak.refersTo(PlistDictionary()));
+    dictionary.reset();
+    EXPECT_FALSE(weak.dictionary());
+}
+
+TEST(WeakContainer, RefersToNothingForOtherValues)
+{
+    const WeakContainer weak{PlistValue("text")};
+    EXPECT_FALSE(weak.array());
+    EXPECT_FALSE(weak.dictionary());
+}
+
+} // namespace ventrik

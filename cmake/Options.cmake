@@ -1,0 +1,36 @@
+# One interface target carries the warnings, the include root and the sanitizers for all of ours.
+add_library(ventrik-options INTERFACE)
+target_include_directories(ventrik-options INTERFACE ${PROJECT_SOURCE_DIR})
+target_compile_options(ventrik-options INTERFACE
+  -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Werror)
+
+if(VENTRIK_SANITIZE)
+  target_compile_options(ventrik-options INTERFACE
+    -fsanitize=address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
+  target_link_options(ventrik-options INTERFACE -fsanitize=address,undefined)
+endif()
+
+if(VENTRIK_COVERAGE)
+  target_compile_options(ventrik-options INTERFACE --coverage -O0)
+  target_link_options(ventrik-options INTERFACE --coverage)
+endif()
+
+if(VENTRIK_FUZZ)
+  target_compile_options(ventrik-options INTERFACE
+    -fsanitize=fuzzer-no-link,address,undefined -fno-omit-frame-pointer)
+  target_link_options(ventrik-options INTERFACE -fsanitize=address,undefined)
+endif()
+
+# ventrik_library(NAME sources...): one library of ours, with the house options.
+function(ventrik_library name)
+  add_library(${name} STATIC ${ARGN})
+  target_link_libraries(${name} PUBLIC ventrik-options)
+endfunction()
+
+# ventrik_test(NAME LIBRARIES ... SOURCES ...): a GoogleTest program whose tests ctest knows one by one.
+function(ventrik_test name)
+  cmake_parse_arguments(ARG "" "" "LIBRARIES;SOURCES;PROPERTIES" ${ARGN})
+  add_executable(${name} ${ARG_SOURCES})
+  target_link_libraries(${name} PRIVATE ${ARG_LIBRARIES} ventrik-options GTest::gmock)
+  gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120 ${ARG_PROPERTIES})
+endfunction()

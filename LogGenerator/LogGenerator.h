@@ -1,0 +1,62 @@
+#pragma once
+
+#include "LogGenerator/GeneratorServices.h"
+#include "PropertyList/PlistValue.h"
+
+#include <memory>
+#include <optional>
+#include <string_view>
+
+namespace ventrik
+{
+
+/// Turns the log messages of one radio technology into a display object.
+///
+/// A generator keeps what it knows in the state dictionary, which the monitor model owns and hands
+/// to every operation; only generators write it. Its keys: "History", "DisplayState", "Display",
+/// "ExtraInfo", "Template", "Lookup", and "DisplayOwner", which names the template or the kind of
+/// generator that made the display.
+///
+/// Construction is silent; each concrete class's `generator` runs its `init`, a member because its
+/// log lines belong in the middle of the subclass's own.
+class LogGenerator
+{
+  public:
+    virtual ~LogGenerator() = default;
+    LogGenerator(const LogGenerator&) = delete;
+    LogGenerator& operator=(const LogGenerator&) = delete;
+
+    /// Folds one log message, opaque bytes as they arrived, into the state.
+    virtual void updateState(PlistDictionary& state, ByteView data) = 0;
+    /// The display object, after it was recorded in the history; none while there is nothing.
+    virtual std::optional<PlistValue> generateLogUsingState(PlistDictionary& state) = 0;
+    /// The command that makes the telephony service stream.
+    virtual PlistDictionary getStartCommand() const = 0;
+    /// The "Data" of a snapshot file.
+    virtual PlistValue getSaveContentsFromState(const PlistDictionary& state) const = 0;
+
+    /// A new generator for the service's technology identifier, or none if it is unknown.
+    static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,
+                                                                 const GeneratorServices& services);
+
+    /// Records the state's display in its history, which never holds more than 5 entries.
+    static void updateHistoryInState(PlistDictionary& state, const Clock& clock);
+
+  protected:
+    explicit LogGenerator(const GeneratorServices& services) : _services(services) {}
+
+    void init();
+
+    /// Drops the display of another technology's generator from the state, so that its values are
+    /// not taken for ours after the baseband changed its technology. The history stays.
+    static void claimDisplay(PlistDictionary& state, std::string_view owner);
+
+    SystemLog& log() const { return _services.log; }
+    const Resources& resources() const { return _services.resources; }
+    const Clock& clock() const { return _services.clock; }
+
+  private:
+    GeneratorServices _services;
+};
+
+} // namespace ventrik

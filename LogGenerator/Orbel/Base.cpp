@@ -1,0 +1,90 @@
+#include "LogGenerator/Orbel/Base.h"
+
+#include "LogGenerator/Orbel/ArrayLock.h"
+
+#include <algorithm>
+#include <array>
+
+namespace ventrik
+{
+
+namespace
+{
+
+struct EcnoStep {
+    std::uint32_t from;
+    std::int16_t value;
+};
+
+// From the top; the first step that the raw value reaches counts. The last two rungs are both -31.
+constexpr std::array<EcnoStep, 33> ecnoSteps{{
+    {524288, 0},  {417648, -1}, {331809, -2}, {263625, -3}, {209464, -4}, {166442, -5},
+    {132269, -6}, {105124, -7}, {83563, -8},  {66436, -9},  {52831, -10}, {42024, -11},
+    {33441, -12}, {26622, -13}, {21206, -14}, {16904, -15}, {13487, -16}, {10772, -17},
+    {8616, -18},  {6903, -19},  {5543, -20},  {4462, -21},  {3604, -22},  {2922, -23},
+    {2241, -24},  {1950, -25},  {1608, -26},  {1337, -27},  {1121, -28},  {950, -29},
+    {814, -30},   {757, -31},   {706, -31},
+}};
+
+} // namespace
+
+void Base::initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDictionary)
+{
+    classDictionary[getSectionName()] = this;
+    updateLogCodeDict(codeDictionary);
+}
+
+void Base::updateSectionRef(const PlistValue& container)
+{
+    sectionRef = WeakContainer(container);
+    log().warning("{}", getSectionName());
+}
+
+void Base::updateLogCodeDict(CodeDictionary& codeDictionary)
+{
+    const auto codes = getLogCodeArray();
+    log().warning("Array Count: {}", codes.size());
+    for (const std::uint32_t code : codes)
+        codeDictionary.append(code, *this);
+}
+
+void Base::clearElementsInArray(PlistArray& array)
+{
+    const ArrayLock::Scope locked;
+    array.clear();
+}
+
+void Base::replaceArray(PlistArray& array, const PlistArray& newElements)
+{
+    const ArrayLock::Scope locked;
+    array.clear();
+    array.reserve(newElements.size());
+    for (const PlistValue& element : newElements)
+        array.append(element);
+}
+
+std::int16_t Base::lookUpECNO(std::uint32_t rawValue)
+{
+    const auto* step = std::ranges::find_if(
+        ecnoSteps, [&](std::uint32_t from) { return rawValue >= from; }, &EcnoStep::from);
+    return step == ecnoSteps.end() ? std::int16_t{0} : step->value;
+}
+
+void Base::show(std::string_view key, std::string value) const
+{
+    if (auto dictionary = sectionRef.dictionary())
+        dictionary->set(key, std::move(value));
+}
+
+void Base::withdraw(std::string_view key) const
+{
+    if (auto dictionary = sectionRef.dictionary())
+        dictionary->remove(key);
+}
+
+void Base::logUnknownMessage(std::uint32_t logCode) const
+{
+    log().error("Received an unknown log message: {}", static_cast<std::int32_t>(logCode));
+}
+
+} // namespace ventrik

@@ -1,0 +1,25 @@
+#include "LogGenerator/Orbel/LogPacket.h"
+
+#include <algorithm>
+
+namespace ventrik
+{
+
+ByteView LogPacket::payload() const
+{
+    return _bytes.subspan(std::min(logPacketHeaderSize, _bytes.size()));
+}
+
+ByteView stripPrefix(ByteView data)
+{
+    constexpr std::uint8_t prefixMark = 0x81;
+    return data.size() >= 2 && data[0] == prefixMark ? data.subspan(2) : data;
+}
+
+std::uint32_t effectiveLogCode(const LogPacket& packet)
+{
+    const std::uint32_t code = packet.u16(3);
+    return packet.u8(0) == extraCodePacketType ? code | extraCodeBase : code;
+}
+
+} // namespace ventrik

@@ -1,0 +1,99 @@
+#include "LogGenerator/Orbel/OrbelLogGenerator.h"
+
+#include "LogGenerator/Orbel/BuildDate.h"
+#include "LogGenerator/Orbel/ETLDLF.h"
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+// Facility 2 at emergency level: the DLF writer's failures stand apart from all others.
+constexpr int dlfPriority = 16;
+
+} // namespace
+
+void OrbelLogGenerator::init()
+{
+    LogGenerator::init();
+    _binData.emplace();
+}
+
+void OrbelLogGenerator::keepPacket(ByteView packet)
+{
+    if (_binData)
+        _binData->insert(_binData->end(), packet.begin(), packet.end());
+}
+
+void OrbelLogGenerator::storePacketsInState(PlistDictionary& state)
+{
+    if (_binData)
+        state.set("DisplayState", std::exchange(*_binData, {}));
+}
+
+std::optional<Bytes> OrbelLogGenerator::makeVersionReport() const
+{
+    const auto version = resources().applicationVersion();
+    const auto versionText = version ? fmt::format("Ventrik {}", *version) : "(none)";
+    const auto now = clock().now();
+    const auto zone = clock().timeZone(now);
+    const auto seconds = std::chrono::floor<std::chrono::seconds>(now).time_since_epoch().count();
+    const ETLDLFTimeRecord time{static_cast<std::uint32_t>(seconds),
+                                static_cast<std::int16_t>(zone.secondsFromUtc / 60),
+                                static_cast<std::uint8_t>(zone.isDaylightSaving)};
+
+    Bytes report(etlDLFVersionReportSize);
+    std::size_t written = 0;
+    const int result =
+        ETLDLFAddVersionReport(report.data(), report.size(), &written, 1, 1, versionText.c_str(),
+                               "EXECUTABLE_NAME", buildDate(), &time);
+    if (result != etlDLFSuccess) {
+        log().log(dlfPriority, "Could not write DLF header (result={})", result);
+        return std::nullopt;
+    }
+    return report;
+}
+
+std::optional<Bytes> OrbelLogGenerator::generateDlfFromState(const PlistDictionary& state) const
+{
+    auto dlf = makeVersionReport();
+    const PlistValue* history = state.find("History");
+    if (!dlf || !history || !history->array())
+        return dlf;
+
+    for (const PlistValue& entry : *history->array()) {
+        const PlistDictionary* period = entry.dictionary();
+        const PlistValue* displayState = period ? period->find("DisplayState") : nullptr;
+        if (!displayState)
+            continue;
+        const Bytes* packets = displayState->data();
+        if (!packets) {
+            log().log(dlfPriority,
+                      "Got wrong class writing history to DLF; aborting writing the DLF file");
+            return std::nullopt;
+        }
+        // Without its leading type byte a packet has the layout of a DLF record. Only the first
+        // packet of a period is cut this way.
+        if (packets->size() >= 2)
+            dlf->insert(dlf->end(), packets->begin() + 1, packets->end());
+    }
+    return dlf;
+}
+
+PlistValue OrbelLogGenerator::getSaveContentsFromState(const PlistDictionary& state) const
+{
+    const PlistValue* history = state.find("History");
+    PlistArray contents = history && history->array() ? history->array()->copy() : PlistArray();
+    if (auto dlf = generateDlfFromState(state)) {
+        PlistDictionary entry;
+        entry.set("Description", fmt::format("DLF binary ({} bytes)", dlf->size()));
+        entry.set("DLF", std::move(*dlf));
+        contents.append(std::move(entry));
+    }
+    return contents;
+}
+
+} // namespace ventrik

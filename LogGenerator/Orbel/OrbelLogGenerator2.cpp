@@ -1,0 +1,182 @@
+#include "LogGenerator/Orbel/OrbelLogGenerator2.h"
+
+#include "PropertyList/PropertyListReader.h"
+
+#include <charconv>
+
+namespace ventrik
+{
+
+OrbelLogGenerator2::~OrbelLogGenerator2()
+{
+    log().warning("Orbel_GSMLogGenerator is destructed {}", fmt::ptr(this));
+}
+
+void OrbelLogGenerator2::initWithPListName(std::string templateName,
+                                           std::shared_ptr<ClassIndex> classIndex)
+{
+    log().error("Creating OrbelLogGenerator2 object with {}", fmt::ptr(classIndex.get()));
+    OrbelLogGenerator::init();
+    pListName = std::move(templateName);
+    cIndex = std::move(classIndex);
+    log().error("Class Index: {}", cIndex.use_count());
+}
+
+void OrbelLogGenerator2::updateState(PlistDictionary& state, ByteView data)
+{
+    // The display comes first, so that the sections are bound before the packet is decoded.
+    getDisplayFromState(state);
+    updateWithData(data);
+    keepPacket(data);
+}
+
+void OrbelLogGenerator2::updateWithData(ByteView data)
+{
+    if (data.size() < logPacketHeaderSize)
+        return;
+    const LogPacket packet(stripPrefix(data));
+    const std::uint8_t type = packet.u8(0);
+    if (type != ordinaryPacketType && type != extraCodePacketType) {
+        log().error("Invalid log type: {:x}. Dropping.", type);
+        return;
+    }
+    const std::uint32_t logCode = effectiveLogCode(packet);
+    const auto* subscribers = cIndex ? cIndex->getSubscribers(logCode) : nullptr;
+    if (!subscribers)
+        return;
+    for (Base* section : *subscribers)
+        section->updateWithData(packet, logCode);
+}
+
+std::optional<PlistValue> OrbelLogGenerator2::generateLogUsingState(PlistDictionary& state)
+{
+    auto display = getDisplayFromState(state);
+    storePacketsInState(state);
+    updateHistoryInState(state, clock());
+    return display;
+}
+
+std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionary& state)
+{
+    claimDisplay(state, pListName);
+    if (const PlistValue* display = state.find("Display")) {
+        // After a restart the display of the generator before us is still in the state: values go
+        // on where they stood, so our sections take over its containers.
+        if (display->dictionary() && !_boundDisplay.refersTo(*display->dictionary())) {
+            bindSections(*display);
+            _boundDisplay = WeakContainer(*display);
+        }
+        return *display;
+    }
+
+    const auto displayTemplate = loadTemplate(state);
+    if (!displayTemplate)
+        return std::nullopt;
+    log().warning("Initialized class index: {}, Self: {}", fmt::ptr(cIndex.get()), fmt::ptr(this));
+    if (cIndex)
+        cIndex->status();
+    if (const auto display = processTemplate(*displayTemplate)) {
+        printDict(*display);
+        _boundDisplay = WeakContainer(*display);
+        state.set("Display", *display);
+        state.set("ExtraInfo", PlistDictionary());
+    }
+    return std::nullopt;
+}
+
+std::optional<PlistValue> OrbelLogGenerator2::loadTemplate(PlistDictionary& state)
+{
+    if (const PlistValue* loaded = state.find("Template"))
+        return *loaded;
+    const auto path = resources().path(pListName, "plist");
+    const auto contents = path ? resources().contents(*path) : std::nullopt;
+    const auto reading = contents ? readPropertyList(*contents) : PropertyListReading{};
+    if (!reading || !reading.value->dictionary()) {
+        log().error("Cannot load template for display");
+        return std::nullopt;
+    }
+    state.set("Template", *reading.value);
+    return *reading.value;
+}
+
+std::optional<PlistValue> OrbelLogGenerator2::processTemplate(const PlistValue& value)
+{
+    if (value.string())
+        return value;
+    if (const PlistArray* elements = value.array()) {
+        PlistArray result;
+        for (const PlistValue& element : *elements) {
+            auto processed = processTemplate(element);
+            if (!processed)
+                return std::nullopt;
+            result.append(std::move(*processed));
+        }
+        return result;
+    }
+    if (const PlistDictionary* entries = value.dictionary()) {
+        PlistDictionary result;
+        for (const auto& [key, entry] : *entries) {
+            auto processed = processTemplate(entry);
+            if (!processed)
+                return std::nullopt;
+            bindSection(key, *processed);
+            result.set(key, std::move(*processed));
+        }
+        return result;
+    }
+    log().error("Received an object of unknown type");
+    log().warning("Processing the template");
+    return std::nullopt;
+}
+
+void OrbelLogGenerator2::bindSection(std::string_view name, const PlistValue& container)
+{
+    if (Base* section = cIndex ? cIndex->getClass(name) : nullptr)
+        section->updateSectionRef(container);
+}
+
+void OrbelLogGenerator2::bindSections(const PlistValue& value)
+{
+    if (const PlistArray* elements = value.array())
+        for (const PlistValue& element : *elements)
+            bindSections(element);
+    if (const PlistDictionary* entries = value.dictionary())
+        for (const auto& [key, entry] : *entries) {
+            bindSections(entry);
+            bindSection(key, entry);
+        }
+}
+
+void OrbelLogGenerator2::printDict(const PlistValue& value) const
+{
+    if (value.string())
+        return;
+    if (const PlistDictionary* entries = value.dictionary())
+        for (const auto& [key, entry] : *entries)
+            printDict(entry);
+    else if (const PlistArray* elements = value.array())
+        for (const PlistValue& element : *elements)
+            printDict(element);
+    else
+        log().error("Received an object of unknown type");
+}
+
+PlistDictionary OrbelLogGenerator2::getStartCommand() const
+{
+    PlistArray logCodes;
+    PlistArray extraCodes;
+    if (cIndex) {
+        for (const std::string& text : cIndex->getAllLogCodes()) {
+            std::uint32_t code = 0;
+            std::from_chars(text.data(), text.data() + text.size(), code);
+            if (code >= extraCodeBase)
+                extraCodes.append(code - extraCodeBase);
+            else
+                logCodes.append(code);
+        }
+    }
+    return {
+        {"SetState", "Streaming"}, {"SetOrbelLogCodes", logCodes}, {"SetQxExtraCodes", extraCodes}};
+}
+
+} // namespace ventrik

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "LogGenerator/Orbel/ClassIndex.h"
+#include "LogGenerator/Orbel/OrbelLogGenerator.h"
+
+#include <memory>
+#include <string>
+
+namespace ventrik
+{
+
+/// The generator of the technologies whose display is described by a template: it copies the
+/// template into the live display, binds each section to its part of it, and routes every packet to
+/// the sections that want its log code.
+///
+/// The display lives in the state dictionary and is updated in place; it is built on the first
+/// packet or the first generation, whichever comes first.
+class OrbelLogGenerator2 : public OrbelLogGenerator
+{
+  public:
+    ~OrbelLogGenerator2() override;
+
+    void updateState(PlistDictionary& state, ByteView data) override;
+    std::optional<PlistValue> generateLogUsingState(PlistDictionary& state) override;
+    PlistDictionary getStartCommand() const override;
+
+    /// Routes one packet, as it arrived, to the subscribed sections.
+    void updateWithData(ByteView data);
+    /// The copy of a template value, its sections bound to their containers; none when it holds a
+    /// value of a kind that no template may hold.
+    std::optional<PlistValue> processTemplate(const PlistValue& value);
+    /// Reports values of unknown kinds in a display; prints nothing else.
+    void printDict(const PlistValue& value) const;
+    /// The display. The call that builds it returns none; only later calls return it.
+    std::optional<PlistValue> getDisplayFromState(PlistDictionary& state);
+
+  protected:
+    using OrbelLogGenerator::OrbelLogGenerator;
+
+    void initWithPListName(std::string templateName, std::shared_ptr<ClassIndex> classIndex);
+
+  private:
+    std::optional<PlistValue> loadTemplate(PlistDictionary& state);
+    void bindSection(std::string_view name, const PlistValue& container);
+    void bindSections(const PlistValue& value);
+
+    std::string pListName;
+    std::shared_ptr<ClassIndex> cIndex;
+    // The display that our sections are bound to.
+    WeakContainer _boundDisplay;
+};
+
+} // namespace ventrik

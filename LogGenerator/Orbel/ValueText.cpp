@@ -1,0 +1,33 @@
+#include "LogGenerator/Orbel/ValueText.h"
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+std::string decimal(std::int32_t value)
+{
+    return fmt::format("{}", value);
+}
+
+std::string wholeDb(std::int32_t value)
+{
+    return fmt::format("{} dB", value);
+}
+
+std::string wholeDbm(std::int32_t value)
+{
+    return fmt::format("{} dBm", value);
+}
+
+std::string db(double value)
+{
+    return fmt::format("{:4.2f} dB", value);
+}
+
+std::string dbm(double value)
+{
+    return fmt::format("{:4.2f} dBm", value);
+}
+
+} // namespace ventrik

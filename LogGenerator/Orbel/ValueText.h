@@ -1,0 +1,22 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+namespace ventrik
+{
+
+// How decoded numbers are shown.
+
+/// "%d"
+std::string decimal(std::int32_t value);
+/// "%d dB"
+std::string wholeDb(std::int32_t value);
+/// "%d dBm"
+std::string wholeDbm(std::int32_t value);
+/// "%4.2f dB"
+std::string db(double value);
+/// "%4.2f dBm"
+std::string dbm(double value);
+
+} // namespace ventrik

@@ -1,0 +1,81 @@
+#pragma once
+
+#include "PropertyList/PlistValue.h"
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace ventrik
+{
+
+class VentrikModelNode;
+
+using ModelNodePointer = std::shared_ptr<const VentrikModelNode>;
+/// Nodes by path. Of several nodes with one path the one built last stays.
+using PathIndex = std::unordered_map<std::string, ModelNodePointer>;
+
+/// A node of the display tree: what a pane shows as one row, or one level deeper as a screen. Nodes
+/// never change; a new display gives a new tree.
+class VentrikModelNode
+{
+  public:
+    using Children = std::vector<ModelNodePointer>;
+
+    explicit VentrikModelNode(std::string name) : _name(std::move(name)) {}
+    virtual ~VentrikModelNode() = default;
+    VentrikModelNode(const VentrikModelNode&) = delete;
+    VentrikModelNode& operator=(const VentrikModelNode&) = delete;
+
+    const std::string& displayName() const { return _name; }
+    /// Null for a leaf; present, and possibly empty, for an inner node.
+    virtual const Children* childNodes() const { return nullptr; }
+    /// Null for an inner node.
+    virtual const std::string* value() const { return nullptr; }
+
+    /// Builds the tree of a display object with its root "Ventrik" at the path "/", and fills the
+    /// path index. No object gives a root leaf "(unknown)".
+    static ModelNodePointer makeTreeFromObject(const PlistValue* object, PathIndex& index);
+
+  private:
+    std::string _name;
+};
+
+/// A name with a value.
+class VentrikModelLeafNode : public VentrikModelNode
+{
+  public:
+    static ModelNodePointer initWithName(std::string name, std::string value);
+
+    VentrikModelLeafNode(std::string name, std::string value)
+        : VentrikModelNode(std::move(name)), _string(std::move(value))
+    {
+    }
+    const std::string* value() const override { return &_string; }
+
+  private:
+    std::string _string;
+};
+
+/// A name with children, in display order.
+class VentrikModelTreeNode : public VentrikModelNode
+{
+  public:
+    static ModelNodePointer initWithName(std::string name, Children children);
+
+    VentrikModelTreeNode(std::string name, Children children)
+        : VentrikModelNode(std::move(name)), _childNodes(std::move(children))
+    {
+    }
+    const Children* childNodes() const override { return &_childNodes; }
+
+  private:
+    Children _childNodes;
+};
+
+/// The path of a child: exactly one "/" between the two, none doubled.
+std::string pathJoining(std::string_view path, std::string_view name);
+
+} // namespace ventrik

@@ -1,0 +1,81 @@
+#pragma once
+
+#include "Platform/MainQueue.h"
+#include "Platform/MessagePorts.h"
+#include "Platform/SystemLog.h"
+#include "TelephonyService/MessageSource.h"
+
+#include <deque>
+#include <functional>
+#include <memory>
+#include <string>
+#include <unordered_set>
+
+namespace ventrik
+{
+
+/// What a log channel serves: the technology's identifier and how to make its messages.
+struct LogChannelContent {
+    std::string technology;
+    std::function<std::unique_ptr<MessageSource>()> makeSource;
+};
+
+/// The service's end of one log channel: answers "GetTechnology", takes the start command and then
+/// streams the messages whose codes were asked for to the client's local port.
+///
+/// It never waits for a client: what a slow one does not take in time is kept up to a bound; above
+/// that the oldest messages are dropped, counted, and the count is logged.
+class LogChannel
+{
+  public:
+    static constexpr std::size_t maximumQueuedMessages = 1000;
+    static constexpr std::size_t maximumQueuedBytes = std::size_t{4} << 20;
+    static constexpr std::chrono::milliseconds tickInterval{50};
+
+    /// `clientPort` is the client's local port.
+    LogChannel(MainQueue& queue, SystemLog& log, const LogChannelContent& content,
+               std::shared_ptr<RemotePort> clientPort);
+    ~LogChannel();
+    LogChannel(const LogChannel&) = delete;
+    LogChannel& operator=(const LogChannel&) = delete;
+
+    const std::string& clientPortName() const { return _clientPort->name(); }
+    bool isClientAlive() const { return _clientPort->isValid(); }
+
+    /// Takes one command; the reply, where the command has one.
+    std::optional<Bytes> handleCommand(ByteView command);
+
+    std::size_t droppedCount() const { return _dropped; }
+
+  private:
+    void startStreaming(const PlistDictionary& command);
+    void tick();
+    void queueDueMessages();
+    void streamUnpaced();
+    void enqueue(Bytes message);
+    /// False when the client takes no more for now.
+    bool sendQueued();
+    bool isWanted(ByteView message) const;
+    void fetchNext();
+    void reportDrops();
+
+    MainQueue& _queue;
+    SystemLog& _log;
+    const LogChannelContent& _content;
+    std::shared_ptr<RemotePort> _clientPort;
+
+    bool _wantsAllCodes = false;
+    std::unordered_set<std::uint64_t> _wantedCodes;
+    std::unique_ptr<MessageSource> _source;
+    std::optional<TimedMessage> _next;
+    std::unique_ptr<RepeatingTimer> _timer;
+    std::chrono::nanoseconds _elapsed{};
+
+    std::deque<Bytes> _outgoing;
+    std::size_t _outgoingBytes = 0;
+    std::size_t _dropped = 0;
+    std::size_t _droppedReported = 0;
+    int _ticksSinceReport = 0;
+};
+
+} // namespace ventrik

@@ -1,0 +1,39 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+struct option;
+
+namespace ventrik
+{
+
+/// Walks over a program's options (getopt_long's table) and refuses what is wrong in one line on
+/// standard error, with exit status 2.
+class CommandLine
+{
+  public:
+    CommandLine(std::string_view program, int argc, char** argv);
+
+    /// The next option's letter, or -1 after the last; `value` is then its value.
+    int next(const option* options);
+    const char* value() const { return _value; }
+    /// What stands behind the options.
+    std::vector<std::string> arguments() const;
+
+    [[noreturn]] void refuse(std::string_view reason) const;
+    /// A positive number; anything else is refused under the option's name.
+    double positiveNumber(std::string_view option) const;
+
+  private:
+    std::string_view _program;
+    int _argc;
+    char** _argv;
+    const char* _value = nullptr;
+};
+
+/// Prints to standard output and ends the program with success: for --help and --version.
+[[noreturn]] void tell(std::string_view text);
+
+} // namespace ventrik

@@ -1,0 +1,238 @@
+#include "Tools/DecodeCommand.h"
+
+#include "Capture/SnapshotFile.h"
+#include "LogGenerator/DateText.h"
+#include "Model/TreePrinter.h"
+#include "Platform/Linux/LinuxClock.h"
+#include "Platform/Linux/LinuxResources.h"
+#include "Tools/FileSystemLog.h"
+#include "Tools/Json.h"
+#include "Tools/OfflineDecoder.h"
+
+#include <atomic>
+#include <cerrno>
+#include <cstring>
+
+#include <fmt/format.h>
+#include <unistd.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+std::atomic<bool> interrupted = false;
+static_assert(std::atomic<bool>::is_always_lock_free);
+
+void complain(std::string_view text)
+{
+    fmt::print(stderr, "ventrik-decode: {}\n", text);
+}
+
+/// How far the decoder has come, on standard error while that is a terminal.
+class Progress
+{
+  public:
+    ~Progress()
+    {
+        if (_shown)
+            fmt::print(stderr, "\r\033[K");
+    }
+
+    void count(std::size_t messages)
+    {
+        if (messages % interval != 0 || !isatty(STDERR_FILENO))
+            return;
+        fmt::print(stderr, "\r{} messages", messages);
+        _shown = true;
+    }
+
+  private:
+    static constexpr std::size_t interval = 10000;
+    bool _shown = false;
+};
+
+class Decoding
+{
+  public:
+    Decoding(const DecodeOptions& options, CaptureReader& reader, LogGenerator& generator,
+             CaptureClock& clock, const CaptureTechnology& technology, std::FILE* output)
+        : _options(options),
+          _reader(reader),
+          _clock(clock),
+          _technology(technology),
+          _output(output),
+          _decoder(generator, clock)
+    {
+    }
+
+    int run()
+    {
+        readAll();
+        _decoder.finish();
+        writeResult();
+        int status = DecodeStatus::done;
+        if (!_reader.error().empty()) {
+            complain(_reader.error());
+            status = DecodeStatus::badInput;
+        }
+        if (std::fflush(_output) != 0 || std::ferror(_output)) {
+            complain(fmt::format("writing the result: {}", std::strerror(errno)));
+            status = DecodeStatus::badInput;
+        }
+        if (!writeSnapshotFile())
+            status = DecodeStatus::badInput;
+        return interrupted ? DecodeStatus::interrupted : status;
+    }
+
+  private:
+    void readAll()
+    {
+        Progress progress;
+        while (!interrupted && !std::ferror(_output)) {
+            const auto message = _reader.next();
+            if (!message)
+                return;
+            _decoder.take(*message);
+            if (_options.format == DecodeFormat::JsonLines)
+                writeLine(*message);
+            progress.count(++_packets);
+        }
+    }
+
+    void appendDisplay()
+    {
+        if (const PlistValue* display = _decoder.display())
+            appendJson(_text, *display);
+        else
+            _text += "null";
+    }
+
+    void write()
+    {
+        std::fwrite(_text.data(), 1, _text.size(), _output);
+        _text.clear();
+    }
+
+    void writeLine(const CapturedMessage& message)
+    {
+        const auto seconds = std::chrono::floor<std::chrono::seconds>(message.time);
+        const auto rest = (message.time - seconds).count();
+        fmt::format_to(std::back_inserter(_text), "{{\"packet\": {}, \"time\": ", _packets);
+        // Whole microseconds are written as such: most captures have no finer times.
+        if (rest % 1000 == 0)
+            fmt::format_to(std::back_inserter(_text), "{}.{:06}",
+                           seconds.time_since_epoch().count(), rest / 1000);
+        else
+            fmt::format_to(std::back_inserter(_text), "{}.{:09}",
+                           seconds.time_since_epoch().count(), rest);
+        _text += ", \"display\": ";
+        appendDisplay();
+        _text += "}\n";
+        write();
+    }
+
+    void writeResult()
+    {
+        if (_options.format == DecodeFormat::Json) {
+            fmt::format_to(std::back_inserter(_text),
+                           "{{\"technology\": \"{}\", \"packets\": {}, \"display\": ",
+                           _technology.name, _packets);
+            appendDisplay();
+            _text += "}\n";
+        } else if (_options.format == DecodeFormat::Text) {
+            PathIndex index;
+            _text = printTree(*VentrikModelNode::makeTreeFromObject(_decoder.display(), index));
+        }
+        write();
+    }
+
+    bool writeSnapshotFile()
+    {
+        if (!_options.snapshotFile)
+            return true;
+        const auto snapshot =
+            makeSnapshot(dateText(_clock.now()), _decoder.saveContents(), _options.description);
+        std::string error;
+        if (writeSnapshot(snapshot, *_options.snapshotFile, error))
+            return true;
+        complain(error);
+        return false;
+    }
+
+    const DecodeOptions& _options;
+    CaptureReader& _reader;
+    CaptureClock& _clock;
+    CaptureTechnology _technology;
+    std::FILE* _output;
+    OfflineDecoder _decoder;
+    std::size_t _packets = 0;
+    std::string _text;
+};
+
+std::optional<CaptureTechnology> chooseTechnology(const DecodeOptions& options,
+                                                  const CaptureReader& reader)
+{
+    const auto technology = options.technology ? options.technology : reader.technology();
+    if (!technology)
+        complain(fmt::format("{}: link type {} names no technology; say which with --technology",
+                             options.capture, reader.linkType()));
+    return technology;
+}
+
+int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* output)
+{
+    std::string error;
+    auto reader = CaptureReader::open(options.capture, error);
+    if (!reader) {
+        complain(error);
+        return DecodeStatus::badInput;
+    }
+    const auto technology = chooseTechnology(options, *reader);
+    if (!technology)
+        return DecodeStatus::badUsage;
+
+    const LinuxResources resources(options.resourceDirectories.empty()
+                                       ? LinuxResources::defaultDirectories()
+                                       : options.resourceDirectories,
+                                   options.version);
+    const LinuxClock systemClock;
+    CaptureClock clock(systemClock);
+    const auto generator =
+        LogGenerator::generatorFromTechnology(technology->identifier, {log, resources, clock});
+    if (!generator) {
+        complain(fmt::format("{}: there is no decoder for the technology {}", options.capture,
+                             technology->name));
+        return DecodeStatus::badInput;
+    }
+    return Decoding(options, *reader, *generator, clock, *technology, output).run();
+}
+
+} // namespace
+
+int decodeCapture(const DecodeOptions& options, std::FILE* output)
+{
+    if (!options.systemLogFile) {
+        SilentSystemLog log;
+        return decodeWithLog(options, log, output);
+    }
+    std::string error;
+    const auto log = FileSystemLog::create(*options.systemLogFile, error);
+    if (!log) {
+        complain(error);
+        return DecodeStatus::badInput;
+    }
+    const int status = decodeWithLog(options, *log, output);
+    if (log->flush())
+        return status;
+    complain(fmt::format("{}: {}", *options.systemLogFile, std::strerror(errno)));
+    return DecodeStatus::badInput;
+}
+
+void interruptDecoding()
+{
+    interrupted = true;
+}
+
+} // namespace ventrik

@@ -1,0 +1,42 @@
+#pragma once
+
+#include "Capture/CaptureTechnology.h"
+
+#include <cstdio>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace ventrik
+{
+
+enum class DecodeFormat { Text, Json, JsonLines };
+
+struct DecodeOptions {
+    std::string capture; ///< a file, or "-" for standard input
+    std::optional<CaptureTechnology> technology;
+    DecodeFormat format = DecodeFormat::Text;
+    std::optional<std::string> systemLogFile;
+    std::optional<std::string> snapshotFile;
+    std::string description;
+    std::vector<std::string> resourceDirectories; ///< empty: the default ones
+    std::string version;
+};
+
+/// Exit statuses of the offline decoder.
+namespace DecodeStatus
+{
+inline constexpr int done = 0;
+inline constexpr int badInput = 1;
+inline constexpr int badUsage = 2;
+inline constexpr int interrupted = 130;
+} // namespace DecodeStatus
+
+/// Decodes a capture and writes the result to `output`, and one line for each failure to standard
+/// error. What was decoded before damage is still written.
+int decodeCapture(const DecodeOptions& options, std::FILE* output);
+
+/// Makes a running `decodeCapture` end after its present message. Safe in a signal handler.
+void interruptDecoding();
+
+} // namespace ventrik

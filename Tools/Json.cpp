@@ -1,0 +1,114 @@
+#include "Tools/Json.h"
+
+#include "PropertyList/Base64.h"
+#include "PropertyList/IsoDate.h"
+
+#include <cmath>
+#include <iterator>
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+void appendCharacter(std::string& text, char character)
+{
+    switch (character) {
+    case '"':
+        text += "\\\"";
+        return;
+    case '\\':
+        text += "\\\\";
+        return;
+    case '\n':
+        text += "\\n";
+        return;
+    case '\t':
+        text += "\\t";
+        return;
+    default:
+        break;
+    }
+    if (static_cast<unsigned char>(character) < 0x20)
+        fmt::format_to(std::back_inserter(text), "\\u{:04x}", static_cast<int>(character));
+    else
+        text += character;
+}
+
+void appendString(std::string& text, std::string_view string)
+{
+    text += '"';
+    for (const char character : string)
+        appendCharacter(text, character);
+    text += '"';
+}
+
+void appendReal(std::string& text, double real)
+{
+    if (std::isfinite(real))
+        fmt::format_to(std::back_inserter(text), "{}", real);
+    else
+        text += "null";
+}
+
+void appendDate(std::string& text, PlistDate date)
+{
+    const auto iso = formatIsoDate(date);
+    text += iso ? fmt::format("{{\"date\": \"{}\"}}", *iso) : "null";
+}
+
+void appendArray(std::string& text, const PlistArray& array)
+{
+    text += '[';
+    for (const PlistValue& element : array) {
+        if (&element != array.begin())
+            text += ", ";
+        appendJson(text, element);
+    }
+    text += ']';
+}
+
+void appendDictionary(std::string& text, const PlistDictionary& dictionary)
+{
+    text += '{';
+    for (const auto& entry : dictionary) {
+        if (&entry != dictionary.begin())
+            text += ", ";
+        appendString(text, entry.key);
+        text += ": ";
+        appendJson(text, entry.value);
+    }
+    text += '}';
+}
+
+} // namespace
+
+void appendJson(std::string& text, const PlistValue& value)
+{
+    switch (value.kind()) {
+    case PlistValue::Kind::String:
+        return appendString(text, *value.string());
+    case PlistValue::Kind::Integer:
+        text += value.integer()->decimal();
+        return;
+    case PlistValue::Kind::Real:
+        return appendReal(text, *value.real());
+    case PlistValue::Kind::Boolean:
+        text += *value.boolean() ? "true" : "false";
+        return;
+    case PlistValue::Kind::Date:
+        return appendDate(text, *value.date());
+    case PlistValue::Kind::Data:
+        text += fmt::format("{{\"data\": \"{}\"}}", encodeBase64(*value.data()));
+        return;
+    case PlistValue::Kind::Array:
+        return appendArray(text, *value.array());
+    case PlistValue::Kind::Dictionary:
+        return appendDictionary(text, *value.dictionary());
+    }
+}
+
+} // namespace ventrik

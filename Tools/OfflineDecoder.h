@@ -1,0 +1,56 @@
+#pragma once
+
+#include "Capture/CaptureReader.h"
+#include "LogGenerator/LogGenerator.h"
+
+#include <memory>
+#include <optional>
+
+namespace ventrik
+{
+
+/// The clock of a capture: time is where the decoder has come to in it.
+class CaptureClock : public Clock
+{
+  public:
+    explicit CaptureClock(const Clock& zones) : _zones(zones) {}
+
+    TimePoint now() const override { return _now; }
+    TimeZone timeZone(TimePoint time) const override { return _zones.timeZone(time); }
+    void set(TimePoint time) { _now = time; }
+
+  private:
+    const Clock& _zones;
+    TimePoint _now;
+};
+
+/// Runs captured messages through a generator as the viewer would have at that time: a display is
+/// generated at every tick of 2 seconds from the first message on, when something arrived since the
+/// last one. A message at a tick's time still belongs to it.
+class OfflineDecoder
+{
+  public:
+    OfflineDecoder(LogGenerator& generator, CaptureClock& clock)
+        : _generator(generator), _clock(clock)
+    {
+    }
+
+    void take(const CapturedMessage& message);
+    /// After the last message: generates once more if something arrived since the last tick.
+    void finish();
+
+    /// The display as it stands; null while the generator has none.
+    const PlistValue* display() const { return _state.find("Display"); }
+    PlistValue saveContents() const { return _generator.getSaveContentsFromState(_state); }
+
+  private:
+    void runTicksBefore(Clock::TimePoint time);
+
+    LogGenerator& _generator;
+    CaptureClock& _clock;
+    PlistDictionary _state;
+    std::optional<Clock::TimePoint> _nextTick;
+    bool _updated = false;
+};
+
+} // namespace ventrik

@@ -1,0 +1,50 @@
+#pragma once
+
+#include "Platform/Linux/LinuxClock.h"
+#include "Platform/Linux/LinuxMainQueue.h"
+#include "Platform/Linux/LinuxMessagePorts.h"
+#include "Platform/Linux/LinuxPreferences.h"
+#include "Platform/Linux/LinuxResources.h"
+#include "Platform/Linux/LinuxSystemLog.h"
+#include "Platform/Linux/LinuxTelephonyClient.h"
+#include "Platform/Platform.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace ventrik
+{
+
+struct LinuxPlatformOptions {
+    std::string runtimeDirectory;                 ///< empty: the default one
+    std::vector<std::string> resourceDirectories; ///< empty: the default ones
+    bool verbose = false;                         ///< copies the system log to standard error
+    int logThreshold = LogPriority::debug;        ///< the least urgent level that is written
+    std::string programName = "ventrik";
+    std::optional<std::string> version;
+};
+
+/// The platform of a program on Linux; made after the QCoreApplication, and it outlives whatever
+/// uses its bundle.
+class LinuxPlatform
+{
+  public:
+    explicit LinuxPlatform(const LinuxPlatformOptions& options);
+
+    Platform platform();
+    LinuxMessagePorts& ports() { return _ports; }
+    LinuxMainQueue& mainQueue() { return _mainQueue; }
+    LinuxSystemLog& log() { return _log; }
+
+  private:
+    LinuxSystemLog _log;
+    LinuxMainQueue _mainQueue;
+    LinuxMessagePorts _ports;
+    LinuxTelephonyClient _telephony;
+    LinuxResources _resources;
+    LinuxPreferences _preferences;
+    LinuxClock _clock;
+};
+
+} // namespace ventrik

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+
+class QSocketNotifier;
+
+namespace ventrik
+{
+
+/// SIGTERM, SIGINT and SIGHUP as calls on the main queue, so that a program can end in its own
+/// order. A second signal of these while the first is being handled ends the process at once.
+///
+/// To be made before any thread is started: the signals are blocked for the process meanwhile.
+class TerminationSignals
+{
+  public:
+    explicit TerminationSignals(std::function<void()> terminate);
+    ~TerminationSignals();
+    TerminationSignals(const TerminationSignals&) = delete;
+    TerminationSignals& operator=(const TerminationSignals&) = delete;
+
+  private:
+    void receive();
+
+    std::function<void()> _terminate;
+    int _descriptor;
+    std::unique_ptr<QSocketNotifier> _notifier;
+};
+
+} // namespace ventrik

@@ -1,0 +1,147 @@
+#include "Platform/Linux/LinuxPlatform.h"
+#include "Tests/Platform/PortsFixture.h"
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+namespace ventrik
+{
+namespace
+{
+
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
+
+std::string contentsOf(const std::string& path)
+{
+    std::ifstream file(path);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
+std::string configurationFile(const std::string& domain)
+{
+    return qgetenv("XDG_CONFIG_HOME").toStdString() + "/" + domain + ".conf";
+}
+
+TEST(LinuxSystemLog, ShowsAnEntryAsOneLine)
+{
+    EXPECT_EQ(LinuxSystemLog::line("ventrik", 42, 3, "one\ntwo\n\n"), "ventrik[42]: <3> one\\ntwo");
+    EXPECT_EQ(LinuxSystemLog::line("ventrik", 42, 5, "\n"), "ventrik[42]: <5> ");
+}
+
+TEST(LinuxSystemLog, CopiesToStandardErrorUpToItsThreshold)
+{
+    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::StandardError, LogPriority::warning);
+    ::testing::internal::CaptureStderr();
+    log.warning("shown {}", 1);
+    log.log(LogPriority::notice, "hidden");
+    EXPECT_EQ(::testing::internal::GetCapturedStderr(),
+              fmt::format("ventrik-test[{}]: <4> shown 1\n", getpid()));
+}
+
+TEST(LinuxPreferences, WritesTheDomainsFile)
+{
+    LinuxPreferences preferences;
+    preferences.set("org.ventrik.HomeScreen", "FieldTest", true);
+    EXPECT_TRUE(preferences.synchronize("org.ventrik.HomeScreen"));
+    EXPECT_EQ(contentsOf(configurationFile("org.ventrik.HomeScreen")),
+              "[General]\nFieldTest=true\n");
+}
+
+TEST(LinuxPreferences, TellsThatADomainCannotBeWritten)
+{
+    std::filesystem::create_directory(configurationFile("org.ventrik.Broken"));
+    LinuxPreferences preferences;
+    preferences.set("org.ventrik.Broken", "FieldTest", true);
+    EXPECT_FALSE(preferences.synchronize("org.ventrik.Broken"));
+}
+
+TEST(LinuxPreferences, PostsNothingWithoutABus)
+{
+    LinuxPreferences preferences;
+    EXPECT_LT(secondsOf([&] { preferences.postChanged("org.ventrik.HomeScreen", "FieldTest"); }),
+              1.0);
+}
+
+class LinuxResourcesTest : public ::testing::Test
+{
+  protected:
+    std::string add(const std::string& name, const std::string& contents)
+    {
+        const std::string path = root + "/" + name;
+        std::filesystem::create_directories(std::filesystem::path(path).parent_path());
+        std::ofstream(path) << contents;
+        return path;
+    }
+
+    QTemporaryDir temporary;
+    std::string root = temporary.path().toStdString();
+    LinuxResources resources{{root + "/first", root + "/second", root + "/missing"}, "1.2"};
+};
+
+TEST_F(LinuxResourcesTest, PrefersTheEarlierDirectory)
+{
+    add("second/A.plist", "2");
+    const auto first = add("first/A.plist", "1");
+    EXPECT_EQ(resources.path("A", "plist"), first);
+    EXPECT_THAT(resources.paths("plist"), ElementsAre(first));
+}
+
+TEST_F(LinuxResourcesTest, ListsATypeSorted)
+{
+    const auto b = add("first/B.plist", "");
+    const auto a = add("first/A.plist", "");
+    const auto c = add("second/C.plist", "");
+    add("first/D.txt", "");
+    EXPECT_THAT(resources.paths("plist"), ElementsAre(a, b, c));
+}
+
+TEST_F(LinuxResourcesTest, ReadsContents)
+{
+    const auto path = add("first/A.bin", std::string("\0\xFF", 2));
+    EXPECT_EQ(resources.contents(path), (Bytes{0, 0xFF}));
+    EXPECT_EQ(resources.contents(root + "/none"), std::nullopt);
+    EXPECT_EQ(resources.contents(root), std::nullopt);
+    EXPECT_EQ(resources.path("none", "plist"), std::nullopt);
+    EXPECT_EQ(resources.applicationVersion(), "1.2");
+}
+
+TEST(LinuxResources, LooksFirstWhereTheEnvironmentSays)
+{
+    qputenv("VENTRIK_RESOURCE_DIRECTORY", "/chosen");
+    EXPECT_EQ(LinuxResources::defaultDirectories().front(), "/chosen");
+    qunsetenv("VENTRIK_RESOURCE_DIRECTORY");
+    EXPECT_THAT(LinuxResources::defaultDirectories().front(), HasSubstr("/share/ventrik"));
+}
+
+TEST(LinuxClock, KnowsTheZoneInForce)
+{
+    qputenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3");
+    const LinuxClock clock;
+    using namespace std::chrono;
+    const auto winter = clock.timeZone(sys_days{year{2026} / 1 / 15});
+    const auto summer = clock.timeZone(sys_days{year{2026} / 7 / 15});
+    qunsetenv("TZ");
+    EXPECT_EQ(winter.secondsFromUtc, 3600);
+    EXPECT_FALSE(winter.isDaylightSaving);
+    EXPECT_EQ(summer.secondsFromUtc, 7200);
+    EXPECT_TRUE(summer.isDaylightSaving);
+}
+
+TEST(LinuxPlatform, BundlesItsParts)
+{
+    const QTemporaryDir temporary;
+    LinuxPlatformOptions options;
+    options.runtimeDirectory = temporary.path().toStdString();
+    options.resourceDirectories = {"/nowhere"};
+    options.version = "3.4";
+    LinuxPlatform owner(options);
+    const Platform platform = owner.platform();
+    EXPECT_EQ(platform.resources.applicationVersion(), "3.4");
+    EXPECT_EQ(platform.telephony.createServerConnection({}), nullptr);
+    EXPECT_NE(platform.ports.createLocalPort("port", PortSenders::SameUser, nullptr).port, nullptr);
+}
+
+} // namespace
+} // namespace ventrik

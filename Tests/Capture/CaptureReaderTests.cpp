@@ -1,0 +1,123 @@
+#include "Capture/CaptureReader.h"
+#include "Tests/Capture/PcapBytes.h"
+
+#include <gmock/gmock.h>
+
+#include <algorithm>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+
+CaptureReader opened(const std::string& path)
+{
+    std::string error;
+    auto reader = CaptureReader::open(path, error);
+    EXPECT_TRUE(reader) << error;
+    return std::move(reader.value());
+}
+
+Clock::TimePoint at(std::chrono::nanoseconds sinceEpoch)
+{
+    return Clock::TimePoint(sinceEpoch);
+}
+
+} // namespace
+
+TEST(CaptureReader, GivesMessagesInOrderWithTheirTimes)
+{
+    auto reader = opened(PcapBytes(150).record(100, 5, {1, 2}).record(101, 999999, {3}).file());
+    auto message = reader.next();
+    ASSERT_TRUE(message);
+    EXPECT_EQ(message->time, at(100s + 5us));
+    EXPECT_TRUE(std::ranges::equal(message->data, Bytes{1, 2}));
+    message = reader.next();
+    ASSERT_TRUE(message);
+    EXPECT_EQ(message->time, at(101s + 999999us));
+    EXPECT_TRUE(std::ranges::equal(message->data, Bytes{3}));
+    EXPECT_FALSE(reader.next());
+    EXPECT_EQ(reader.error(), "");
+}
+
+TEST(CaptureReader, ReadsNanosecondCaptures)
+{
+    auto reader = opened(PcapBytes(150, 0xA1B23C4D).record(100, 5, {1}).file());
+    EXPECT_EQ(reader.next()->time, at(100s + 5ns));
+}
+
+TEST(CaptureReader, ReadsEmptyMessages)
+{
+    auto reader = opened(PcapBytes(150).record(100, 0, {}).file());
+    const auto message = reader.next();
+    ASSERT_TRUE(message);
+    EXPECT_TRUE(message->data.empty());
+}
+
+TEST(CaptureReader, TellsTheTechnologyByTheLinkType)
+{
+    EXPECT_EQ(opened(PcapBytes(147).file()).technology()->name, "ifx");
+    EXPECT_EQ(opened(PcapBytes(151).file()).technology()->name, "utran");
+}
+
+TEST(CaptureReader, AnotherLinkTypeNamesNoTechnology)
+{
+    const auto reader = opened(PcapBytes(1).file());
+    EXPECT_FALSE(reader.technology());
+    EXPECT_EQ(reader.linkType(), 1);
+}
+
+TEST(CaptureReader, RefusesAMissingFileWithOneLine)
+{
+    std::string error;
+    EXPECT_FALSE(CaptureReader::open("/nowhere/x.pcap", error));
+    EXPECT_EQ(error, "/nowhere/x.pcap: No such file or directory");
+}
+
+TEST(CaptureReader, RefusesWhatIsNoCapture)
+{
+    const std::string path = testing::TempDir() + "no-capture.pcap";
+    std::ofstream(path) << "this is no capture, whatever its name may say";
+    std::string error;
+    EXPECT_FALSE(CaptureReader::open(path, error));
+    EXPECT_THAT(error, testing::StartsWith(path + ": "));
+    EXPECT_THAT(error, testing::Not(testing::HasSubstr("\n")));
+}
+
+TEST(CaptureReader, EveryTruncationInsideARecordIsDamage)
+{
+    const PcapBytes capture = PcapBytes(150).record(100, 0, {1, 2}).record(101, 0, {3, 4, 5});
+    const std::size_t secondRecord = 24 + 16 + 2;
+    for (std::size_t size = secondRecord + 1; size < capture.bytes().size(); ++size) {
+        auto reader = opened(capture.file(size));
+        EXPECT_TRUE(reader.next()) << size;
+        EXPECT_FALSE(reader.next()) << size;
+        EXPECT_THAT(reader.error(), testing::HasSubstr("message 1: truncated")) << size;
+    }
+}
+
+TEST(CaptureReader, AMessageThatWasCutWhenCapturedIsDamage)
+{
+    auto reader = opened(PcapBytes(150).record(100, 0, {1, 2}, 40).file());
+    EXPECT_FALSE(reader.next());
+    EXPECT_THAT(reader.error(), testing::HasSubstr("cut short when it was captured (2 of 40"));
+}
+
+TEST(CaptureReader, AnAbsurdLengthIsDamage)
+{
+    PcapBytes capture(150);
+    Bytes bytes = capture.record(100, 0, {1, 2}).bytes();
+    bytes[24 + 8 + 3] = 0x7F; // the record's captured length
+    const std::string path = testing::TempDir() + "absurd.pcap";
+    std::ofstream(path, std::ios::binary)
+        .write(static_cast<const char*>(static_cast<const void*>(bytes.data())),
+               static_cast<std::streamsize>(bytes.size()));
+    auto reader = opened(path);
+    EXPECT_FALSE(reader.next());
+    EXPECT_NE(reader.error(), "");
+}
+
+} // namespace ventrik

@@ -1,0 +1,93 @@
+#include "Capture/SnapshotFile.h"
+#include "PropertyList/PropertyListReader.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <fstream>
+
+namespace ventrik
+{
+
+namespace
+{
+
+std::vector<std::string> keysOf(const PlistDictionary& dictionary)
+{
+    std::vector<std::string> keys;
+    for (const auto& entry : dictionary)
+        keys.push_back(entry.key);
+    return keys;
+}
+
+Bytes contentsOf(const std::string& path)
+{
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+} // namespace
+
+TEST(SnapshotFile, HoldsTimestampDataAndDescription)
+{
+    const auto snapshot = makeSnapshot("2026-11-16 06:10:28 +0000", PlistArray{"x"}, "drive");
+    EXPECT_THAT(keysOf(snapshot), testing::ElementsAre("Timestamp", "Data", "Description"));
+    EXPECT_EQ(*snapshot.find("Timestamp"), PlistValue("2026-11-16 06:10:28 +0000"));
+    EXPECT_EQ(*snapshot.find("Data"), PlistValue(PlistArray{"x"}));
+    EXPECT_EQ(*snapshot.find("Description"), PlistValue("drive"));
+}
+
+TEST(SnapshotFile, AnEmptyDescriptionIsWrittenEmpty)
+{
+    EXPECT_EQ(*makeSnapshot("t", PlistArray(), "").find("Description"), PlistValue(""));
+}
+
+TEST(SnapshotFile, WithoutSaveContentsItHoldsOnlyTheTimestamp)
+{
+    EXPECT_THAT(keysOf(makeSnapshot("t", std::nullopt, "drive")),
+                testing::ElementsAre("Timestamp"));
+}
+
+TEST(SnapshotFile, IsNamedByTheWholeSecond)
+{
+    using namespace std::chrono_literals;
+    EXPECT_EQ(snapshotFileName("/logs", Clock::TimePoint(1794809428s + 999ms)),
+              "/logs/VentrikSnapshot-1794809428.ventrik");
+}
+
+TEST(SnapshotFile, IsWrittenAsAPropertyListThatReadsBackUnchanged)
+{
+    const auto snapshot =
+        makeSnapshot("t",
+                     PlistArray{PlistDictionary{{"Description", "DLF binary (2 bytes)"},
+                                                {"DLF", Bytes{0, 255}}}},
+                     "a < b");
+    const std::string path = testing::TempDir() + "written.ventrik";
+    std::string error;
+    ASSERT_TRUE(writeSnapshot(snapshot, path, error)) << error;
+    const auto reading = readPropertyList(contentsOf(path));
+    ASSERT_TRUE(reading) << reading.error;
+    EXPECT_EQ(*reading.value, PlistValue(snapshot));
+}
+
+TEST(SnapshotFile, OverwritesAnEarlierFileOfItsName)
+{
+    const std::string path = testing::TempDir() + "twice.ventrik";
+    std::string error;
+    ASSERT_TRUE(
+        writeSnapshot(makeSnapshot("a", PlistArray(), std::string(1000, 'x')), path, error));
+    ASSERT_TRUE(writeSnapshot(makeSnapshot("b", PlistArray(), ""), path, error));
+    EXPECT_EQ(*readPropertyList(contentsOf(path)).value->dictionary()->find("Timestamp"),
+              PlistValue("b"));
+}
+
+TEST(SnapshotFile, TellsWhyAFileCannotBeWritten)
+{
+    std::string error;
+    EXPECT_FALSE(writeSnapshot(makeSnapshot("t", PlistArray(), ""), "/nowhere/x.ventrik", error));
+    EXPECT_EQ(error, "/nowhere/x.ventrik: No such file or directory");
+    EXPECT_FALSE(writeSnapshot(makeSnapshot("t", PlistArray(), "\x01"), "/nowhere/x", error));
+    EXPECT_THAT(error, testing::StartsWith("/nowhere/x: property list not written"));
+}
+
+} // namespace ventrik

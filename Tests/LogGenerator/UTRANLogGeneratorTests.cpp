@@ -1,0 +1,81 @@
+#include "LogGenerator/Orbel/UTRAN/UTRANLogGenerator.h"
+#include "Tests/LogGenerator/GeneratorFixture.h"
+
+namespace ventrik
+{
+
+namespace
+{
+
+class UTRANLogGeneratorTest : public GeneratorFixture
+{
+  protected:
+    void addTemplate(const std::string& path, std::string_view label)
+    {
+        platform.resources.add(path,
+                               plistXml(fmt::format("<dict><key>{}</key><dict/></dict>", label)));
+    }
+    std::string firstLabel()
+    {
+        const auto generator = UTRANLogGenerator::generator(services());
+        generator->updateState(state, Bytes(13, 1));
+        const PlistValue* display = state.find("Display");
+        return display ? keysOf(*display->dictionary()).front() : "(no display)";
+    }
+};
+
+} // namespace
+
+TEST_F(UTRANLogGeneratorTest, TakesTheFirstPathThatHoldsItsNameInAnyCase)
+{
+    addTemplate("/res/A.plist", "A");
+    addTemplate("/res/my-utran2.plist", "first");
+    addTemplate("/res/z-UTRAN.plist", "second");
+    EXPECT_EQ(firstLabel(), "first");
+    EXPECT_TRUE(platform.log.contains("Created UTRANLogGenerator object"));
+}
+
+TEST_F(UTRANLogGeneratorTest, SearchesTheWholePath)
+{
+    addTemplate("/utran/Plain.plist", "from the folder");
+    EXPECT_EQ(firstLabel(), "from the folder");
+}
+
+TEST_F(UTRANLogGeneratorTest, LogsItsCreationAfterTheBaseInitialisation)
+{
+    addTemplate("/res/UTRAN.plist", "x");
+    const auto generator = UTRANLogGenerator::generator(services());
+    EXPECT_EQ(platform.log.texts().back(), "Created UTRANLogGenerator object");
+}
+
+TEST_F(UTRANLogGeneratorTest, StaysUnconfiguredWithoutATemplate)
+{
+    addTemplate("/res/LTE.plist", "x");
+    const auto generator = UTRANLogGenerator::generator(services());
+    EXPECT_TRUE(platform.log.lines().empty());
+    generator->updateState(state, PacketBuilder(0xD0E0).build());
+    EXPECT_TRUE(platform.log.contains("Cannot load template for display"));
+    EXPECT_FALSE(generator->generateLogUsingState(state));
+    EXPECT_FALSE(state.contains("DisplayState"));
+    EXPECT_FALSE(state.contains("Display"));
+}
+
+TEST_F(UTRANLogGeneratorTest, UnconfiguredItAsksForNoCodes)
+{
+    const PlistDictionary command = UTRANLogGenerator::generator(services())->getStartCommand();
+    EXPECT_EQ(textAt(command, {"SetState"}), "Streaming");
+    EXPECT_TRUE(command.find("SetOrbelLogCodes")->array()->empty());
+    EXPECT_TRUE(command.find("SetQxExtraCodes")->array()->empty());
+}
+
+TEST_F(UTRANLogGeneratorTest, DestructionLogsOnlyTheFamilysLine)
+{
+    addTemplate("/res/UTRAN.plist", "x");
+    auto generator = UTRANLogGenerator::generator(services());
+    platform.log.clear();
+    generator.reset();
+    EXPECT_THAT(platform.log.texts(), testing::ElementsAre(testing::StartsWith(
+                                          "Orbel_GSMLogGenerator is destructed 0x")));
+}
+
+} // namespace ventrik

@@ -1,0 +1,139 @@
+#include "Tests/Support/FakePlatform.h"
+#include "Tools/OfflineDecoder.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+
+// Notes when a display is generated, in milliseconds of capture time, and how many messages it saw.
+class NotingGenerator : public LogGenerator
+{
+  public:
+    NotingGenerator(const GeneratorServices& services, const Clock& clock)
+        : LogGenerator(services), _clock(clock)
+    {
+    }
+    void updateState(PlistDictionary& state, ByteView) override
+    {
+        ++_messages;
+        state.set("Display", fmt::format("{}", _messages));
+    }
+    std::optional<PlistValue> generateLogUsingState(PlistDictionary&) override
+    {
+        const auto time = std::chrono::floor<std::chrono::milliseconds>(_clock.now());
+        notes.push_back(fmt::format("{}:{}", time.time_since_epoch().count(), _messages));
+        return std::nullopt;
+    }
+    PlistDictionary getStartCommand() const override { return {}; }
+    PlistValue getSaveContentsFromState(const PlistDictionary&) const override
+    {
+        return PlistArray();
+    }
+
+    std::vector<std::string> notes;
+
+  private:
+    const Clock& _clock;
+    int _messages = 0;
+};
+
+class OfflineDecoderTest : public testing::Test
+{
+  protected:
+    void take(std::chrono::nanoseconds time) { decoder.take({Clock::TimePoint(time), {}}); }
+
+    FakePlatform fake;
+    CaptureClock clock{fake.clock};
+    NotingGenerator generator{{fake.log, fake.resources, clock}, clock};
+    OfflineDecoder decoder{generator, clock};
+};
+
+} // namespace
+
+TEST_F(OfflineDecoderTest, GeneratesAtTheTickAfterAMessage)
+{
+    take(10s);
+    take(11s);
+    EXPECT_TRUE(generator.notes.empty());
+    take(12s + 1ns);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:2"));
+}
+
+TEST_F(OfflineDecoderTest, AMessageAtATickBelongsToIt)
+{
+    take(10s);
+    take(12s);
+    EXPECT_TRUE(generator.notes.empty());
+    decoder.finish();
+    EXPECT_THAT(generator.notes, ElementsAre("12000:2"));
+}
+
+TEST_F(OfflineDecoderTest, TicksCountFromTheFirstMessage)
+{
+    take(10s + 500ms);
+    take(13s);
+    take(15s);
+    EXPECT_THAT(generator.notes, ElementsAre("12500:1", "14500:2"));
+}
+
+TEST_F(OfflineDecoderTest, TicksWithoutNewsGenerateNothing)
+{
+    take(10s);
+    take(100s);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1"));
+    take(100s);
+    take(102s + 1ms);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1", "102000:3"));
+}
+
+TEST_F(OfflineDecoderTest, ALongGapKeepsTheTicksGrid)
+{
+    take(10s);
+    take(100s + 1ms); // the ticks go on at 102 s
+    take(101s + 999ms);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1"));
+    take(102s + 1ms);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1", "102000:3"));
+}
+
+TEST_F(OfflineDecoderTest, TheEndGeneratesOnceMoreAtTheLastMessagesTime)
+{
+    take(10s);
+    take(10s + 700ms);
+    decoder.finish();
+    decoder.finish();
+    EXPECT_THAT(generator.notes, ElementsAre("10700:2"));
+}
+
+TEST_F(OfflineDecoderTest, TheEndWithoutAMessageGeneratesNothing)
+{
+    decoder.finish();
+    EXPECT_TRUE(generator.notes.empty());
+    EXPECT_EQ(decoder.display(), nullptr);
+}
+
+TEST_F(OfflineDecoderTest, TimesThatRunBackwardTickNothing)
+{
+    take(10s);
+    take(5s);
+    take(12s);
+    EXPECT_TRUE(generator.notes.empty());
+}
+
+TEST_F(OfflineDecoderTest, TheDisplayStandsAsAfterTheLastMessage)
+{
+    take(10s);
+    EXPECT_EQ(*decoder.display(), PlistValue("1"));
+    take(10s);
+    EXPECT_EQ(*decoder.display(), PlistValue("2"));
+}
+
+} // namespace ventrik

@@ -103,8 +103,9 @@ TEST(LTEScenario, HasBursts)
     std::map<std::chrono::nanoseconds, int> perStep;
     for (const auto& message : messagesUpTo(100s))
         ++perStep[message.due];
-    EXPECT_GE(std::ranges::max(perStep, {}, [](const auto& step) { return step.second; }).second,
-              6);
+    const auto busiest = std::ranges::max_element(
+        perStep, {}, &std::map<std::chrono::nanoseconds, int>::value_type::second);
+    EXPECT_GE(busiest->second, 6);
 }
 
 TEST(LTEScenario, SendsEveryCodeThatTheStartCommandAsksFor)
@@ -138,10 +139,10 @@ TEST(LTEScenario, SomeMessagesCarryTheTransportPrefix)
 TEST_F(DriveTest, GoesThroughSeveralCellsBandsAndBandwidths)
 {
     EXPECT_GE(shown["Serving Cell Info/Physical Cell ID"].size(), 5U);
-    EXPECT_GE(shown["Serving Cell Info/Freq Band Indicator"].size(), 4U); // and the initial "-"
+    EXPECT_GE(shown["Serving Cell Info/Freq Band Indicator"].size(), 3U);
     EXPECT_GE(shown["Serving Cell Info/Download Bandwidth"].size(), 4U);
     EXPECT_EQ(shown["Serving Cell Info/Download Bandwidth"].count("Unknown"), 0U);
-    EXPECT_GE(shown["Serving Cell Info/Tracking Area Code"].size(), 3U);
+    EXPECT_GE(shown["Serving Cell Info/Tracking Area Code"].size(), 2U);
 }
 
 TEST_F(DriveTest, ShowsBelievableLevels)
@@ -163,9 +164,10 @@ TEST_F(DriveTest, FillsEverySectionThatIsBuilt)
 {
     for (const char* section : {"Serving Cell Info", "Serving Cell Measurements",
                                 "Connected mode LTE Intra-frequency Measurement"})
-        for (const auto& [key, texts] : shown)
-            if (key.starts_with(section))
-                EXPECT_GE(texts.size() - texts.count("-"), 1U) << key;
+        for (const auto& [key, texts] : shown) {
+            const bool isOfSection = key.starts_with(section);
+            EXPECT_TRUE(!isOfSection || texts.size() > texts.count("-")) << key;
+        }
 }
 
 } // namespace ventrik

@@ -26,9 +26,8 @@ class ReplaySourceTest : public testing::Test
         EXPECT_TRUE(writer->flush());
     }
 
-    std::unique_ptr<ReplaySource> open(ReplayOptions options)
+    std::unique_ptr<ReplaySource> open(const ReplayOptions& options)
     {
-        options.capture = path;
         std::string error;
         auto source = ReplaySource::open(options, error);
         EXPECT_TRUE(source) << error;
@@ -49,7 +48,7 @@ class ReplaySourceTest : public testing::Test
 
 TEST_F(ReplaySourceTest, KeepsTheRecordedPausesAndTakesBackwardOnesAsNone)
 {
-    const auto source = open({});
+    const auto source = open({.capture = path});
     EXPECT_TRUE(source->isPaced());
     EXPECT_EQ(dueTimes(*source, 4), (std::vector<std::chrono::nanoseconds>{0s, 3s, 3s, 5s}));
     EXPECT_FALSE(source->next());
@@ -57,27 +56,27 @@ TEST_F(ReplaySourceTest, KeepsTheRecordedPausesAndTakesBackwardOnesAsNone)
 
 TEST_F(ReplaySourceTest, DividesThePausesByTheSpeed)
 {
-    const auto source = open({.speed = 2.0});
+    const auto source = open({.capture = path, .speed = 2.0});
     EXPECT_EQ(dueTimes(*source, 2), (std::vector<std::chrono::nanoseconds>{0s, 1500ms}));
 }
 
 TEST_F(ReplaySourceTest, GivesTheMessagesUnchanged)
 {
-    const auto source = open({});
+    const auto source = open({.capture = path});
     EXPECT_EQ(source->next()->data, Bytes{1});
     EXPECT_EQ(source->next()->data, Bytes{2});
 }
 
 TEST_F(ReplaySourceTest, WithoutASpeedItHasNoPace)
 {
-    const auto source = open({.speed = std::nullopt});
+    const auto source = open({.capture = path, .speed = std::nullopt});
     EXPECT_FALSE(source->isPaced());
     EXPECT_EQ(dueTimes(*source, 2), (std::vector<std::chrono::nanoseconds>{0s, 0s}));
 }
 
 TEST_F(ReplaySourceTest, BeginsAgainInALoop)
 {
-    const auto source = open({.loop = true});
+    const auto source = open({.capture = path, .loop = true});
     dueTimes(*source, 4);
     const auto again = source->next();
     ASSERT_TRUE(again);
@@ -89,7 +88,7 @@ TEST_F(ReplaySourceTest, AnEmptyCaptureDoesNotLoopForEver)
 {
     std::string error;
     CaptureWriter::create(path, *technologyNamed("lte"), error)->flush();
-    EXPECT_FALSE(open({.loop = true})->next());
+    EXPECT_FALSE(open({.capture = path, .loop = true})->next());
 }
 
 TEST_F(ReplaySourceTest, RefusesACaptureThatIsNotThere)

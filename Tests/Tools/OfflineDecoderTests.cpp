@@ -89,9 +89,9 @@ TEST_F(OfflineDecoderTest, TicksWithoutNewsGenerateNothing)
     take(10s);
     take(100s);
     EXPECT_THAT(generator.notes, ElementsAre("12000:1"));
-    take(100s);
+    take(100s); // at the tick of 100 s, as the one before
     take(102s + 1ms);
-    EXPECT_THAT(generator.notes, ElementsAre("12000:1", "102000:3"));
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1", "100000:3"));
 }
 
 TEST_F(OfflineDecoderTest, ALongGapKeepsTheTicksGrid)

@@ -2,6 +2,7 @@
 #include "Platform/Linux/TerminationSignals.h"
 #include "TelephonyService/LTEScenario.h"
 #include "TelephonyService/ReplaySource.h"
+#include "TelephonyService/ScenarioCapture.h"
 #include "TelephonyService/TelephonyService.h"
 #include "Tools/CommandLine.h"
 
@@ -19,6 +20,7 @@ namespace
 
 constexpr const char* usage =
     "usage: ventrik-telephony --technology NAME [--seed N]\n"
+    "       ventrik-telephony --technology NAME [--seed N] --write CAPTURE [--count N]\n"
     "       ventrik-telephony --replay CAPTURE [--speed FACTOR|max] [--loop]\n"
     "\n"
     "A telephony service for machines without a baseband: answers the log-channel protocol and\n"
@@ -26,6 +28,8 @@ constexpr const char* usage =
     "\n"
     "  --technology NAME  the scenario of that technology (lte)\n"
     "  --seed N           another drive through the same scenario (default 1)\n"
+    "  --write CAPTURE    writes the scenario's messages to a capture instead, and ends\n"
+    "  --count N          so many of them (default 10000)\n"
     "  --replay CAPTURE   replays a capture with the pauses it was recorded with\n"
     "  --speed FACTOR     replays that much faster; max: as fast as the viewer takes\n"
     "  --loop             begins again at the capture's end\n"
@@ -37,17 +41,20 @@ constexpr const char* usage =
 struct ServiceOptions {
     std::optional<CaptureTechnology> technology;
     std::uint32_t seed = 1;
+    std::optional<std::string> captureToWrite;
+    std::uint32_t messageCount = 10000;
     std::optional<ReplayOptions> replay;
     bool verbose = false;
 };
 
-std::uint32_t seedArgument(const CommandLine& line)
+std::uint32_t numberArgument(const CommandLine& line, std::string_view option)
 {
     char* end = nullptr;
     errno = 0;
     const unsigned long number = std::strtoul(line.value(), &end, 10);
     if (end == line.value() || *end != '\0' || errno != 0 || number > UINT32_MAX)
-        line.refuse(fmt::format("--seed takes a whole number below 2^32, not '{}'", line.value()));
+        line.refuse(
+            fmt::format("{} takes a whole number below 2^32, not '{}'", option, line.value()));
     return static_cast<std::uint32_t>(number);
 }
 
@@ -83,7 +90,13 @@ void takeOption(int letter, const CommandLine& line, ServiceOptions& result,
         result.technology = technologyArgument(line);
         break;
     case 'n':
-        result.seed = seedArgument(line);
+        result.seed = numberArgument(line, "--seed");
+        break;
+    case 'w':
+        result.captureToWrite = line.value();
+        break;
+    case 'c':
+        result.messageCount = numberArgument(line, "--count");
         break;
     case 'r':
         replay.capture = line.value();
@@ -109,6 +122,8 @@ ServiceOptions parseArguments(int argc, char** argv)
 {
     static const option options[] = {{"technology", required_argument, nullptr, 't'},
                                      {"seed", required_argument, nullptr, 'n'},
+                                     {"write", required_argument, nullptr, 'w'},
+                                     {"count", required_argument, nullptr, 'c'},
                                      {"replay", required_argument, nullptr, 'r'},
                                      {"speed", required_argument, nullptr, 's'},
                                      {"loop", no_argument, nullptr, 'l'},
@@ -129,6 +144,8 @@ ServiceOptions parseArguments(int argc, char** argv)
         result.replay = ReplayOptions{*replay.capture, replay.speed, replay.loop};
     else if (replay.isAskedFor)
         line.refuse("--speed and --loop go with --replay");
+    if (result.captureToWrite && !result.technology)
+        line.refuse("--write goes with --technology");
     return result;
 }
 
@@ -166,11 +183,23 @@ int fail(std::string_view reason)
     return EXIT_FAILURE;
 }
 
+int writeCapture(const ServiceOptions& options)
+{
+    LTEScenario scenario(options.seed);
+    std::string error;
+    if (writeScenarioCapture(scenario, options.messageCount, *options.technology,
+                             *options.captureToWrite, error))
+        return EXIT_SUCCESS;
+    return fail(error);
+}
+
 } // namespace
 
 int main(int argc, char** argv)
 {
     const ServiceOptions options = parseArguments(argc, argv);
+    if (options.captureToWrite)
+        return writeCapture(options);
     QCoreApplication application(argc, argv);
     const TerminationSignals termination([] { QCoreApplication::quit(); });
 

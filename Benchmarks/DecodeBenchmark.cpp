@@ -1,0 +1,58 @@
+#include "LogGenerator/Orbel/LTE/LTELogGenerator.h"
+#include "Platform/Linux/LinuxClock.h"
+#include "Platform/Linux/LinuxResources.h"
+#include "Platform/Linux/LinuxSystemLog.h"
+#include "TelephonyService/LTEScenario.h"
+
+#include <benchmark/benchmark.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+// A log that is filtered out whole, as the offline decoder's is.
+class FilteredLog : public SystemLog
+{
+  public:
+    FilteredLog() : SystemLog(-1) {}
+
+  protected:
+    void write(int, std::string_view) override {}
+};
+
+std::vector<Bytes> driveOf(std::size_t count)
+{
+    LTEScenario scenario(1);
+    std::vector<Bytes> messages;
+    for (std::size_t i = 0; i < count; ++i)
+        messages.push_back(scenario.next()->data);
+    return messages;
+}
+
+void decodeLteDrive(benchmark::State& benchmarkState)
+{
+    const std::vector<Bytes> messages = driveOf(2000);
+    FilteredLog log;
+    const LinuxResources resources(LinuxResources::defaultDirectories(), "1.0");
+    const LinuxClock clock;
+    const auto generator = LTELogGenerator::generator({log, resources, clock});
+    PlistDictionary state;
+    std::size_t bytes = 0;
+    for (auto _ : benchmarkState) {
+        for (const Bytes& message : messages) {
+            generator->updateState(state, message);
+            bytes += message.size();
+        }
+        generator->generateLogUsingState(state);
+    }
+    benchmarkState.SetItemsProcessed(benchmarkState.iterations() *
+                                     static_cast<std::int64_t>(messages.size()));
+    benchmarkState.SetBytesProcessed(static_cast<std::int64_t>(bytes));
+}
+BENCHMARK(decodeLteDrive)->Unit(benchmark::kMillisecond);
+
+} // namespace
+
+} // namespace ventrik

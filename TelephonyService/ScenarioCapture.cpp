@@ -1,0 +1,40 @@
+#include "TelephonyService/ScenarioCapture.h"
+
+#include "Capture/CaptureWriter.h"
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+
+constexpr Clock::TimePoint captureStart =
+    std::chrono::sys_days{std::chrono::year{2026} / 11 / 16} + 6h + 10min + 28s;
+
+} // namespace
+
+bool writeScenarioCapture(MessageSource& source, std::uint64_t messageCount,
+                          const CaptureTechnology& technology, const std::string& path,
+                          std::string& error)
+{
+    auto writer = CaptureWriter::create(path, technology, error);
+    if (!writer)
+        return false;
+    bool isWritten = true;
+    for (std::uint64_t i = 0; i < messageCount && isWritten; ++i) {
+        const auto message = source.next();
+        if (!message)
+            break;
+        isWritten = writer->write(captureStart + message->due, message->data);
+    }
+    if (isWritten && writer->flush())
+        return true;
+    error = fmt::format("{}: the capture could not be written", path);
+    return false;
+}
+
+} // namespace ventrik

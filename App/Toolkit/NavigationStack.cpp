@@ -1,0 +1,153 @@
+#include "App/Toolkit/NavigationStack.h"
+
+#include <QKeyEvent>
+#include <QStackedLayout>
+#include <QStyle>
+#include <QVBoxLayout>
+
+#include <utility>
+
+namespace ventrik
+{
+
+NavigationStack::NavigationStack(std::unique_ptr<Screen> root, QWidget* parent)
+    : QWidget(parent),
+      _titleBar(new TitleBar(this)),
+      _screenArea(new QWidget(this)),
+      _screenLayout(new QStackedLayout(_screenArea)),
+      _toolbarArea(new QWidget(this)),
+      _toolbarLayout(new QStackedLayout(_toolbarArea))
+{
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(_titleBar);
+    layout->addWidget(_screenArea, 1);
+    layout->addWidget(_toolbarArea);
+    _toolbarArea->setFixedHeight(ToolBar::barHeight);
+    _toolbarArea->hide();
+    connect(&_titleBar->backButton(), &QAbstractButton::clicked, this, [this] { pop(true); });
+    adopt(std::move(root));
+    showTop();
+}
+
+void NavigationStack::adopt(std::unique_ptr<Screen> screen)
+{
+    Screen* adopted = screen.release();
+    adopted->_stack = this;
+    _screenLayout->addWidget(adopted);
+    _toolbarLayout->addWidget(&adopted->toolbar());
+    connect(adopted, &QWidget::windowTitleChanged, this, [this] { updateTitleBar(); });
+    _screens.push_back(adopted);
+}
+
+void NavigationStack::release(Screen& screen)
+{
+    screen.disconnect(this);
+    screen._stack = nullptr;
+    _screenLayout->removeWidget(&screen);
+    _toolbarLayout->removeWidget(&screen.toolbar());
+    screen.hide();
+    screen.toolbar().hide();
+    screen.deleteLater();
+}
+
+void NavigationStack::push(std::unique_ptr<Screen> screen, bool animated)
+{
+    Screen& leaving = topScreen();
+    adopt(std::move(screen));
+    replace(leaving, Transition::Kind::Push, animated);
+}
+
+void NavigationStack::pop(bool animated)
+{
+    if (_screens.size() > 1)
+        popTo(*_screens[_screens.size() - 2], animated);
+}
+
+void NavigationStack::popTo(Screen& screen, bool animated)
+{
+    if (screen.navigationStack() != this || &screen == &topScreen())
+        return;
+    std::vector<Screen*> popped;
+    while (_screens.back() != &screen) {
+        popped.push_back(_screens.back());
+        _screens.pop_back();
+    }
+    replace(*popped.front(), Transition::Kind::Pop, animated);
+    for (Screen* old : popped)
+        release(*old);
+}
+
+void NavigationStack::replace(Screen& leaving, Transition::Kind kind, bool animated)
+{
+    const bool moves = animated && canAnimate();
+    QPixmap screenBefore;
+    QPixmap toolbarBefore;
+    if (moves) {
+        screenBefore = _screenArea->grab();
+        toolbarBefore = _toolbarArea->grab();
+    }
+    delete _transition;
+    delete _toolbarTransition;
+    leaving.viewWillDisappear(animated);
+    topScreen().viewWillAppear(animated);
+    if (_delegate)
+        _delegate->willShowScreen(*this, topScreen(), animated);
+    showTop();
+    if (moves) {
+        _transition = new Transition(kind, *_screenArea, screenBefore, topScreen().grab());
+        _toolbarTransition =
+            new Transition(Transition::Kind::Fade, *_toolbarArea, std::move(toolbarBefore));
+    }
+}
+
+void NavigationStack::showTop()
+{
+    _screenLayout->setCurrentWidget(&topScreen());
+    _toolbarLayout->setCurrentWidget(&topScreen().toolbar());
+    topScreen().setFocus();
+    updateTitleBar();
+}
+
+void NavigationStack::updateTitleBar()
+{
+    _titleBar->setTitle(topScreen().title());
+    if (_screens.size() > 1)
+        _titleBar->showBackButton(_screens[_screens.size() - 2]->title());
+    else
+        _titleBar->hideBackButton();
+}
+
+bool NavigationStack::canAnimate() const
+{
+    return _animationEnabled && isVisible() &&
+           style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, this) > 0;
+}
+
+void NavigationStack::setToolbarHidden(bool hidden)
+{
+    _toolbarArea->setHidden(hidden);
+}
+
+void NavigationStack::showEvent(QShowEvent*)
+{
+    if (std::exchange(_hasAppeared, true))
+        return;
+    topScreen().viewWillAppear(false);
+    topScreen().setFocus();
+}
+
+void NavigationStack::keyPressEvent(QKeyEvent* event)
+{
+    const bool goesBack =
+        event->key() == Qt::Key_Escape || event->key() == Qt::Key_Backspace ||
+        event->key() == Qt::Key_Back ||
+        (event->key() == Qt::Key_Left && event->modifiers().testFlag(Qt::AltModifier));
+    if (goesBack)
+        pop(true);
+    else
+        QWidget::keyPressEvent(event);
+}
+
+} // namespace ventrik

@@ -1,0 +1,24 @@
+#include "App/Toolkit/Screen.h"
+
+#include "App/Toolkit/NavigationStack.h"
+
+namespace ventrik
+{
+
+Screen::Screen() : _toolbar(new ToolBar) {}
+
+Screen::~Screen()
+{
+    delete _toolbar;
+}
+
+void Screen::setToolbarItems(std::vector<ToolBarItem> items, bool animated)
+{
+    _toolbar->setItems(std::move(items), animated && _stack && _stack->canAnimate());
+}
+
+void Screen::viewWillAppear(bool) {}
+
+void Screen::viewWillDisappear(bool) {}
+
+} // namespace ventrik

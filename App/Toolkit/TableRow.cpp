@@ -1,0 +1,90 @@
+#include "App/Toolkit/TableRow.h"
+
+#include "App/Toolkit/Separator.h"
+
+#include <QPainter>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr int accessoryWidth = 34;
+constexpr int rightMargin = 10; // where there is no accessory
+constexpr int separatorInset = 10;
+
+} // namespace
+
+TableRow::TableRow(Style style, QString reuseIdentifier)
+    : _style(style), _reuseIdentifier(std::move(reuseIdentifier)), _contentArea(new QWidget(this))
+{
+    setBackgroundRole(QPalette::Base);
+}
+
+void TableRow::setAccessory(TableRowAccessory accessory)
+{
+    _accessory = accessory;
+    layoutSubviews();
+    update();
+}
+
+void TableRow::setSelected(bool selected)
+{
+    _isSelected = selected;
+    // The labels take their text colour from the background's role.
+    setBackgroundRole(selected ? QPalette::Highlight : QPalette::Base);
+    update();
+}
+
+void TableRow::setKeyboardFrame(bool visible)
+{
+    _hasKeyboardFrame = visible;
+    update();
+}
+
+void TableRow::layoutSubviews()
+{
+    const int taken = _accessory == TableRowAccessory::None ? rightMargin : accessoryWidth;
+    _contentArea->setGeometry(0, 0, width() - taken, height());
+}
+
+void TableRow::resizeEvent(QResizeEvent*)
+{
+    layoutSubviews();
+}
+
+void TableRow::paintEvent(QPaintEvent*)
+{
+    QPainter painter(this);
+    painter.fillRect(rect(), palette().color(backgroundRole()));
+    painter.fillRect(separatorInset, height() - 1, width(), 1, separatorColor(palette()));
+    painter.setRenderHint(QPainter::Antialiasing);
+    paintAccessory(painter);
+    if (_hasKeyboardFrame) {
+        painter.setPen(QPen(palette().color(QPalette::Highlight), 2));
+        painter.drawRect(rect().adjusted(1, 1, -1, -2));
+    }
+}
+
+void TableRow::paintAccessory(QPainter& painter) const
+{
+    const QPointF middle(width() - accessoryWidth / 2.0, height() / 2.0);
+    QColor grey = palette().color(_isSelected ? QPalette::HighlightedText : QPalette::Text);
+    grey.setAlphaF(_isSelected ? 0.8F : 0.35F);
+    painter.setPen(QPen(grey, 2, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+    switch (_accessory) {
+    case TableRowAccessory::None:
+        return;
+    case TableRowAccessory::DisclosureIndicator:
+        painter.drawPolyline(
+            QPolygonF{middle + QPointF(-3, -6), middle + QPointF(3, 0), middle + QPointF(-3, 6)});
+        return;
+    case TableRowAccessory::CheckMark:
+        painter.drawPolyline(
+            QPolygonF{middle + QPointF(-6, 0), middle + QPointF(-2, 5), middle + QPointF(7, -6)});
+        return;
+    }
+}
+
+} // namespace ventrik

@@ -1,0 +1,53 @@
+#pragma once
+
+#include <QString>
+#include <QWidget>
+
+namespace ventrik
+{
+
+/// What a row shows at its right edge.
+enum class TableRowAccessory { None, DisclosureIndicator, CheckMark };
+
+/// A row of a table: a content area for its subclass, an accessory, and its selected look.
+class TableRow : public QWidget
+{
+  public:
+    /// How a row is set out; rows that set themselves out may have any style.
+    enum class Style { Default = 0, Value = 1 };
+
+    TableRow(Style style, QString reuseIdentifier);
+
+    Style style() const { return _style; }
+    const QString& reuseIdentifier() const { return _reuseIdentifier; }
+
+    /// The part of the row that the accessory leaves.
+    QWidget& contentArea() const { return *_contentArea; }
+
+    TableRowAccessory accessory() const { return _accessory; }
+    void setAccessory(TableRowAccessory accessory);
+    bool isSelected() const { return _isSelected; }
+    void setSelected(bool selected);
+    /// The row that the keyboard is at has a frame.
+    bool hasKeyboardFrame() const { return _hasKeyboardFrame; }
+    void setKeyboardFrame(bool visible);
+
+    /// Fits the content area into the row; called whenever the row's size changes.
+    virtual void layoutSubviews();
+
+  protected:
+    void resizeEvent(QResizeEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
+
+  private:
+    void paintAccessory(QPainter& painter) const;
+
+    Style _style;
+    QString _reuseIdentifier;
+    QWidget* _contentArea;
+    TableRowAccessory _accessory = TableRowAccessory::None;
+    bool _isSelected = false;
+    bool _hasKeyboardFrame = false;
+};
+
+} // namespace ventrik

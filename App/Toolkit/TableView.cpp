@@ -1,0 +1,290 @@
+#include "App/Toolkit/TableView.h"
+
+#include <QApplication>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QScrollBar>
+#include <QScroller>
+
+#include <algorithm>
+#include <limits>
+#include <utility>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr int wheelStep = 20;
+
+int contentHeight(int rowCount)
+{
+    const qint64 height = qint64{rowCount} * TableView::rowHeight;
+    return static_cast<int>(std::min<qint64>(height, std::numeric_limits<int>::max()));
+}
+
+} // namespace
+
+TableView::TableView(TableViewDataSource& dataSource, QWidget* parent)
+    : QAbstractScrollArea(parent), _dataSource(dataSource)
+{
+    setFrameShape(QFrame::NoFrame);
+    setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    setFocusPolicy(Qt::StrongFocus);
+    verticalScrollBar()->setSingleStep(wheelStep);
+    viewport()->setBackgroundRole(QPalette::Base);
+    QScroller::grabGesture(viewport(), QScroller::TouchGesture);
+}
+
+TableView::~TableView() = default;
+
+void TableView::reloadData()
+{
+    _rowCount = std::max(0, _dataSource.rowsInSection(0));
+    // To the front, the topmost one foremost: each row comes back to its own place.
+    for (auto row = _rows.rbegin(); row != _rows.rend(); ++row)
+        _reusable[row->second->reuseIdentifier()].push_front(std::move(row->second));
+    _rows.clear();
+    const auto dropIfGone = [this](std::optional<int>& row) {
+        if (row && *row >= _rowCount)
+            row.reset();
+    };
+    dropIfGone(_selected);
+    dropIfGone(_pressed);
+    if (_current)
+        _current = _rowCount > 0 ? std::optional(std::min(*_current, _rowCount - 1)) : std::nullopt;
+    updateScrollRange();
+    layoutRows();
+}
+
+std::unique_ptr<TableRow> TableView::dequeueReusableRow(const QString& identifier)
+{
+    const auto waiting = _reusable.find(identifier);
+    if (waiting == _reusable.end() || waiting->second.empty())
+        return nullptr;
+    auto row = std::move(waiting->second.front());
+    waiting->second.pop_front();
+    return row;
+}
+
+TableView::RowRange TableView::rangeInView() const
+{
+    const int top = verticalScrollBar()->value();
+    const int bottom = top + viewport()->height();
+    return {std::min(top / rowHeight, _rowCount),
+            std::min((bottom + rowHeight - 1) / rowHeight, _rowCount)};
+}
+
+void TableView::updateScrollRange()
+{
+    const int height = viewport()->height();
+    verticalScrollBar()->setRange(0, std::max(0, contentHeight(_rowCount) - height));
+    verticalScrollBar()->setPageStep(height);
+}
+
+void TableView::layoutRows()
+{
+    const RowRange range = rangeInView();
+    // Out first, so that the rows that come in can be made of them.
+    for (auto row = _rows.begin(); row != _rows.end();) {
+        if (range.contains(row->first)) {
+            ++row;
+            continue;
+        }
+        retire(std::move(row->second));
+        row = _rows.erase(row);
+    }
+    for (int row = range.first; row < range.end; ++row)
+        showRow(row);
+    // What waits is hidden only now: a row that is used again at once never leaves the screen.
+    for (const auto& [identifier, waiting] : _reusable)
+        for (const auto& row : waiting)
+            row->hide();
+}
+
+void TableView::retire(std::unique_ptr<TableRow> row)
+{
+    _reusable[row->reuseIdentifier()].push_back(std::move(row));
+}
+
+void TableView::showRow(int row)
+{
+    auto& widget = _rows[row];
+    if (!widget) {
+        widget = _dataSource.rowForIndexPath(*this, {0, row});
+        widget->setParent(viewport());
+        updateLook(row, *widget);
+    }
+    widget->setGeometry(0, row * rowHeight - verticalScrollBar()->value(), viewport()->width(),
+                        rowHeight);
+    widget->show();
+}
+
+void TableView::updateLook(int row, TableRow& widget) const
+{
+    widget.setSelected(row == _selected || row == _pressed);
+    widget.setKeyboardFrame(row == _current && _showsKeyboardFrame && hasFocus());
+}
+
+void TableView::updateLooks()
+{
+    for (const auto& [row, widget] : _rows)
+        updateLook(row, *widget);
+}
+
+std::optional<IndexPath> TableView::indexPathForSelectedRow() const
+{
+    return _selected ? std::optional(IndexPath{0, *_selected}) : std::nullopt;
+}
+
+void TableView::selectRow(IndexPath indexPath)
+{
+    _selected = indexPath.row;
+    updateLooks();
+}
+
+void TableView::deselectRow(IndexPath indexPath)
+{
+    if (_selected == indexPath.row)
+        _selected.reset();
+    updateLooks();
+}
+
+TableRow* TableView::rowAt(IndexPath indexPath) const
+{
+    const auto row = _rows.find(indexPath.row);
+    return row == _rows.end() ? nullptr : row->second.get();
+}
+
+std::vector<TableRow*> TableView::visibleRows() const
+{
+    std::vector<TableRow*> result;
+    for (const auto& [row, widget] : _rows)
+        result.push_back(widget.get());
+    return result;
+}
+
+void TableView::resizeEvent(QResizeEvent*)
+{
+    updateScrollRange();
+    layoutRows();
+}
+
+void TableView::scrollContentsBy(int, int)
+{
+    layoutRows();
+}
+
+std::optional<int> TableView::rowAtPosition(const QPoint& position) const
+{
+    const int row = (position.y() + verticalScrollBar()->value()) / rowHeight;
+    return position.y() >= 0 && row < _rowCount ? std::optional(row) : std::nullopt;
+}
+
+void TableView::setHighlighted(std::optional<int> row)
+{
+    _pressed = row;
+    updateLooks();
+}
+
+void TableView::mousePressEvent(QMouseEvent* event)
+{
+    if (event->button() != Qt::LeftButton) {
+        event->ignore();
+        return;
+    }
+    _showsKeyboardFrame = false;
+    _pressPosition = event->pos();
+    setHighlighted(rowAtPosition(event->pos()));
+}
+
+void TableView::mouseMoveEvent(QMouseEvent* event)
+{
+    // A drag means something else than the row.
+    if ((event->pos() - _pressPosition).manhattanLength() >= QApplication::startDragDistance())
+        setHighlighted(std::nullopt);
+}
+
+void TableView::mouseReleaseEvent(QMouseEvent* event)
+{
+    if (event->button() != Qt::LeftButton)
+        return;
+    const std::optional<int> row = std::exchange(_pressed, std::nullopt);
+    if (row && row == rowAtPosition(event->pos()))
+        activate(*row);
+    else
+        updateLooks();
+}
+
+void TableView::activate(int row)
+{
+    _current = row;
+    selectRow({0, row});
+    _dataSource.rowSelected(*this, IndexPath{0, row});
+}
+
+std::optional<int> TableView::keyTarget(int key) const
+{
+    const int last = _rowCount - 1;
+    const int page = std::max(1, viewport()->height() / rowHeight);
+    // The first key goes to what is in view.
+    const int start = rangeInView().first;
+    switch (key) {
+    case Qt::Key_Up:
+        return _current ? *_current - 1 : start;
+    case Qt::Key_Down:
+        return _current ? *_current + 1 : start;
+    case Qt::Key_PageUp:
+        return _current.value_or(start) - page;
+    case Qt::Key_PageDown:
+        return _current.value_or(start) + page;
+    case Qt::Key_Home:
+        return 0;
+    case Qt::Key_End:
+        return last;
+    default:
+        return std::nullopt;
+    }
+}
+
+void TableView::keyPressEvent(QKeyEvent* event)
+{
+    const bool isPlain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
+    const auto target = isPlain ? keyTarget(event->key()) : std::nullopt;
+    const bool isEnter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (target && _rowCount > 0)
+        moveTo(std::clamp(*target, 0, _rowCount - 1));
+    else if (isPlain && isEnter && _current)
+        activate(*_current);
+    else
+        event->ignore();
+}
+
+void TableView::moveTo(int row)
+{
+    _current = row;
+    _showsKeyboardFrame = true;
+    scrollTo(row);
+    updateLooks();
+}
+
+void TableView::scrollTo(int row)
+{
+    const int top = row * rowHeight;
+    const int value = verticalScrollBar()->value();
+    const int highest = std::min(value, top);
+    verticalScrollBar()->setValue(std::max(highest, top + rowHeight - viewport()->height()));
+}
+
+void TableView::focusInEvent(QFocusEvent*)
+{
+    updateLooks();
+}
+
+void TableView::focusOutEvent(QFocusEvent*)
+{
+    updateLooks();
+}
+
+} // namespace ventrik

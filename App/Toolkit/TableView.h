@@ -1,0 +1,105 @@
+#pragma once
+
+#include "App/Toolkit/TableRow.h"
+
+#include <QAbstractScrollArea>
+
+#include <deque>
+#include <map>
+#include <memory>
+#include <optional>
+#include <vector>
+
+namespace ventrik
+{
+
+/// Where a row stands.
+struct IndexPath {
+    int section = 0;
+    int row = 0;
+    bool operator==(const IndexPath&) const = default;
+};
+
+class TableView;
+
+/// What a table shows; it outlives the table's use of it.
+class TableViewDataSource
+{
+  public:
+    virtual ~TableViewDataSource() = default;
+    virtual int rowsInSection(int section) = 0;
+    /// A row that is ready to be shown, reused where possible.
+    virtual std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) = 0;
+    virtual void rowSelected(TableView& table, std::optional<IndexPath> indexPath) = 0;
+};
+
+/// A plain list of rows of one height in one section. Only the rows in view exist; those that leave
+/// it wait to be used again.
+class TableView : public QAbstractScrollArea
+{
+  public:
+    static constexpr int rowHeight = 50;
+
+    explicit TableView(TableViewDataSource& dataSource, QWidget* parent = nullptr);
+    ~TableView() override;
+
+    /// Asks for everything anew; the scroll position stays.
+    void reloadData();
+    /// A row that waits under that identifier, or none. While an unchanged table is reloaded, every
+    /// row is handed out for its own former place.
+    std::unique_ptr<TableRow> dequeueReusableRow(const QString& identifier);
+
+    std::optional<IndexPath> indexPathForSelectedRow() const;
+    void selectRow(IndexPath indexPath);
+    void deselectRow(IndexPath indexPath);
+
+    /// Null for a row out of view.
+    TableRow* rowAt(IndexPath indexPath) const;
+    /// From the top down.
+    std::vector<TableRow*> visibleRows() const;
+
+  protected:
+    void resizeEvent(QResizeEvent* event) override;
+    void scrollContentsBy(int dx, int dy) override;
+    void mousePressEvent(QMouseEvent* event) override;
+    void mouseMoveEvent(QMouseEvent* event) override;
+    void mouseReleaseEvent(QMouseEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
+    void focusOutEvent(QFocusEvent* event) override;
+
+  private:
+    struct RowRange {
+        int first;
+        int end;
+        bool contains(int row) const { return row >= first && row < end; }
+    };
+
+    RowRange rangeInView() const;
+    std::optional<int> rowAtPosition(const QPoint& position) const;
+    void updateScrollRange();
+    void layoutRows();
+    void retire(std::unique_ptr<TableRow> row);
+    void showRow(int row);
+    void updateLooks();
+    void updateLook(int row, TableRow& widget) const;
+    void setHighlighted(std::optional<int> row);
+    void activate(int row);
+    void moveTo(int row);
+    void scrollTo(int row);
+    std::optional<int> keyTarget(int key) const;
+
+    TableViewDataSource& _dataSource;
+    int _rowCount = 0;
+    // Rows are children of the viewport, which goes after them.
+    std::map<int, std::unique_ptr<TableRow>> _rows;
+    std::map<QString, std::deque<std::unique_ptr<TableRow>>> _reusable;
+    std::optional<int> _selected;
+    std::optional<int> _pressed;
+    QPoint _pressPosition;
+    // Where the keyboard is; its frame shows once a key has been used.
+    std::optional<int> _current;
+    bool _showsKeyboardFrame = false;
+};
+
+} // namespace ventrik

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <QPixmap>
+#include <QPointer>
+#include <QWidget>
+
+namespace ventrik
+{
+
+/// A short animation from an old look of a widget to its new one. What the widget is changes at
+/// once; this covers it with moving pictures for a moment and is gone then.
+class Transition : public QWidget
+{
+  public:
+    enum class Kind {
+        Fade, ///< the old look fades away over the widget itself
+        Push, ///< the new look comes in from the right
+        Pop,  ///< the old look goes away to the right
+    };
+
+    /// Deletes itself at the end. `after` is not needed for a fade.
+    Transition(Kind kind, QWidget& covered, QPixmap before, QPixmap after = {});
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+
+  private:
+    void draw(QPainter& painter) const;
+
+    Kind _kind;
+    QPixmap _before;
+    QPixmap _after;
+    qreal _progress = 0;
+};
+
+} // namespace ventrik

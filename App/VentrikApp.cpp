@@ -1,0 +1,165 @@
+#include "App/VentrikApp.h"
+
+#include <QGuiApplication>
+#include <QScreen>
+#include <QVBoxLayout>
+
+#include <filesystem>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr const char* saveButtonMarker =
+    "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
+// The button comes with the screen that it opens.
+constexpr bool hasSaveScreen = false;
+
+constexpr std::string_view homeScreenDomain = "org.ventrik.HomeScreen";
+constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
+
+constexpr const char* firstStatus = "Connecting";
+constexpr const char* connectingStatus = "Connecting...";
+
+// Every screen of the stack is a pane.
+VentrikPaneController& paneOf(Screen& screen)
+{
+    return static_cast<VentrikPaneController&>(screen);
+}
+
+bool exists(const char* path)
+{
+    std::error_code error;
+    return std::filesystem::exists(path, error);
+}
+
+} // namespace
+
+VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
+    : _platform(platform), _options(std::move(options))
+{
+}
+
+VentrikApp::~VentrikApp() = default;
+
+void VentrikApp::getSaveButtonPref()
+{
+    setAllowSaveButton(hasSaveScreen && (_options.saveButton || exists(saveButtonMarker)));
+}
+
+void VentrikApp::applicationDidFinishLaunching()
+{
+    getSaveButtonPref();
+    createWindow();
+    _model = std::make_shared<VentrikModel>(_platform, [this] { updateViewControllerFromModel(); });
+    setUpdateMessage(connectingStatus);
+    createDateFormatter();
+    createNavigationStack();
+    showWindow();
+    startModelLater();
+}
+
+void VentrikApp::createWindow()
+{
+    _window = std::make_unique<QWidget>();
+    _window->setWindowTitle(QStringLiteral("Ventrik"));
+    if (_options.windowSize)
+        _window->resize(*_options.windowSize);
+    else
+        _window->setGeometry(QGuiApplication::primaryScreen()->geometry());
+}
+
+void VentrikApp::createDateFormatter()
+{
+    _dateFormatter = std::make_unique<DateFormatter>(_platform.clock);
+    _dateFormatter->setDateFormat(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
+}
+
+void VentrikApp::createNavigationStack()
+{
+    auto root = VentrikPaneController::initWithNode(*this, nullptr, "/");
+    root->setStatus(firstStatus, true);
+    _navController = new NavigationStack(std::move(root), _window.get());
+    _navController->setAnimationEnabled(_options.animation);
+    _navController->setDelegate(this);
+}
+
+void VentrikApp::showWindow()
+{
+    auto* layout = new QVBoxLayout(_window.get());
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(_navController);
+    _window->show();
+    _window->activateWindow();
+}
+
+// Not before the launch has returned; by then the application may have ended again.
+void VentrikApp::startModelLater()
+{
+    _platform.mainQueue.async([started = std::weak_ptr(_model)] {
+        if (const auto model = started.lock())
+            model->restartMonitor();
+    });
+}
+
+void VentrikApp::applicationWillTerminate()
+{
+    _setGSMRSSI(false);
+    setUpdateMessage(std::nullopt);
+    _dateFormatter.reset();
+    _window->hide();
+    _navController = nullptr;
+    _window.reset();
+    _model.reset();
+}
+
+void VentrikApp::_setGSMRSSI(bool value)
+{
+    _platform.preferences.set(homeScreenDomain, showGSMRSSIKey, value);
+    _platform.preferences.synchronize(homeScreenDomain);
+    _platform.preferences.postChanged(homeScreenDomain, showGSMRSSIKey);
+}
+
+void VentrikApp::showSaveView() {}
+
+void VentrikApp::closeSaveView() {}
+
+void VentrikApp::updateStatusForViewController(VentrikPaneController& pane)
+{
+    if (_model->isConnected())
+        pane.setStatus(_updateMessage.value_or(std::string()), false);
+    else
+        pane.setStatus(connectingStatus, true);
+}
+
+bool VentrikApp::reloadPane(const std::vector<Screen*>& screens, std::size_t index)
+{
+    VentrikPaneController& pane = paneOf(*screens[index]);
+    const bool isRoot = index == 0;
+    ModelNodePointer node = isRoot ? _model->topLevelNodes() : _model->nodeAtPath(pane.path());
+    if (!node && !isRoot) {
+        _navController->popTo(*screens[index - 1], true);
+        return false;
+    }
+    pane.reloadWithNode(std::move(node));
+    return true;
+}
+
+void VentrikApp::updateViewControllerFromModel()
+{
+    const std::vector<Screen*> screens = _navController->screens();
+    for (std::size_t i = 0; i < screens.size() && reloadPane(screens, i); ++i) {
+    }
+    if (_model->isConnected())
+        setUpdateMessage(_dateFormatter->stringFromDate(_platform.clock.now()));
+    updateStatusForViewController(paneOf(_navController->topScreen()));
+}
+
+void VentrikApp::willShowScreen(NavigationStack&, Screen& screen, bool)
+{
+    updateStatusForViewController(paneOf(screen));
+}
+
+} // namespace ventrik

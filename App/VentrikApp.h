@@ -1,0 +1,82 @@
+#pragma once
+
+#include "App/DateFormatter.h"
+#include "App/Toolkit/NavigationStack.h"
+#include "App/VentrikPaneController.h"
+#include "Model/VentrikModel.h"
+#include "Platform/Platform.h"
+
+#include <QSize>
+#include <QWidget>
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace ventrik
+{
+
+struct VentrikAppOptions {
+    bool saveButton = false;       ///< offers Save also where the marker path is missing
+    std::string snapshotDirectory; ///< where Save writes; empty: the default directory
+    bool animation = true;
+    std::optional<QSize> windowSize; ///< none: as large as the main screen
+};
+
+/// The application: builds the window, the model and the root pane, brings the panes up to date
+/// after each refresh, and undoes its one system setting at the end. Everything runs on the main
+/// queue; a QApplication exists for as long as this does.
+class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost
+{
+  public:
+    VentrikApp(const Platform& platform, VentrikAppOptions options);
+    ~VentrikApp() override;
+    VentrikApp(const VentrikApp&) = delete;
+    VentrikApp& operator=(const VentrikApp&) = delete;
+
+    void getSaveButtonPref();
+    void applicationDidFinishLaunching();
+    void applicationWillTerminate();
+    /// Writes whether the home screen shows the signal level as a number.
+    void _setGSMRSSI(bool value);
+
+    void showSaveView() override;
+    void closeSaveView();
+
+    void updateStatusForViewController(VentrikPaneController& pane);
+    void updateViewControllerFromModel();
+    void willShowScreen(NavigationStack& stack, Screen& screen, bool animated) override;
+
+    /// Null before launch and after termination, as is the stack, which belongs to the window.
+    QWidget* window() const { return _window.get(); }
+    NavigationStack* navController() const { return _navController; }
+
+    const std::optional<std::string>& updateMessage() const { return _updateMessage; }
+    void setUpdateMessage(std::optional<std::string> message)
+    {
+        _updateMessage = std::move(message);
+    }
+    bool allowSaveButton() const override { return _allowSaveButton; }
+    void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
+
+  private:
+    void createWindow();
+    void createDateFormatter();
+    void createNavigationStack();
+    void showWindow();
+    void startModelLater();
+    /// False when the pane's node is gone; the panes above are popped then, and it with them.
+    bool reloadPane(const std::vector<Screen*>& screens, std::size_t index);
+
+    Platform _platform;
+    VentrikAppOptions _options;
+
+    std::unique_ptr<QWidget> _window;
+    NavigationStack* _navController = nullptr;
+    std::shared_ptr<VentrikModel> _model;
+    bool _allowSaveButton = false;
+    std::unique_ptr<DateFormatter> _dateFormatter;
+    std::optional<std::string> _updateMessage;
+};
+
+} // namespace ventrik

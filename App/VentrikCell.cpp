@@ -1,0 +1,119 @@
+#include "App/VentrikCell.h"
+
+#include "App/Toolkit/Fonts.h"
+#include "App/Toolkit/HorizontalScrollView.h"
+
+#include <QLabel>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr int textPoints = 15;
+constexpr int leftMargin = 10;
+constexpr int gapBesideKey = 50;
+// What the key and the value need beside their own widths.
+constexpr int roomAroundKey = leftMargin + gapBesideKey;
+constexpr int scrolledHeight = 50;
+
+QFont boldFont()
+{
+    return systemFont(textPoints, FontWeight::Bold);
+}
+
+int centredTop(const QRect& bounds, const QSize& size)
+{
+    return (bounds.height() - size.height()) / 2;
+}
+
+} // namespace
+
+VentrikCell::VentrikCell(Style style, const QString& identifier) : TableRow(style, identifier) {}
+
+std::unique_ptr<VentrikCell> VentrikCell::initWithStyleKey(Style style, const QString& identifier)
+{
+    std::unique_ptr<VentrikCell> cell(new VentrikCell(style, identifier));
+    cell->_key = makeLabel(boldFont(), &cell->contentArea());
+    return cell;
+}
+
+std::unique_ptr<VentrikCell> VentrikCell::initWithStyle(Style style, const QString& identifier)
+{
+    std::unique_ptr<VentrikCell> cell(new VentrikCell(style, identifier));
+    cell->_view = new HorizontalScrollView(&cell->contentArea());
+    cell->_key = makeLabel(boldFont(), &cell->_view->content());
+    cell->_value = makeLabel(systemFont(textPoints, FontWeight::Regular), &cell->_view->content());
+    return cell;
+}
+
+void VentrikCell::setKeyText(const QString& text)
+{
+    _key->setText(text);
+    updateAccessibleName();
+}
+
+void VentrikCell::setValueText(const QString& text)
+{
+    if (!_value)
+        return;
+    _value->setText(text);
+    updateAccessibleName();
+}
+
+void VentrikCell::updateAccessibleName()
+{
+    const bool hasValue = _value && !_value->text().isEmpty();
+    setAccessibleName(hasValue ? _key->text() + QStringLiteral(", ") + _value->text()
+                               : _key->text());
+}
+
+void VentrikCell::setLayoutKey()
+{
+    _layout = Layout::Key;
+    layoutSubviews();
+}
+
+void VentrikCell::setLayout()
+{
+    _layout = Layout::KeyAndValue;
+    layoutSubviews();
+}
+
+void VentrikCell::layoutSubviews()
+{
+    TableRow::layoutSubviews();
+    if (_layout == Layout::None)
+        return;
+    placeKey();
+    if (_layout == Layout::KeyAndValue && _value)
+        placeValue();
+}
+
+void VentrikCell::placeKey()
+{
+    const QRect bounds = contentArea().rect();
+    const QSize size = measured(_key->text(), boldFont());
+    _key->setGeometry(bounds.x() + leftMargin, centredTop(bounds, size), size.width(),
+                      size.height());
+}
+
+void VentrikCell::placeValue()
+{
+    const QRect bounds = contentArea().rect();
+    const int keyWidth = measured(_key->text(), boldFont()).width();
+    // Measured in the key's font, which is the wider one, so that the values keep some air on
+    // their right.
+    const QSize size = measured(_value->text(), boldFont());
+    const int needed = keyWidth + roomAroundKey + size.width();
+    const int left = needed < bounds.width() ? bounds.width() - size.width()
+                                             : bounds.x() + keyWidth + roomAroundKey;
+    _value->setGeometry(left, centredTop(bounds, size), size.width(), size.height());
+    const int scrolledWidth =
+        needed > bounds.width() ? bounds.width() + keyWidth + size.width() : bounds.width();
+    _view->setGeometry(bounds.x(), bounds.y(), bounds.width(), scrolledHeight);
+    _view->setContentSize({scrolledWidth, scrolledHeight});
+}
+
+} // namespace ventrik

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "App/Toolkit/TableRow.h"
+
+#include <memory>
+
+class QLabel;
+
+namespace ventrik
+{
+
+class HorizontalScrollView;
+
+/// A row of a pane: a bold name on the left and, for a leaf, its value beside it, to be moved
+/// sideways where it does not fit. A row keeps the structure it was made with, also when it is used
+/// again for a node of the other kind.
+class VentrikCell : public TableRow
+{
+  public:
+    /// A row for an inner node: the key alone.
+    static std::unique_ptr<VentrikCell> initWithStyleKey(Style style, const QString& identifier);
+    /// A row for a leaf: the key and the value in a scroll view.
+    static std::unique_ptr<VentrikCell> initWithStyle(Style style, const QString& identifier);
+
+    QLabel& key() const { return *_key; }
+    /// Null in a row made for an inner node, as is the view.
+    QLabel* value() const { return _value; }
+    HorizontalScrollView* view() const { return _view; }
+
+    void setKeyText(const QString& text);
+    /// Does nothing in a row that has no value.
+    void setValueText(const QString& text);
+
+    /// Lays out the key alone, or both; the row keeps to it when its size changes.
+    void setLayoutKey();
+    void setLayout();
+
+    void layoutSubviews() override;
+
+  private:
+    enum class Layout { None, Key, KeyAndValue };
+
+    VentrikCell(Style style, const QString& identifier);
+
+    void placeKey();
+    void placeValue();
+    void updateAccessibleName();
+
+    QLabel* _key = nullptr;
+    QLabel* _value = nullptr;
+    HorizontalScrollView* _view = nullptr;
+    Layout _layout = Layout::None;
+};
+
+} // namespace ventrik

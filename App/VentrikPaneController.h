@@ -1,0 +1,56 @@
+#pragma once
+
+#include "App/Toolkit/TableScreen.h"
+#include "Model/VentrikModelNode.h"
+
+#include <memory>
+#include <string>
+
+namespace ventrik
+{
+
+/// What the panes ask of the application.
+class VentrikPaneHost
+{
+  public:
+    virtual ~VentrikPaneHost() = default;
+    virtual bool allowSaveButton() const = 0;
+    virtual void showSaveView() = 0;
+};
+
+/// A screen that shows the children of one node of the display tree, with the status below. A touch
+/// on a row that has children opens a pane for it.
+class VentrikPaneController : public TableScreen
+{
+  public:
+    /// The node may be none; the host outlives the pane.
+    static std::unique_ptr<VentrikPaneController>
+    initWithNode(VentrikPaneHost& host, ModelNodePointer node, std::string path);
+
+    void createToolbarItems();
+    void setStatus(const std::string& status, bool isLoading);
+    /// Shows another node's children, or nothing.
+    void reloadWithNode(ModelNodePointer node);
+    const std::string& path() const { return _keyPath; }
+
+    void viewWillAppear(bool animated) override;
+    void viewWillDisappear(bool animated) override;
+    int rowsInSection(int section) override;
+    std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) override;
+    void rowSelected(TableView& table, std::optional<IndexPath> indexPath) override;
+
+  private:
+    VentrikPaneController(VentrikPaneHost& host, ModelNodePointer node, std::string path);
+
+    void updateTitle();
+    const VentrikModelNode::Children& children() const;
+    const ModelNodePointer& childAt(IndexPath indexPath) const;
+
+    VentrikPaneHost& _host;
+    ModelNodePointer _nodes;
+    std::string _keyPath;
+    std::string _status;
+    bool _isLoading = true;
+};
+
+} // namespace ventrik

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "App/Toolkit/ActivityIndicator.h"
+#include "App/VentrikApp.h"
+#include "Platform/TelephonyConstants.h"
+#include "Tests/Support/FakePlatform.h"
+
+#include <QLabel>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace ventrik
+{
+
+/// The application on a fake platform. Its service speaks LTE, whose display has the panes
+/// "Cell" / "Details" / "More" with leaves in each, or UTRAN, where "Details" is missing.
+class AppFixture : public testing::Test
+{
+  protected:
+    static constexpr std::string_view remoteName = FakeTelephonyClient::defaultRemotePortName;
+
+    AppFixture();
+
+    /// Launches and runs the turn in which the model starts.
+    void launchAndConnect();
+    /// A message arrives and the next tick shows it.
+    void refreshWithData();
+    /// The service comes back with another technology; the model finds out at its next tick.
+    void changeTechnology(std::string_view technology);
+    void loseService();
+
+    VentrikPaneController& pane(std::size_t index);
+    VentrikPaneController& topPane();
+    /// The name of each pane on the stack, bottom first.
+    std::vector<std::string> titles();
+    void openRow(int row);
+    static std::string statusText(const VentrikPaneController& pane);
+    static bool isSpinning(const VentrikPaneController& pane);
+
+    FakePlatform fake;
+    VentrikApp app{fake.platform(), {false, {}, false, QSize(480, 640)}};
+};
+
+} // namespace ventrik

@@ -1,0 +1,191 @@
+#include "Tests/App/TestScreen.h"
+
+#include <QApplication>
+#include <QTest>
+
+#include <gmock/gmock.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class NavigationStackTest : public testing::Test, public NavigationStackDelegate
+{
+  protected:
+    NavigationStackTest() { stack.setAnimationEnabled(false); }
+
+    std::unique_ptr<TestScreen> screen(const QString& title)
+    {
+        return std::make_unique<TestScreen>(title, events);
+    }
+    void push(const QString& title) { stack.push(screen(title), true); }
+    std::string top() const { return stack.topScreen().title().toStdString(); }
+    void willShowScreen(NavigationStack&, Screen& shown, bool animated) override
+    {
+        events.push_back("will show " + shown.title().toStdString() +
+                         (animated ? " animated" : ""));
+    }
+
+    Events events;
+    NavigationStack stack{screen("Root")};
+};
+
+} // namespace
+
+TEST_F(NavigationStackTest, TheRootHasNoWayBack)
+{
+    showAt(stack, 400, 600);
+    EXPECT_EQ(stack.titleBar().title(), "Root");
+    EXPECT_FALSE(stack.titleBar().backButton().isVisible());
+}
+
+TEST_F(NavigationStackTest, TheRootsFirstAppearanceIsNotToldToTheDelegate)
+{
+    stack.setDelegate(this);
+    showAt(stack, 400, 600);
+    EXPECT_THAT(events, ElementsAre("Root appears"));
+}
+
+TEST_F(NavigationStackTest, TheRootAppearsOnlyOnceByShowingTheWindow)
+{
+    showAt(stack, 400, 600);
+    stack.hide();
+    stack.show();
+    EXPECT_THAT(events, ElementsAre("Root appears"));
+}
+
+TEST_F(NavigationStackTest, APushTellsBothScreensThenTheDelegate)
+{
+    stack.setDelegate(this);
+    push("Child");
+    EXPECT_THAT(events,
+                ElementsAre("Root disappears", "Child appears", "will show Child animated"));
+}
+
+TEST_F(NavigationStackTest, TheBackButtonCarriesThePreviousTitle)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    EXPECT_EQ(stack.titleBar().title(), "Child");
+    EXPECT_TRUE(stack.titleBar().backButton().isVisible());
+    EXPECT_EQ(stack.titleBar().backButton().text(), "Root");
+}
+
+TEST_F(NavigationStackTest, TheTitleBarFollowsTheScreensTitles)
+{
+    push("Child");
+    stack.topScreen().setTitle("New child");
+    stack.screens().front()->setTitle("New root");
+    EXPECT_EQ(stack.titleBar().title(), "New child");
+    EXPECT_EQ(stack.titleBar().backButton().text(), "New root");
+}
+
+TEST_F(NavigationStackTest, AClickOnTheBackButtonPops)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    QTest::mouseClick(&stack.titleBar().backButton(), Qt::LeftButton);
+    EXPECT_EQ(top(), "Root");
+}
+
+TEST_F(NavigationStackTest, EscapeBackspaceAndAltLeftPop)
+{
+    showAt(stack, 400, 600);
+    for (int i = 0; i < 3; ++i)
+        push("Child");
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    EXPECT_EQ(stack.screens().size(), 3U);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Backspace);
+    EXPECT_EQ(stack.screens().size(), 2U);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Left);
+    EXPECT_EQ(stack.screens().size(), 2U);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Left, Qt::AltModifier);
+    EXPECT_EQ(stack.screens().size(), 1U);
+}
+
+TEST_F(NavigationStackTest, TheRootIsNeverPopped)
+{
+    showAt(stack, 400, 600);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    stack.pop(true);
+    EXPECT_EQ(top(), "Root");
+}
+
+TEST_F(NavigationStackTest, PoppingToAScreenDropsAllAboveIt)
+{
+    stack.setDelegate(this);
+    push("A");
+    push("B");
+    push("C");
+    events.clear();
+    stack.popTo(*stack.screens()[1], false);
+    EXPECT_EQ(top(), "A");
+    EXPECT_THAT(events, ElementsAre("C disappears", "A appears", "will show A"));
+    events.clear();
+    deletePopped();
+    EXPECT_THAT(events, testing::UnorderedElementsAre("B deleted", "C deleted"));
+}
+
+TEST_F(NavigationStackTest, PoppingToTheTopOrToAStrangerDoesNothing)
+{
+    const auto stranger = screen("Stranger");
+    push("A");
+    events.clear();
+    stack.popTo(stack.topScreen(), false);
+    stack.popTo(*stranger, false);
+    EXPECT_EQ(top(), "A");
+    EXPECT_THAT(events, IsEmpty());
+}
+
+TEST_F(NavigationStackTest, OnlyTheTopScreenAndItsToolbarAreSeen)
+{
+    showAt(stack, 400, 600);
+    stack.setToolbarHidden(false);
+    push("Child");
+    const Screen& root = *stack.screens()[0];
+    EXPECT_FALSE(root.isVisible());
+    EXPECT_FALSE(root.toolbar().isVisible());
+    EXPECT_TRUE(stack.topScreen().isVisible());
+    EXPECT_TRUE(stack.topScreen().toolbar().isVisible());
+}
+
+TEST_F(NavigationStackTest, TheToolbarIsHiddenUntilAScreenAsksForIt)
+{
+    showAt(stack, 400, 600);
+    EXPECT_TRUE(stack.isToolbarHidden());
+    stack.setToolbarHidden(false);
+    EXPECT_FALSE(stack.isToolbarHidden());
+}
+
+TEST_F(NavigationStackTest, AnAnimatedPushChangesTheStackAtOnceAndItsCoverGoesAway)
+{
+    stack.setAnimationEnabled(true);
+    showAt(stack, 400, 600);
+    const auto covers = [this] { return stack.topScreen().parentWidget()->children().size(); };
+    const auto before = covers();
+    ASSERT_TRUE(stack.canAnimate());
+    push("Child");
+    EXPECT_EQ(top(), "Child");
+    EXPECT_TRUE(stack.topScreen().isVisible());
+    EXPECT_EQ(covers(), before + 2); // the child and the moving pictures
+    EXPECT_TRUE(QTest::qWaitFor([&] { return covers() == before + 1; }));
+}
+
+TEST_F(NavigationStackTest, AnimationsThatInterruptEachOtherLeaveTheRightScreen)
+{
+    stack.setAnimationEnabled(true);
+    showAt(stack, 400, 600);
+    push("A");
+    push("B");
+    stack.pop(true);
+    deletePopped();
+    EXPECT_EQ(top(), "A");
+    EXPECT_TRUE(stack.topScreen().isVisible());
+}
+
+} // namespace ventrik

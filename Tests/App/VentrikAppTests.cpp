@@ -1,0 +1,274 @@
+#include "Tests/App/AppFixture.h"
+
+#include "App/VentrikCell.h"
+
+#include <QGuiApplication>
+#include <QScreen>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class VentrikAppTest : public AppFixture
+{
+  protected:
+    // Down to Cell / Details / More.
+    void openAll()
+    {
+        openRow(0);
+        openRow(0);
+        openRow(0);
+        ASSERT_THAT(titles(), ElementsAre("Ventrik", "Cell", "Details", "More"));
+    }
+    std::string valueText(int row)
+    {
+        const auto& cell = dynamic_cast<VentrikCell&>(*topPane().table().rowAt({0, row}));
+        return cell.value()->text().toStdString();
+    }
+};
+
+} // namespace
+
+TEST_F(VentrikAppTest, TheFirstStatusIsConnectingWithoutDots)
+{
+    app.applicationDidFinishLaunching();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik"));
+    EXPECT_EQ(pane(0).path(), "/");
+    EXPECT_EQ(statusText(pane(0)), "Connecting");
+    EXPECT_TRUE(isSpinning(pane(0)));
+    EXPECT_TRUE(pane(0).table().visibleRows().empty());
+}
+
+TEST_F(VentrikAppTest, TheModelIsStartedOneTurnAfterTheLaunch)
+{
+    app.applicationDidFinishLaunching();
+    EXPECT_EQ(fake.telephony.creationCount(), 0U);
+    fake.mainQueue.run();
+    EXPECT_EQ(fake.telephony.creationCount(), 1U);
+}
+
+TEST_F(VentrikAppTest, TheWindowIsShownAsLargeAsAskedFor)
+{
+    app.applicationDidFinishLaunching();
+    EXPECT_TRUE(app.window()->isVisible());
+    EXPECT_EQ(app.window()->size(), QSize(480, 640));
+}
+
+TEST_F(VentrikAppTest, TheWindowIsAsLargeAsTheMainScreenOtherwise)
+{
+    VentrikApp large(fake.platform(), {});
+    large.applicationDidFinishLaunching();
+    EXPECT_EQ(large.window()->size(), QGuiApplication::primaryScreen()->size());
+}
+
+TEST_F(VentrikAppTest, TheRootStaysEmptyWithConnectingUntilTheFirstRefresh)
+{
+    launchAndConnect();
+    fake.mainQueue.advance(20s);
+    EXPECT_EQ(statusText(pane(0)), "Connecting");
+    EXPECT_TRUE(isSpinning(pane(0)));
+    EXPECT_TRUE(pane(0).table().visibleRows().empty());
+}
+
+TEST_F(VentrikAppTest, ARefreshShowsTheTreeAndItsTime)
+{
+    launchAndConnect();
+    refreshWithData();
+    EXPECT_EQ(pane(0).table().visibleRows().size(), 1U);
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 06:10:28");
+    EXPECT_FALSE(isSpinning(pane(0)));
+}
+
+TEST_F(VentrikAppTest, TheUpdateTimeIsLocalTime)
+{
+    fake.clock.setTimeZone({2 * 3600 + 1800, false});
+    launchAndConnect();
+    refreshWithData();
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 08:40:28");
+}
+
+TEST_F(VentrikAppTest, EachRefreshBringsTheTimeForward)
+{
+    launchAndConnect();
+    refreshWithData();
+    fake.clock.advance(75s);
+    refreshWithData();
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 06:11:43");
+    EXPECT_EQ(app.updateMessage(), "Updated 2026-11-16 at 06:11:43");
+}
+
+TEST_F(VentrikAppTest, APaneShownBeforeTheFirstUpdateReadsConnectingAtRest)
+{
+    launchAndConnect();
+    app.updateStatusForViewController(pane(0));
+    EXPECT_EQ(statusText(pane(0)), "Connecting...");
+    EXPECT_FALSE(isSpinning(pane(0)));
+}
+
+TEST_F(VentrikAppTest, OnlyTheTopPanesStatusChanges)
+{
+    launchAndConnect();
+    refreshWithData();
+    openRow(0);
+    fake.clock.advance(2s);
+    refreshWithData();
+    EXPECT_EQ(statusText(pane(1)), "Updated 2026-11-16 at 06:10:30");
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 06:10:28");
+}
+
+TEST_F(VentrikAppTest, APaneThatComesBackIntoViewGetsTheCurrentStatus)
+{
+    launchAndConnect();
+    refreshWithData();
+    openRow(0);
+    fake.clock.advance(2s);
+    refreshWithData();
+    app.navController()->pop(true);
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 06:10:30");
+}
+
+TEST_F(VentrikAppTest, EveryPaneIsReloaded)
+{
+    launchAndConnect();
+    refreshWithData();
+    openRow(0);
+    EXPECT_EQ(valueText(1), "lte");
+    changeTechnology(kQXLogChannelTechnology_Orbel_UTRAN2);
+    fake.mainQueue.advance(2s);
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell"));
+    EXPECT_EQ(topPane().table().visibleRows().size(), 1U);
+}
+
+TEST_F(VentrikAppTest, AVanishedDrillDownPopsToTheDeepestLivingPane)
+{
+    launchAndConnect();
+    refreshWithData();
+    openAll();
+    changeTechnology(kQXLogChannelTechnology_Orbel_UTRAN2);
+    fake.mainQueue.advance(2s);
+    fake.clock.advance(5s);
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell"));
+    EXPECT_EQ(statusText(topPane()), "Updated 2026-11-16 at 06:10:33");
+}
+
+TEST_F(VentrikAppTest, ADrillDownThatIsStillThereStays)
+{
+    launchAndConnect();
+    refreshWithData();
+    openAll();
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell", "Details", "More"));
+}
+
+TEST_F(VentrikAppTest, WithoutAConnectionTheTopPaneReadsConnectingWithDots)
+{
+    launchAndConnect();
+    refreshWithData();
+    const auto message = app.updateMessage();
+    EXPECT_TRUE(fake.ports.deliver(logChannelLocalPortName, 0, Bytes(13)));
+    fake.mainQueue.run();
+    loseService();
+    fake.mainQueue.advance(2s);
+    EXPECT_EQ(statusText(pane(0)), "Connecting...");
+    EXPECT_TRUE(isSpinning(pane(0)));
+    EXPECT_EQ(app.updateMessage(), message);
+}
+
+TEST_F(VentrikAppTest, APaneOpenedWithoutAConnectionReadsConnectingWithDots)
+{
+    launchAndConnect();
+    refreshWithData();
+    loseService();
+    fake.mainQueue.advance(2s);
+    openRow(0);
+    EXPECT_EQ(statusText(topPane()), "Connecting...");
+    EXPECT_TRUE(isSpinning(topPane()));
+}
+
+TEST_F(VentrikAppTest, WithoutTheMarkerThereIsNoSaveButton)
+{
+    launchAndConnect();
+    refreshWithData();
+    openRow(0);
+    EXPECT_FALSE(app.allowSaveButton());
+    EXPECT_EQ(pane(0).toolbar().items().size(), 3U);
+    EXPECT_EQ(pane(1).toolbar().items().size(), 3U);
+}
+
+TEST_F(VentrikAppTest, WhereSavingIsAllowedEveryPaneHasTheButton)
+{
+    launchAndConnect();
+    app.setAllowSaveButton(true);
+    refreshWithData();
+    openRow(0);
+    EXPECT_EQ(pane(0).toolbar().items().size(), 4U);
+    EXPECT_EQ(pane(1).toolbar().items().size(), 4U);
+}
+
+TEST_F(VentrikAppTest, TheHomeScreenIsLeftAloneUntilTheEnd)
+{
+    launchAndConnect();
+    refreshWithData();
+    EXPECT_THAT(fake.preferences.calls(), IsEmpty());
+}
+
+TEST_F(VentrikAppTest, TerminationResetsTheHomeScreenAndClosesEverything)
+{
+    launchAndConnect();
+    refreshWithData();
+    app.applicationWillTerminate();
+    EXPECT_THAT(fake.preferences.calls(),
+                ElementsAre("set org.ventrik.HomeScreen HSShowGSMRSSI false",
+                            "synchronize org.ventrik.HomeScreen",
+                            "post org.ventrik.HomeScreen HSShowGSMRSSI"));
+    EXPECT_EQ(app.updateMessage(), std::nullopt);
+    EXPECT_EQ(app.window(), nullptr);
+    EXPECT_EQ(app.navController(), nullptr);
+}
+
+TEST_F(VentrikAppTest, TheWindowIsGoneBeforeTheModelTearsDownItsPorts)
+{
+    launchAndConnect();
+    const auto port = fake.ports.localPort(logChannelLocalPortName);
+    std::vector<std::string> order;
+    QObject::connect(app.window(), &QObject::destroyed, [&] {
+        order.push_back(port->isValid() ? "window, port still open" : "window");
+        order.push_back(fake.preferences.calls().empty() ? "no preferences" : "preferences first");
+    });
+    fake.ports.clearOperations();
+    app.applicationWillTerminate();
+    EXPECT_THAT(order, ElementsAre("window, port still open", "preferences first"));
+    const std::string local(logChannelLocalPortName);
+    const std::string remote(remoteName);
+    EXPECT_THAT(fake.ports.operations(),
+                ElementsAre("local callback cleared " + local, "local invalidated " + local,
+                            "remote callback cleared " + remote, "remote invalidated " + remote,
+                            "remote released " + remote));
+}
+
+TEST_F(VentrikAppTest, NothingRunsAfterTermination)
+{
+    launchAndConnect();
+    EXPECT_TRUE(fake.ports.deliver(logChannelLocalPortName, 0, Bytes(13)));
+    app.applicationWillTerminate();
+    fake.mainQueue.advance(1min);
+    EXPECT_EQ(fake.telephony.creationCount(), 1U);
+}
+
+TEST_F(VentrikAppTest, AnApplicationThatEndsBeforeItsFirstTurnStartsNoModel)
+{
+    app.applicationDidFinishLaunching();
+    app.applicationWillTerminate();
+    fake.mainQueue.run();
+    EXPECT_EQ(fake.telephony.creationCount(), 0U);
+}
+
+} // namespace ventrik

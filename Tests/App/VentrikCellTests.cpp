@@ -1,0 +1,177 @@
+#include "App/Toolkit/HorizontalScrollView.h"
+#include "App/VentrikCell.h"
+#include "Tests/App/TestScreen.h"
+
+#include <QFontMetrics>
+#include <QGuiApplication>
+#include <QLabel>
+
+#include <gtest/gtest.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+QFont font15(bool bold)
+{
+    QFont font = QGuiApplication::font();
+    font.setPixelSize(15);
+    font.setBold(bold);
+    return font;
+}
+
+int boldWidth(const QString& text)
+{
+    return QFontMetrics(font15(true)).size(Qt::TextSingleLine, text).width();
+}
+
+int boldHeight()
+{
+    return QFontMetrics(font15(true)).height();
+}
+
+class VentrikCellTest : public testing::Test
+{
+  protected:
+    // A leaf row whose content area is that wide.
+    VentrikCell& leaf(const QString& key, const QString& value, int contentWidth)
+    {
+        cell = VentrikCell::initWithStyle(TableRow::Style::Value, "id");
+        cell->setKeyText(key);
+        cell->setValueText(value);
+        setContentWidth(contentWidth);
+        cell->setLayout();
+        return *cell;
+    }
+    VentrikCell& inner(const QString& key, int contentWidth)
+    {
+        cell = VentrikCell::initWithStyleKey(TableRow::Style::Value, "id");
+        cell->setKeyText(key);
+        setContentWidth(contentWidth);
+        cell->setLayoutKey();
+        return *cell;
+    }
+    void setContentWidth(int contentWidth)
+    {
+        showAt(*cell, contentWidth, 50);
+        showAt(*cell, 2 * contentWidth - cell->contentArea().width(), 50);
+        ASSERT_EQ(cell->contentArea().width(), contentWidth);
+    }
+
+    std::unique_ptr<VentrikCell> cell;
+};
+
+const QString name = "Average RSRP";
+const QString shortValue = "-94 dBm";
+const QString longValue = QString("0123456789").repeated(12);
+
+} // namespace
+
+TEST_F(VentrikCellTest, AnInnerRowHasTheKeyOnly)
+{
+    inner(name, 300);
+    EXPECT_EQ(cell->value(), nullptr);
+    EXPECT_EQ(cell->view(), nullptr);
+    EXPECT_EQ(cell->key().parentWidget(), &cell->contentArea());
+    EXPECT_EQ(cell->style(), TableRow::Style{1});
+}
+
+TEST_F(VentrikCellTest, ALeafRowHasBothLabelsInTheScrollView)
+{
+    leaf(name, shortValue, 300);
+    EXPECT_EQ(cell->view()->parentWidget(), &cell->contentArea());
+    EXPECT_EQ(cell->key().parentWidget(), &cell->view()->content());
+    EXPECT_EQ(cell->value()->parentWidget(), &cell->view()->content());
+}
+
+TEST_F(VentrikCellTest, TheNameIsBoldAndTheValueRegularAtFifteen)
+{
+    leaf(name, shortValue, 300);
+    EXPECT_EQ(cell->key().font(), font15(true));
+    EXPECT_EQ(cell->value()->font(), font15(false));
+}
+
+TEST_F(VentrikCellTest, TheKeyStandsTenFromTheLeftAndCentred)
+{
+    inner(name, 300);
+    EXPECT_EQ(cell->key().geometry(),
+              QRect(10, (50 - boldHeight()) / 2, boldWidth(name), boldHeight()));
+}
+
+TEST_F(VentrikCellTest, AShortValueEndsAtTheRightEdgeMeasuredInBold)
+{
+    leaf(name, shortValue, 500);
+    const int width = boldWidth(shortValue);
+    EXPECT_EQ(cell->value()->geometry(),
+              QRect(500 - width, (50 - boldHeight()) / 2, width, boldHeight()));
+    EXPECT_EQ(cell->view()->contentSize(), QSize(500, 50));
+    EXPECT_EQ(cell->view()->geometry(), QRect(0, 0, 500, 50));
+}
+
+TEST_F(VentrikCellTest, ALongValueFollowsTheKeyByFiftyAndScrolls)
+{
+    leaf(name, longValue, 300);
+    EXPECT_EQ(cell->value()->x(), 10 + boldWidth(name) + 50);
+    EXPECT_EQ(cell->view()->contentSize(), QSize(300 + boldWidth(name) + boldWidth(longValue), 50));
+    cell->view()->setContentOffset(200);
+    EXPECT_EQ(cell->view()->contentOffset(), 200);
+}
+
+TEST_F(VentrikCellTest, AValueThatJustFitsFollowsTheKeyWithoutScrolling)
+{
+    const int width = boldWidth(name) + 60 + boldWidth(shortValue);
+    leaf(name, shortValue, width);
+    EXPECT_EQ(cell->value()->x(), 10 + boldWidth(name) + 50);
+    EXPECT_EQ(cell->view()->contentSize(), QSize(width, 50));
+}
+
+TEST_F(VentrikCellTest, OnePointLessMakesItScroll)
+{
+    const int width = boldWidth(name) + 60 + boldWidth(shortValue) - 1;
+    leaf(name, shortValue, width);
+    EXPECT_EQ(cell->value()->x(), 10 + boldWidth(name) + 50);
+    EXPECT_EQ(cell->view()->contentSize().width(), width + boldWidth(name) + boldWidth(shortValue));
+}
+
+TEST_F(VentrikCellTest, OnePointMoreMovesItToTheRightEdge)
+{
+    const int width = boldWidth(name) + 60 + boldWidth(shortValue) + 1;
+    leaf(name, shortValue, width);
+    EXPECT_EQ(cell->value()->x(), width - boldWidth(shortValue));
+}
+
+TEST_F(VentrikCellTest, AWiderRowLaysItsValueOutAgain)
+{
+    leaf(name, shortValue, 400);
+    setContentWidth(700);
+    EXPECT_EQ(cell->value()->x(), 700 - boldWidth(shortValue));
+    EXPECT_EQ(cell->view()->width(), 700);
+}
+
+TEST_F(VentrikCellTest, ALeafInARowMadeForAnInnerNodeShowsItsNameAlone)
+{
+    inner("Cell", 300);
+    cell->setKeyText(name);
+    cell->setValueText(shortValue);
+    cell->setLayout();
+    EXPECT_EQ(cell->value(), nullptr);
+    EXPECT_EQ(cell->key().text(), name);
+    EXPECT_EQ(cell->key().width(), boldWidth(name));
+}
+
+TEST_F(VentrikCellTest, RowsAreNamedForAssistiveTechnology)
+{
+    EXPECT_EQ(leaf(name, shortValue, 300).accessibleName(), "Average RSRP, -94 dBm");
+    EXPECT_EQ(inner("Cell", 300).accessibleName(), "Cell");
+}
+
+TEST_F(VentrikCellTest, TextsAreNeverTakenForMarkup)
+{
+    leaf("<b>A&B</b>", "<img src=x>", 300);
+    EXPECT_EQ(cell->key().textFormat(), Qt::PlainText);
+    EXPECT_EQ(cell->value()->textFormat(), Qt::PlainText);
+}
+
+} // namespace ventrik

@@ -1,0 +1,327 @@
+#include "App/Toolkit/ActivityIndicator.h"
+#include "App/Toolkit/HorizontalScrollView.h"
+#include "App/VentrikCell.h"
+#include "App/VentrikPaneController.h"
+#include "Tests/App/TestScreen.h"
+
+#include <QLabel>
+#include <QPushButton>
+#include <QScrollBar>
+#include <QTest>
+
+#include <gtest/gtest.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+ModelNodePointer leaf(std::string name, std::string value)
+{
+    return VentrikModelLeafNode::initWithName(std::move(name), std::move(value));
+}
+
+ModelNodePointer inner(std::string name, VentrikModelNode::Children children = {})
+{
+    return VentrikModelTreeNode::initWithName(std::move(name), std::move(children));
+}
+
+class PaneTest : public testing::Test, public VentrikPaneHost
+{
+  protected:
+    bool allowSaveButton() const override { return savesAllowed; }
+    void showSaveView() override { ++savePresses; }
+
+    void open(ModelNodePointer node, std::string path = "/")
+    {
+        auto made = VentrikPaneController::initWithNode(*this, std::move(node), std::move(path));
+        root = made.get();
+        stack = std::make_unique<NavigationStack>(std::move(made));
+        stack->setAnimationEnabled(false);
+        showAt(*stack, 480, 640);
+    }
+    VentrikPaneController& top() const
+    {
+        return static_cast<VentrikPaneController&>(stack->topScreen());
+    }
+    VentrikCell& cell(int row) const
+    {
+        return static_cast<VentrikCell&>(*top().table().rowAt({0, row}));
+    }
+    void click(int row) const { QTest::mouseClick(&cell(row), Qt::LeftButton, {}, {60, 25}); }
+    std::string title() const { return top().title().toStdString(); }
+
+    static ActivityIndicator& indicator(const Screen& pane)
+    {
+        return *dynamic_cast<ActivityIndicator*>(pane.toolbar().items().at(0));
+    }
+    static QLabel& status(const Screen& pane)
+    {
+        return *dynamic_cast<QLabel*>(pane.toolbar().items().at(1));
+    }
+
+    bool savesAllowed = false;
+    int savePresses = 0;
+    VentrikPaneController* root = nullptr;
+    std::unique_ptr<NavigationStack> stack;
+};
+
+} // namespace
+
+TEST_F(PaneTest, WithoutANodeThereAreNoRowsAndTheTitleIsTheProducts)
+{
+    open(nullptr);
+    EXPECT_EQ(title(), "Ventrik");
+    EXPECT_TRUE(top().table().visibleRows().empty());
+}
+
+TEST_F(PaneTest, ALeafAsNodeGivesNoRows)
+{
+    open(leaf("Ventrik", "(unknown)"));
+    EXPECT_TRUE(top().table().visibleRows().empty());
+}
+
+TEST_F(PaneTest, ANewPaneIsLoadingWithAnEmptyStatus)
+{
+    open(nullptr);
+    EXPECT_TRUE(indicator(top()).isAnimating());
+    EXPECT_EQ(status(top()).text(), "");
+}
+
+TEST_F(PaneTest, RowsShowTheChildrenInTheirOrder)
+{
+    open(inner("Ventrik", {inner("Cell"), leaf("Mode", "Idle [3]")}));
+    EXPECT_EQ(title(), "Ventrik");
+    ASSERT_EQ(top().table().visibleRows().size(), 2U);
+    EXPECT_EQ(cell(0).key().text(), "Cell");
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::DisclosureIndicator);
+    EXPECT_EQ(cell(0).value(), nullptr);
+    EXPECT_EQ(cell(1).key().text(), "Mode");
+    EXPECT_EQ(cell(1).accessory(), TableRowAccessory::None);
+    EXPECT_EQ(cell(1).value()->text(), "Idle [3]");
+    EXPECT_EQ(cell(1).reuseIdentifier(), "VentrikPaneControllerCell");
+}
+
+TEST_F(PaneTest, AppearingShowsTheToolbar)
+{
+    open(nullptr);
+    EXPECT_FALSE(stack->isToolbarHidden());
+}
+
+TEST_F(PaneTest, TheStatusStandsBesideTheIndicator)
+{
+    open(nullptr);
+    root->setStatus("Connecting", true);
+    EXPECT_TRUE(indicator(*root).isAnimating());
+    EXPECT_TRUE(QTest::qWaitFor([&] { return indicator(*root).isTurning(); }));
+    EXPECT_EQ(status(*root).text(), "Connecting");
+    EXPECT_EQ(status(*root).font().pixelSize(), 14);
+    EXPECT_EQ(status(*root).size(), status(*root).sizeHint());
+    root->setStatus("Updated", false);
+    EXPECT_FALSE(indicator(*root).isAnimating());
+    EXPECT_EQ(status(*root).text(), "Updated");
+}
+
+TEST_F(PaneTest, EveryStatusChangeAndReloadBuildsTheToolbarAnew)
+{
+    open(nullptr);
+    const auto* first = root->toolbar().items()[0];
+    root->setStatus("Updated", false);
+    const auto* second = root->toolbar().items()[0];
+    root->reloadWithNode(nullptr);
+    const auto* third = root->toolbar().items()[0];
+    EXPECT_NE(first, second);
+    EXPECT_NE(second, third);
+    EXPECT_EQ(status(*root).text(), "Updated");
+}
+
+TEST_F(PaneTest, TheSaveButtonIsThereOnlyWhereItIsAllowed)
+{
+    open(nullptr);
+    EXPECT_EQ(root->toolbar().items().size(), 3U);
+    savesAllowed = true;
+    root->createToolbarItems();
+    const auto& items = root->toolbar().items();
+    ASSERT_EQ(items.size(), 4U);
+    EXPECT_EQ(items[2], nullptr);
+    auto* save = dynamic_cast<QPushButton*>(items[3]);
+    ASSERT_NE(save, nullptr);
+    EXPECT_EQ(save->text(), "Save");
+    QTest::mouseClick(save, Qt::LeftButton);
+    EXPECT_EQ(savePresses, 1);
+}
+
+TEST_F(PaneTest, ATouchOnALeafOnlyRemovesTheHighlight)
+{
+    open(inner("Ventrik", {leaf("Mode", "Idle")}));
+    QTest::mousePress(&cell(0), Qt::LeftButton, {}, {60, 25});
+    EXPECT_TRUE(cell(0).isSelected());
+    QTest::mouseRelease(&cell(0), Qt::LeftButton, {}, {60, 25});
+    EXPECT_FALSE(cell(0).isSelected());
+    EXPECT_EQ(stack->screens().size(), 1U);
+}
+
+TEST_F(PaneTest, AClickOnTheLabelsOfALeafReachesItsRow)
+{
+    open(inner("Ventrik", {leaf("Mode", "Idle")}));
+    QTest::mousePress(cell(0).value(), Qt::LeftButton);
+    EXPECT_TRUE(cell(0).isSelected());
+    QTest::mouseRelease(cell(0).value(), Qt::LeftButton);
+    EXPECT_FALSE(cell(0).isSelected());
+}
+
+TEST_F(PaneTest, ATouchOnAnInnerRowOpensItsPane)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("RSSI", "-70 dBm")})}));
+    root->setStatus("Updated now", false);
+    click(0);
+    ASSERT_EQ(stack->screens().size(), 2U);
+    EXPECT_EQ(title(), "Cell");
+    EXPECT_EQ(top().path(), "/Cell");
+    EXPECT_EQ(cell(0).key().text(), "RSSI");
+    EXPECT_EQ(status(top()).text(), "Updated now");
+    EXPECT_FALSE(indicator(top()).isAnimating());
+}
+
+TEST_F(PaneTest, EnterOpensAPaneAsATouchDoes)
+{
+    open(inner("Ventrik", {leaf("Mode", "Idle"), inner("Cell")}));
+    for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Down, Qt::Key_Return})
+        QTest::keyClick(&top().table(), key);
+    EXPECT_EQ(title(), "Cell");
+}
+
+TEST_F(PaneTest, PathsJoinTheNamesOnTheWay)
+{
+    open(inner("Ventrik", {inner("Cells", {inner("0", {inner("a/b")})})}));
+    click(0);
+    click(0);
+    click(0);
+    EXPECT_EQ(top().path(), "/Cells/0/a/b");
+}
+
+TEST_F(PaneTest, AnInnerNodeWithoutChildrenOpensAnEmptyPane)
+{
+    open(inner("Ventrik", {inner("Empty")}));
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::DisclosureIndicator);
+    click(0);
+    EXPECT_EQ(title(), "Empty");
+    EXPECT_TRUE(top().table().visibleRows().empty());
+}
+
+TEST_F(PaneTest, ComingBackTakesTheSelectionAway)
+{
+    open(inner("Ventrik", {inner("Cell")}));
+    click(0);
+    EXPECT_TRUE(root->table().indexPathForSelectedRow().has_value());
+    QTest::keyClick(&top().table(), Qt::Key_Escape);
+    EXPECT_FALSE(root->table().indexPathForSelectedRow().has_value());
+}
+
+TEST_F(PaneTest, SelectingNoIndexPathDoesNothing)
+{
+    open(inner("Ventrik", {inner("Cell")}));
+    root->rowSelected(root->table(), std::nullopt);
+    EXPECT_EQ(stack->screens().size(), 1U);
+}
+
+TEST_F(PaneTest, AReloadShowsTheNewNodeAndItsTitle)
+{
+    open(nullptr);
+    root->reloadWithNode(inner("Other", {leaf("Mode", "Idle")}));
+    EXPECT_EQ(title(), "Other");
+    EXPECT_EQ(cell(0).value()->text(), "Idle");
+    root->reloadWithNode(nullptr);
+    EXPECT_EQ(title(), "Ventrik");
+    EXPECT_TRUE(top().table().visibleRows().empty());
+}
+
+TEST_F(PaneTest, AReloadOfAnUnchangedPaneKeepsValuesInMixedRows)
+{
+    const auto node = inner("Ventrik", {inner("A"), leaf("B", "1"), inner("C"), leaf("D", "2")});
+    open(node);
+    root->reloadWithNode(node);
+    EXPECT_EQ(cell(1).value()->text(), "1");
+    EXPECT_EQ(cell(3).value()->text(), "2");
+    EXPECT_EQ(cell(0).value(), nullptr);
+}
+
+TEST_F(PaneTest, ALeafInARowFirstMadeForAnInnerNodeShowsNoValue)
+{
+    open(inner("Ventrik", {inner("A")}));
+    root->reloadWithNode(inner("Ventrik", {leaf("B", "1")}));
+    EXPECT_EQ(cell(0).key().text(), "B");
+    EXPECT_EQ(cell(0).value(), nullptr);
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::None);
+}
+
+TEST_F(PaneTest, AnInnerNodeInARowFirstMadeForALeafShowsNoOldValue)
+{
+    open(inner("Ventrik", {leaf("B", "1")}));
+    root->reloadWithNode(inner("Ventrik", {inner("A")}));
+    EXPECT_EQ(cell(0).key().text(), "A");
+    EXPECT_EQ(cell(0).value()->text(), "");
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::DisclosureIndicator);
+}
+
+TEST_F(PaneTest, ALongValueIsScrolledSidewaysByADragAndStaysSoOverAReload)
+{
+    const auto node = inner("Ventrik", {leaf("Mode", std::string(200, 'x'))});
+    open(node);
+    QTest::mousePress(cell(0).view(), Qt::LeftButton, {}, {300, 25});
+    QTest::mouseMove(cell(0).view(), {100, 25});
+    QTest::mouseRelease(cell(0).view(), Qt::LeftButton, {}, {100, 25});
+    EXPECT_EQ(cell(0).view()->contentOffset(), 200);
+    root->reloadWithNode(node);
+    EXPECT_EQ(cell(0).view()->contentOffset(), 200);
+}
+
+TEST_F(PaneTest, AnUprightTouchDragOverLongValuesScrollsTheTable)
+{
+    VentrikModelNode::Children leaves;
+    for (int i = 0; i < 40; ++i)
+        leaves.push_back(leaf(std::to_string(i), std::string(200, 'x')));
+    open(inner("Ventrik", std::move(leaves)));
+    auto* device = QTest::createTouchDevice();
+    QWidget* viewport = root->table().viewport();
+    QTest::touchEvent(viewport, device).press(0, {200, 400}, viewport);
+    for (int y = 390; y >= 100; y -= 10) {
+        QTest::qWait(5); // the scroller works with the speed
+        QTest::touchEvent(viewport, device).move(0, {200, y}, viewport);
+    }
+    QTest::touchEvent(viewport, device).release(0, {200, 100}, viewport);
+    const QScrollBar& bar = *root->table().verticalScrollBar();
+    EXPECT_TRUE(QTest::qWaitFor([&] { return bar.value() > 100; }));
+}
+
+TEST_F(PaneTest, ASidewaysTouchDragScrollsTheLongValue)
+{
+    open(inner("Ventrik", {leaf("Mode", std::string(200, 'x'))}));
+    auto* device = QTest::createTouchDevice();
+    HorizontalScrollView* view = cell(0).view();
+    QTest::touchEvent(view, device).press(0, {400, 25}, view);
+    for (int x = 390; x >= 100; x -= 10) {
+        QTest::qWait(5);
+        QTest::touchEvent(view, device).move(0, {x, 25}, view);
+    }
+    QTest::touchEvent(view, device).release(0, {100, 25}, view);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return view->contentOffset() > 100; }));
+}
+
+TEST_F(PaneTest, DisappearingGivesUpTheKeyboardFocus)
+{
+    open(inner("Ventrik", {inner("Cell")}));
+    ASSERT_TRUE(root->table().hasFocus());
+    root->viewWillDisappear(false);
+    EXPECT_FALSE(root->table().hasFocus());
+}
+
+TEST_F(PaneTest, AnOpenedPaneHasTheKeyboardFocus)
+{
+    open(inner("Ventrik", {inner("Cell")}));
+    click(0);
+    EXPECT_TRUE(top().table().hasFocus());
+}
+
+} // namespace ventrik

@@ -1,0 +1,277 @@
+#include "App/VentrikApp.h"
+#include "Capture/CaptureTechnology.h"
+#include "Platform/Linux/LinuxPlatform.h"
+#include "Platform/Linux/PortDirectory.h"
+#include "Platform/Linux/TerminationSignals.h"
+#include "Platform/TelephonyConstants.h"
+#include "Tools/CommandLine.h"
+
+#include <QApplication>
+#include <QElapsedTimer>
+#include <QIcon>
+#include <QProcess>
+#include <QTemporaryDir>
+
+#include <csignal>
+#include <cstdio>
+#include <cstdlib>
+#include <memory>
+#include <regex>
+
+#include <fmt/format.h>
+#include <getopt.h>
+#include <sys/prctl.h>
+#include <unistd.h>
+
+using namespace ventrik;
+
+namespace
+{
+
+constexpr const char* usage =
+    "usage: ventrik [--demo TECHNOLOGY] [--save-button] [--snapshot-directory DIR]\n"
+    "               [--size WIDTHxHEIGHT] [--no-animation] [--verbose]\n"
+    "\n"
+    "Shows what the baseband tells, as a tree of tables that is brought up to date every 2 s.\n"
+    "\n"
+    "  --demo TECHNOLOGY         brings its own telephony service (lte, gsm, utran, c2k or ifx)\n"
+    "  --save-button             offers Save also where it is switched off\n"
+    "  --snapshot-directory DIR  saves snapshots in DIR\n"
+    "  --size WIDTHxHEIGHT       the window's size (default: that of the main screen)\n"
+    "  --no-animation            every change shows at once\n"
+    "  --verbose                 copies the system log to standard error\n"
+    "  --help, --version\n"
+    "\n"
+    "Exit status: 0 ended, 1 there is no display or no demo service, 2 wrong usage.\n";
+
+struct ViewerOptions {
+    VentrikAppOptions app;
+    std::string demoTechnology; // empty: no demo
+    bool verbose = false;
+};
+
+QSize sizeArgument(const CommandLine& line)
+{
+    static const std::regex form("([1-9][0-9]{0,4})x([1-9][0-9]{0,4})");
+    std::cmatch match;
+    if (!std::regex_match(line.value(), match, form))
+        line.refuse(fmt::format("--size takes WIDTHxHEIGHT, not '{}'", line.value()));
+    return {std::stoi(match[1]), std::stoi(match[2])};
+}
+
+std::string technologyArgument(const CommandLine& line)
+{
+    if (!technologyNamed(line.value()))
+        line.refuse(fmt::format("there is no technology '{}'", line.value()));
+    return line.value();
+}
+
+ViewerOptions parseArguments(int argc, char** argv)
+{
+    static const option options[] = {{"demo", required_argument, nullptr, 'd'},
+                                     {"snapshot-directory", required_argument, nullptr, 's'},
+                                     {"size", required_argument, nullptr, 'z'},
+                                     {"save-button", no_argument, nullptr, 'b'},
+                                     {"no-animation", no_argument, nullptr, 'n'},
+                                     {"verbose", no_argument, nullptr, 'V'},
+                                     {"help", no_argument, nullptr, 'h'},
+                                     {"version", no_argument, nullptr, 'v'},
+                                     {}};
+    CommandLine line("ventrik", argc, argv);
+    ViewerOptions result;
+    for (int letter = 0; (letter = line.next(options)) != -1;) {
+        if (letter == 'd')
+            result.demoTechnology = technologyArgument(line);
+        else if (letter == 's')
+            result.app.snapshotDirectory = line.value();
+        else if (letter == 'z')
+            result.app.windowSize = sizeArgument(line);
+        else if (letter == 'b')
+            result.app.saveButton = true;
+        else if (letter == 'n')
+            result.app.animation = false;
+        else if (letter == 'V')
+            result.verbose = true;
+        else
+            tell(letter == 'h' ? usage : "ventrik " VENTRIK_VERSION "\n");
+    }
+    if (!line.arguments().empty())
+        line.refuse(fmt::format("what is '{}'?", line.arguments().front()));
+    return result;
+}
+
+void complain(std::string_view reason)
+{
+    fmt::print(stderr, "ventrik: {}\n", reason);
+}
+
+bool hasDisplay()
+{
+    return !qEnvironmentVariableIsEmpty("DISPLAY") ||
+           !qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY") ||
+           !qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM");
+}
+
+// A display that is named and cannot be used is fatal to the toolkit: it would abort the process.
+void endWithoutDisplay(QtMsgType type, const QMessageLogContext&, const QString&)
+{
+    if (type != QtFatalMsg)
+        return;
+    complain("the display cannot be opened; ventrik-watch needs none");
+    std::_Exit(EXIT_FAILURE);
+}
+
+// Before the toolkit starts its threads: one that takes these signals would end the process.
+void blockTerminationSignals()
+{
+    sigset_t blocked;
+    sigemptyset(&blocked);
+    for (const int number : {SIGTERM, SIGINT, SIGHUP})
+        sigaddset(&blocked, number);
+    pthread_sigmask(SIG_BLOCK, &blocked, nullptr);
+}
+
+std::unique_ptr<QApplication> makeApplication(int& argc, char** argv)
+{
+    const QtMessageHandler usual = qInstallMessageHandler(endWithoutDisplay);
+    auto application = std::make_unique<QApplication>(argc, argv);
+    qInstallMessageHandler(usual);
+    QGuiApplication::setDesktopFileName(QStringLiteral("ventrik"));
+    return application;
+}
+
+// The service's last words, or how it ended where it had none.
+std::string lastWords(QProcess& process)
+{
+    const QStringList lines =
+        QString::fromUtf8(process.readAllStandardError()).split('\n', Qt::SkipEmptyParts);
+    if (!lines.isEmpty())
+        return lines.last().toStdString();
+    if (process.error() == QProcess::FailedToStart || process.exitStatus() == QProcess::CrashExit)
+        return process.errorString().toStdString();
+    return fmt::format("exit status {}", process.exitCode());
+}
+
+/// A telephony service of our own, in a runtime directory that nobody else uses. It ends with this
+/// process, however that ends.
+class DemoService
+{
+  public:
+    ~DemoService();
+    /// Waits until the service listens; false when it does not come up, which is then told.
+    bool start(const std::string& technology);
+    std::string runtimeDirectory() const { return _directory.path().toStdString(); }
+
+  private:
+    bool waitUntilListening();
+    void tellEnd() { complain("the demo service ended: " + lastWords(_process)); }
+
+    QTemporaryDir _directory; // made with mode 0700
+    QProcess _process;
+};
+
+bool DemoService::start(const std::string& technology)
+{
+    if (!_directory.isValid()) {
+        complain("no directory for the demo: " + _directory.errorString().toStdString());
+        return false;
+    }
+    auto environment = QProcessEnvironment::systemEnvironment();
+    environment.insert("VENTRIK_RUNTIME_DIR", _directory.path());
+    _process.setProcessEnvironment(environment);
+    _process.setStandardOutputFile(QProcess::nullDevice());
+    _process.setChildProcessModifier([parent = getpid()] {
+        // The signal mask is inherited; the service shall see its own signals.
+        sigset_t none;
+        sigemptyset(&none);
+        sigprocmask(SIG_SETMASK, &none, nullptr);
+        prctl(PR_SET_PDEATHSIG, SIGTERM);
+        if (getppid() != parent)
+            _exit(EXIT_FAILURE);
+    });
+    _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
+                   {"--technology", QString::fromStdString(technology)});
+    if (!waitUntilListening())
+        return false;
+    QObject::connect(&_process, &QProcess::finished, qApp, [this] {
+        tellEnd();
+        QCoreApplication::exit(EXIT_FAILURE);
+    });
+    return true;
+}
+
+bool DemoService::waitUntilListening()
+{
+    constexpr int longestWait = 5000; // milliseconds
+    constexpr int turn = 20;
+    const std::string socket =
+        PortDirectory(runtimeDirectory()).socketPath(telephonyServicePortName);
+    QElapsedTimer elapsed;
+    elapsed.start();
+    while (access(socket.c_str(), F_OK) != 0) {
+        if (_process.waitForFinished(turn) || _process.state() == QProcess::NotRunning) {
+            tellEnd();
+            return false;
+        }
+        if (elapsed.hasExpired(longestWait)) {
+            complain("the demo service does not come up");
+            return false;
+        }
+    }
+    return true;
+}
+
+DemoService::~DemoService()
+{
+    constexpr int longestWait = 2000; // milliseconds
+    _process.disconnect(qApp);
+    if (_process.state() == QProcess::NotRunning)
+        return;
+    _process.terminate();
+    if (!_process.waitForFinished(longestWait)) {
+        _process.kill();
+        _process.waitForFinished(longestWait);
+    }
+}
+
+void setWindowIcon(const Resources& resources)
+{
+    if (const auto icon = resources.path("ventrik", "svg"))
+        QApplication::setWindowIcon(QIcon(QString::fromStdString(*icon)));
+}
+
+int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
+{
+    LinuxPlatformOptions platformOptions;
+    platformOptions.runtimeDirectory = runtimeDirectory;
+    platformOptions.verbose = options.verbose;
+    platformOptions.version = VENTRIK_VERSION;
+    LinuxPlatform platform(platformOptions);
+    setWindowIcon(platform.platform().resources);
+    VentrikApp app(platform.platform(), options.app);
+    app.applicationDidFinishLaunching();
+    const int status = QApplication::exec();
+    app.applicationWillTerminate();
+    return status;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    const ViewerOptions options = parseArguments(argc, argv);
+    if (!hasDisplay()) {
+        complain("there is no display; ventrik-watch needs none");
+        return EXIT_FAILURE;
+    }
+    blockTerminationSignals();
+    int toolkitArgc = 1;
+    const auto application = makeApplication(toolkitArgc, argv);
+    const TerminationSignals termination([] { QCoreApplication::quit(); });
+    if (options.demoTechnology.empty())
+        return runViewer(options, {});
+    DemoService demo;
+    if (!demo.start(options.demoTechnology))
+        return EXIT_FAILURE;
+    return runViewer(options, demo.runtimeDirectory());
+}

@@ -13,6 +13,8 @@ namespace
 {
 
 constexpr std::uint64_t cellMonitorSteps = 60;  // every 3 s
+constexpr std::uint64_t idleNeighborSteps = 10; // every 0.5 s while idle
+constexpr std::uint64_t reselectionSteps = 40;  // every 2 s while idle
 constexpr std::uint64_t prefixedMessageGap = 7; // some messages carry the transport prefix
 constexpr int qrxlevmin = -124;                 // dBm
 constexpr double detectableRsrp = -118;         // dBm
@@ -39,15 +41,30 @@ std::optional<TimedMessage> LTEScenario::next()
 void LTEScenario::reportStep()
 {
     const bool hasNewCell = _drive.step() || _step == 0;
+    if (_step == 0)
+        reportSimFiles();
     if (hasNewCell)
         reportNewCell();
+    if (_step == 0 || _drive.isConnected() != _wasConnected)
+        reportPdpContexts();
+    _wasConnected = _drive.isConnected();
+
     if (_drive.isConnected())
         reportConnectedMeasurement();
     else
-        reportIdleMeasurement();
+        reportIdleStep();
     if (_step % cellMonitorSteps == cellMonitorSteps - 1)
         reportCellMonitor();
     ++_step;
+}
+
+void LTEScenario::reportIdleStep()
+{
+    reportIdleMeasurement();
+    if (_step % idleNeighborSteps == 0)
+        reportIdleNeighbors();
+    if (_step % reselectionSteps == 0)
+        reportReselectionCandidates();
 }
 
 void LTEScenario::reportNewCell()
@@ -56,6 +73,8 @@ void LTEScenario::reportNewCell()
     reportAntennaCount();
     reportIdleMeasurement();
     reportConnectedMeasurement();
+    reportIdleNeighbors();
+    reportReselectionCandidates();
     reportCellMonitor();
 }
 
@@ -130,11 +149,7 @@ void LTEScenario::reportConnectedMeasurement()
         .u16(23, raw(rsrp, -140, 0.25, 16))
         .u16(25, raw(_drive.rsrq(serving, rsrp), -20, 0.125, 16));
 
-    std::vector<const LTECell*> neighbours;
-    for (const LTECell& cell : LTEDrive::cells())
-        if (&cell != &serving && cell.downlinkEarfcn == serving.downlinkEarfcn &&
-            _drive.averageRsrp(cell) > detectableRsrp)
-            neighbours.push_back(&cell);
+    const auto neighbours = neighborsOfServingCell();
     const std::size_t measured = std::min(neighbours.size(), measuredNeighbours);
     const std::size_t detected = neighbours.size() - measured;
     packet.u8(27, static_cast<std::uint8_t>(measured)).u8(28, static_cast<std::uint8_t>(detected));
@@ -148,6 +163,107 @@ void LTEScenario::reportConnectedMeasurement()
     for (std::size_t i = measured; i < neighbours.size(); ++i, offset += 2)
         packet.u16(offset, neighbours[i]->physicalCellId);
     report(std::move(packet));
+}
+
+std::vector<const LTECell*> LTEScenario::neighborsOfServingCell() const
+{
+    const LTECell& serving = _drive.servingCell();
+    std::vector<const LTECell*> neighbours;
+    for (const LTECell& cell : LTEDrive::cells())
+        if (&cell != &serving && cell.downlinkEarfcn == serving.downlinkEarfcn &&
+            _drive.averageRsrp(cell) > detectableRsrp)
+            neighbours.push_back(&cell);
+    return neighbours;
+}
+
+void LTEScenario::reportIdleNeighbors()
+{
+    const auto neighbours = neighborsOfServingCell();
+    if (neighbours.empty())
+        return; // the record holds one cell at least
+    PacketBuilder packet(0xB180);
+    packet.u8(13, 2)
+        .u16(17, _drive.servingCell().downlinkEarfcn)
+        .bits(19, 0, 6, (qrxlevmin + 140) / 2)
+        .bits(19, 6, 5, static_cast<std::uint32_t>(neighbours.size() - 1));
+    std::size_t offset = 21;
+    for (const LTECell* cell : neighbours) {
+        const double measured = _drive.measuredRsrp(*cell);
+        const double average = _drive.averageRsrp(*cell);
+        const double measuredRsrq = _drive.rsrq(*cell, measured);
+        packet.bits(offset, 0, 9, cell->physicalCellId)
+            .bits(offset + 1, 1, 8, raw(_drive.rssi(*cell, measured, measuredRsrq), -140, 0.5, 8))
+            .bits(offset + 2, 1, 9, raw(measured, -140, 0.5, 9))
+            .bits(offset + 4, 0, 9, raw(average, -140, 0.5, 9))
+            .bits(offset + 5, 1, 7, raw(measuredRsrq, -30, 0.25, 7))
+            .bits(offset + 6, 0, 7, raw(_drive.rsrq(*cell, average), -30, 0.25, 7))
+            .bits(offset + 6, 7, 7, raw(average - qrxlevmin, -30, 1, 7))
+            .u16(offset + 8, static_cast<std::uint16_t>(cell->physicalCellId % 40))
+            .bits(offset + 12, 0, 11, static_cast<std::uint32_t>(_step % 1024))
+            .bits(offset + 12, 11, 19, static_cast<std::uint32_t>(cell->position))
+            .u32(offset + 16, 0);
+        offset += 20;
+    }
+    report(std::move(packet));
+}
+
+// One candidate: they lie 4 bytes apart, so only the last one's technology part is its own.
+void LTEScenario::reportReselectionCandidates()
+{
+    const LTECell& serving = _drive.servingCell();
+    const auto cells = LTEDrive::cells();
+    const auto candidate = std::ranges::max_element(cells, {}, [&](const LTECell& cell) {
+        return &cell == &serving ? -999.0 : _drive.averageRsrp(cell);
+    });
+    report(PacketBuilder(0xB186)
+               .u8(13, 1)
+               .u16(15, serving.downlinkEarfcn)
+               .u16(17, serving.physicalCellId)
+               .u16(19, 1)
+               .u16(21, candidate->layerPriority)
+               .u16(23, 0)
+               .u16(25, candidate->downlinkEarfcn)
+               .bits(27, 7, 9, candidate->physicalCellId)
+               .size(29));
+}
+
+void LTEScenario::reportSimFiles()
+{
+    reportList(0xFF0000, PlistDictionary{{"kSimFile_ICCID", "89490200001234567890"},
+                                         {"kSimFile_MSISDN", "+491701234567"},
+                                         {"kSimFile_MBDN", "+491703311"},
+                                         {"kSimFile_HPPLMN", "30 min"},
+                                         {"kSimFile_LOCI", "262 07 LAC 4711 updated"},
+                                         {"kSimFile_PSLOCI", "262 07 RAC 17 updated"},
+                                         {"kSimFile_ACC", "0x0008"},
+                                         {"kSimFile_AD", "normal operation, MNC of 2 digits"},
+                                         {"kSimFile_FPLMN", "262 01, 262 02"},
+                                         {"kSimFile_AHPLMN", "262 07"},
+                                         {"kSimFile_RATMODE", "automatic"},
+                                         {"kSimFile_PNN", "Ventrik Mobile"},
+                                         {"kSimFile_OPL", "262 07 0000-FFFE"},
+                                         {"kSimFile_OPLMNAcT", "262 07 E-UTRAN"}});
+}
+
+void LTEScenario::reportPdpContexts()
+{
+    PlistArray contexts{PlistDictionary{{"APN", "ims"},
+                                        {"Bearer", "5"},
+                                        {"Type", "IPv6"},
+                                        {"Address", "2001:db8:2:1::17"},
+                                        {"QCI", "5"}}};
+    if (_drive.isConnected())
+        contexts.append(PlistDictionary{{"APN", "internet"},
+                                        {"Bearer", "6"},
+                                        {"Type", "IPv4v6"},
+                                        {"Address", "192.0.2.17"},
+                                        {"QCI", "9"}});
+    reportList(0xFF0002, contexts);
+}
+
+void LTEScenario::reportList(std::uint32_t logCode, const PlistValue& root)
+{
+    _messages.push_back({_step * LTEDrive::stepDuration, propertyListPacket(logCode, root)});
 }
 
 void LTEScenario::reportCellMonitor()
@@ -169,9 +285,7 @@ void LTEScenario::reportCellMonitor()
             {kQXCellMonitorBandInfo, cell.band},
             {kQXCellMonitorUARFCN, cell.downlinkEarfcn}});
     }
-    constexpr std::uint32_t cellMonitorLogCode = 0xFF0001;
-    _messages.push_back(
-        {_step * LTEDrive::stepDuration, propertyListPacket(cellMonitorLogCode, cells)});
+    reportList(0xFF0001, cells);
 }
 
 } // namespace ventrik

@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <deque>
+#include <vector>
 
 namespace ventrik
 {
@@ -23,17 +24,25 @@ class LTEScenario : public MessageSource
 
   private:
     void reportStep();
+    void reportIdleStep();
     void reportNewCell();
     void reportCellInfo();
     void reportAntennaCount();
     void reportIdleMeasurement();
     void reportConnectedMeasurement();
+    void reportIdleNeighbors();
+    void reportReselectionCandidates();
     void reportCellMonitor();
+    void reportSimFiles();
+    void reportPdpContexts();
+    std::vector<const LTECell*> neighborsOfServingCell() const;
+    void reportList(std::uint32_t logCode, const PlistValue& root);
     void report(PacketBuilder packet);
 
     LTEDrive _drive;
     std::uint64_t _step = 0;
     std::uint64_t _messageCount = 0;
+    bool _wasConnected = false;
     std::deque<TimedMessage> _messages;
 };
 

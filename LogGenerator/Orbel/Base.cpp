@@ -70,7 +70,7 @@ std::int16_t Base::lookUpECNO(std::uint32_t rawValue)
     return step == ecnoSteps.end() ? std::int16_t{0} : step->value;
 }
 
-void Base::show(std::string_view key, std::string value) const
+void Base::show(std::string_view key, PlistValue value) const
 {
     if (auto dictionary = sectionRef.dictionary())
         dictionary->set(key, std::move(value));
@@ -80,6 +80,18 @@ void Base::withdraw(std::string_view key) const
 {
     if (auto dictionary = sectionRef.dictionary())
         dictionary->remove(key);
+}
+
+void Base::clearRows() const
+{
+    if (auto list = sectionRef.array())
+        clearElementsInArray(*list);
+}
+
+void Base::showRows(const PlistArray& rows) const
+{
+    if (auto list = sectionRef.array())
+        replaceArray(*list, rows);
 }
 
 void Base::logUnknownMessage(std::uint32_t logCode) const

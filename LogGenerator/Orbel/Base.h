@@ -57,9 +57,14 @@ class Base
     SystemLog& log() const { return _log; }
 
     /// Stores a value under a key of the section's dictionary.
-    void show(std::string_view key, std::string value) const;
+    void show(std::string_view key, PlistValue value) const;
     /// Removes a key from the section's dictionary.
     void withdraw(std::string_view key) const;
+
+    /// Empties the section's list.
+    void clearRows() const;
+    /// Puts the rows in the place of the section's list.
+    void showRows(const PlistArray& rows) const;
 
     void logUnknownMessage(std::uint32_t logCode) const;
 

@@ -10,6 +10,18 @@ ByteView LogPacket::payload() const
     return _bytes.subspan(std::min(logPacketHeaderSize, _bytes.size()));
 }
 
+LogPacket LogPacket::from(std::size_t offset) const
+{
+    return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));
+}
+
+std::size_t RecordElements::completeIn(const LogPacket& packet) const
+{
+    if (packet.size() < offset + needed)
+        return 0;
+    return std::min(count, (packet.size() - offset - needed) / stride + 1);
+}
+
 ByteView stripPrefix(ByteView data)
 {
     constexpr std::uint8_t prefixMark = 0x81;

@@ -28,6 +28,8 @@ class LogPacket
     ByteView bytes() const { return _bytes; }
     /// What follows the header; empty when there is none.
     ByteView payload() const;
+    /// The packet from an offset on, as the place from which a repeated element counts.
+    LogPacket from(std::size_t offset) const;
 
     std::uint8_t u8(std::size_t offset) const
     {
@@ -51,6 +53,22 @@ class LogPacket
 
   private:
     ByteView _bytes;
+};
+
+/// The elements of a repeated record: `count` of them, one every `stride` bytes from `offset`. An
+/// element is complete when its first `needed` bytes lie inside the packet.
+struct RecordElements {
+    std::size_t offset;
+    std::size_t stride;
+    std::size_t count;
+    std::size_t needed;
+
+    /// How many can be read: the count that the record declares may promise more than it holds.
+    std::size_t completeIn(const LogPacket& packet) const;
+    LogPacket element(const LogPacket& packet, std::size_t index) const
+    {
+        return packet.from(offset + stride * index);
+    }
 };
 
 /// Removes the transport prefix. The data must be empty or hold at least 2 bytes.

@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/OrbelLogGenerator2.h"
 
+#include "LogGenerator/Orbel/UnparsableDataException.h"
 #include "PropertyList/PropertyListReader.h"
 
 #include <charconv>
@@ -45,7 +46,16 @@ void OrbelLogGenerator2::updateWithData(ByteView data)
     if (!subscribers)
         return;
     for (Base* section : *subscribers)
-        section->updateWithData(packet, logCode);
+        deliver(packet, logCode, *section);
+}
+
+void OrbelLogGenerator2::deliver(const LogPacket& packet, std::uint32_t logCode, Base& section)
+{
+    try {
+        section.updateWithData(packet, logCode);
+    } catch (const UnparsableDataException&) {
+        // The section has said so in the log; the display stays, later sections and packets go on.
+    }
 }
 
 std::optional<PlistValue> OrbelLogGenerator2::generateLogUsingState(PlistDictionary& state)

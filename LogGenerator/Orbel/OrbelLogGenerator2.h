@@ -40,6 +40,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     void initWithPListName(std::string templateName, std::shared_ptr<ClassIndex> classIndex);
 
   private:
+    static void deliver(const LogPacket& packet, std::uint32_t logCode, Base& section);
     std::optional<PlistValue> loadTemplate(PlistDictionary& state);
     void bindSection(std::string_view name, const PlistValue& container);
     void bindSections(const PlistValue& value);

@@ -34,14 +34,14 @@ class GeneratorFixture : public testing::Test
     PlistDictionary state;
 };
 
-/// One section bound to a dictionary of its own.
-template <typename Section>
-class SectionFixture : public testing::Test
+/// One section bound to a container of its own.
+template <typename Section, typename Container>
+class BoundSectionFixture : public testing::Test
 {
   protected:
-    SectionFixture()
+    BoundSectionFixture()
     {
-        section.updateSectionRef(values);
+        section.updateSectionRef(container);
         log.clear();
     }
 
@@ -52,11 +52,33 @@ class SectionFixture : public testing::Test
     }
     void feed(const PacketBuilder& packet) { feed(packet.build()); }
 
+    CapturingSystemLog log;
+    Container container;
+    Section section{log};
+};
+
+/// A section of keys and values.
+template <typename Section>
+class SectionFixture : public BoundSectionFixture<Section, PlistDictionary>
+{
+  protected:
     std::string shown(std::string_view key) { return textAt(values, {key}); }
 
-    CapturingSystemLog log;
-    PlistDictionary values;
-    Section section{log};
+    PlistDictionary& values = this->container;
+};
+
+/// A section of rows.
+template <typename Section>
+class ListSectionFixture : public BoundSectionFixture<Section, PlistArray>
+{
+  protected:
+    /// The text under a key of a row; "(none)" where there is none.
+    std::string shown(std::size_t row, std::string_view key)
+    {
+        return row < rows.size() ? textAt(rows[row], {key}) : "(none)";
+    }
+
+    PlistArray& rows = this->container;
 };
 
 } // namespace ventrik

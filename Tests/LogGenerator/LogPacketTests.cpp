@@ -82,6 +82,31 @@ TEST(LogPacket, EffectiveCodeOfType255HasTheExtraCodeBase)
     EXPECT_EQ(effectiveLogCode(LogPacket(packet)), 16711681U);
 }
 
+TEST(RecordElements, StopAtTheLastCompleteOne)
+{
+    const RecordElements elements{13, 4, 3, 2};
+    // The third element's two bytes end at 13 + 8 + 2.
+    for (const auto& [size, count] : {std::pair<std::size_t, std::size_t>{13, 0},
+                                      {14, 0},
+                                      {15, 1},
+                                      {18, 1},
+                                      {19, 2},
+                                      {22, 2},
+                                      {23, 3},
+                                      {100, 3}}) {
+        const Bytes bytes(size);
+        EXPECT_EQ(elements.completeIn(LogPacket(bytes)), count) << size;
+    }
+}
+
+TEST(RecordElements, AnElementCountsFromItsOwnFirstByte)
+{
+    const Bytes bytes{0, 0, 1, 2, 3, 4};
+    const LogPacket packet(bytes);
+    EXPECT_EQ((RecordElements{2, 2, 2, 2}.element(packet, 1).u16(0)), 0x0403);
+    EXPECT_EQ(packet.from(9).size(), 0U);
+}
+
 TEST(PacketBuilder, WritesTheHeader)
 {
     const Bytes packet = PacketBuilder(0xFF0001).timestamp(0x0807060504030201).u8(13, 9).build();

@@ -301,14 +301,34 @@ TEST_F(OrbelLogGenerator2Test, ADisplayOfUnknownOriginIsReturnedAsItIs)
     EXPECT_EQ(textAt(*generator->getDisplayFromState(state), {"a"}), "b");
 }
 
+TEST_F(OrbelLogGenerator2Test, UnparsableSimDataIsContainedAndLaterPacketsGoOn)
+{
+    platform.resources.add("/res/LTE.plist",
+                           plistXml("<dict><key>SIM Info</key><dict><key>EF-ICCID</key>"
+                                    "<string>-</string></dict>"
+                                    "<key>PDP Context Info</key><array/></dict>"));
+    const auto lte = LTELogGenerator::generator(services());
+    lte->updateState(state, PacketBuilder(0xFF0000).u8(13, 'x').build());
+    lte->updateState(state, PacketBuilder(0xFF0002).u8(13, 'x').build());
+    EXPECT_TRUE(platform.log.contains("SIM File dictionary data could not be constructed"));
+    EXPECT_TRUE(platform.log.contains("PDP context data could not be constructed"));
+    EXPECT_EQ(displayed({"SIM Info", "EF-ICCID"}), "-");
+
+    lte->updateState(state, propertyListPacket(0xFF0000, PlistDictionary{{"kSimFile_ICCID", "8"}}));
+    EXPECT_EQ(displayed({"SIM Info", "EF-ICCID"}), "8");
+}
+
 TEST_F(OrbelLogGenerator2Test, LTEInitialisationLogsInOrder)
 {
     const auto lte = LTELogGenerator::generator(services());
     using testing::MatchesRegex;
-    EXPECT_THAT(platform.log.texts(),
-                ElementsAre("Creating LTELogGenerator object", "Array Count: 3", "Array Count: 1",
-                            "Array Count: 1",
-                            MatchesRegex("Creating OrbelLogGenerator2 object with 0x.*"),
+    const auto texts = platform.log.texts();
+    ASSERT_EQ(texts.size(), 15U);
+    EXPECT_EQ(texts[0], "Creating LTELogGenerator object");
+    EXPECT_EQ(texts[1], "Array Count: 3"); // and ten more, one for each section
+    EXPECT_EQ(texts[11], "Array Count: 1");
+    EXPECT_THAT(std::vector(texts.begin() + 12, texts.end()),
+                ElementsAre(MatchesRegex("Creating OrbelLogGenerator2 object with 0x.*"),
                             MatchesRegex("Creating Log object: 0x.*"), "Class Index: 1"));
     EXPECT_THAT(platform.log.texts(3),
                 ElementsAre("Creating LTELogGenerator object",
@@ -340,8 +360,8 @@ TEST_F(OrbelLogGenerator2Test, LTEAsksForTheCodesOfItsSections)
 {
     const PlistDictionary command = LTELogGenerator::generator(services())->getStartCommand();
     EXPECT_EQ(*command.find("SetOrbelLogCodes"),
-              PlistValue(PlistArray{0xB0C2, 0xB0C1, 0xB179, 0xB17F}));
-    EXPECT_EQ(*command.find("SetQxExtraCodes"), PlistValue(PlistArray{1}));
+              PlistValue(PlistArray{0xB0C2, 0xB0C1, 0xB179, 0xB17F, 0xB180, 0xB186}));
+    EXPECT_EQ(*command.find("SetQxExtraCodes"), PlistValue(PlistArray{1, 0, 2}));
 }
 
 } // namespace ventrik

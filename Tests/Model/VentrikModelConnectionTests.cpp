@@ -128,9 +128,10 @@ TEST_F(ConnectionTest, TheStartCommandIsSentWithoutReply)
     const RecordedSend& command = fake.ports.sends()[1];
     EXPECT_EQ(command.id, 0);
     EXPECT_EQ(command.data,
-              xml(PlistDictionary{{"SetState", "Streaming"},
-                                  {"SetOrbelLogCodes", PlistArray{45250, 45249, 45433, 45439}},
-                                  {"SetQxExtraCodes", PlistArray{1}}}));
+              xml(PlistDictionary{
+                  {"SetState", "Streaming"},
+                  {"SetOrbelLogCodes", PlistArray{45250, 45249, 45433, 45439, 45440, 45446}},
+                  {"SetQxExtraCodes", PlistArray{1, 0, 2}}}));
     EXPECT_EQ(command.sendTimeout, 1.0);
     EXPECT_EQ(command.receiveTimeout, 0.0);
     EXPECT_FALSE(command.replyWanted);

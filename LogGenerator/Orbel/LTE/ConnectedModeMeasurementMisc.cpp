@@ -1,16 +1,10 @@
 #include "LogGenerator/Orbel/LTE/ConnectedModeMeasurementMisc.h"
 
+#include "LogGenerator/Orbel/LTE/ConnectedModeRecord.h"
 #include "LogGenerator/Orbel/ValueText.h"
 
 namespace ventrik
 {
-
-namespace
-{
-
-constexpr std::uint32_t intraFrequencyLogCode = 0xB179;
-
-} // namespace
 
 std::string_view ConnectedModeMeasurementMisc::getSectionName() const
 {
@@ -19,18 +13,18 @@ std::string_view ConnectedModeMeasurementMisc::getSectionName() const
 
 std::vector<std::uint32_t> ConnectedModeMeasurementMisc::getLogCodeArray() const
 {
-    return {intraFrequencyLogCode};
+    return {ConnectedModeRecord::logCode};
 }
 
-// Connected-mode intra-frequency measurement, 0xB179, at least 29 bytes
+// Serving cell part of the connected-mode record
 //   17 u16 E-ARFCN | 19 u16 serving physical cell identity | 21 u16 subframe number
 //   23 u16 filtered RSRP (quarter dB above -140) | 25 u16 filtered RSRQ (eighth dB above -20)
 void ConnectedModeMeasurementMisc::updateWithData(const LogPacket& packet, std::uint32_t logCode)
 {
     log().warning("Connected mode LTE Intra-frequency Measurement");
-    if (logCode != intraFrequencyLogCode)
+    if (logCode != ConnectedModeRecord::logCode)
         return logUnknownMessage(logCode);
-    if (packet.size() < 29)
+    if (packet.size() < ConnectedModeRecord::minimumSize)
         return;
     show("E-ARFCN", decimal(packet.u16(17)));
     show("Serving Physical Cell ID", decimal(packet.u16(19)));

@@ -13,8 +13,10 @@ constexpr std::int32_t messageId = 0;
 constexpr RemotePort::Seconds noWaiting{0};
 constexpr std::uint64_t extraCodeBase = 0xFF0000;
 constexpr int ticksBetweenReports = 20;
-// How much an unpaced source may send in one go, before other channels have their turn.
+// How much an unpaced source may send in one go, before other channels have their turn, and when
+// its next turn comes.
 constexpr int unpacedBatch = 5000;
+constexpr std::chrono::milliseconds unpacedInterval{2};
 
 Bytes serialized(const PlistValue& value)
 {
@@ -96,7 +98,8 @@ void LogChannel::startStreaming(const PlistDictionary& command)
         return;
     _elapsed = {};
     fetchNext();
-    _timer = _queue.repeatEvery(tickInterval, [this] { tick(); });
+    _timer =
+        _queue.repeatEvery(_source->isPaced() ? tickInterval : unpacedInterval, [this] { tick(); });
     _log.warning("Log channel for {}: streaming {} codes", clientPortName(), _wantedCodes.size());
 }
 

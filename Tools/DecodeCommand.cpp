@@ -73,7 +73,8 @@ class Decoding
         _decoder.finish();
         writeResult();
         int status = DecodeStatus::done;
-        if (!_reader.error().empty()) {
+        // An interrupted read looks like damage, and is none.
+        if (!_reader.error().empty() && !interrupted) {
             complain(_reader.error());
             status = DecodeStatus::badInput;
         }
@@ -185,6 +186,8 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
 {
     std::string error;
     auto reader = CaptureReader::open(options.capture, error);
+    if (!reader && interrupted)
+        return DecodeStatus::interrupted;
     if (!reader) {
         complain(error);
         return DecodeStatus::badInput;

@@ -121,16 +121,6 @@ void endWithoutDisplay(QtMsgType type, const QMessageLogContext&, const QString&
     std::_Exit(EXIT_FAILURE);
 }
 
-// Before the toolkit starts its threads: one that takes these signals would end the process.
-void blockTerminationSignals()
-{
-    sigset_t blocked;
-    sigemptyset(&blocked);
-    for (const int number : {SIGTERM, SIGINT, SIGHUP})
-        sigaddset(&blocked, number);
-    pthread_sigmask(SIG_BLOCK, &blocked, nullptr);
-}
-
 std::unique_ptr<QApplication> makeApplication(int& argc, char** argv)
 {
     const QtMessageHandler usual = qInstallMessageHandler(endWithoutDisplay);
@@ -264,7 +254,7 @@ int main(int argc, char** argv)
         complain("there is no display; ventrik-watch needs none");
         return EXIT_FAILURE;
     }
-    blockTerminationSignals();
+    TerminationSignals::block(); // the toolkit starts threads
     int toolkitArgc = 1;
     const auto application = makeApplication(toolkitArgc, argv);
     const TerminationSignals termination([] { QCoreApplication::quit(); });

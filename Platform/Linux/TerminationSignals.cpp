@@ -24,11 +24,17 @@ sigset_t terminationSignals()
 
 } // namespace
 
-TerminationSignals::TerminationSignals(std::function<void()> terminate)
-    : _terminate(std::move(terminate))
+void TerminationSignals::block()
 {
     const sigset_t signals = terminationSignals();
     pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+}
+
+TerminationSignals::TerminationSignals(std::function<void()> terminate)
+    : _terminate(std::move(terminate))
+{
+    block();
+    const sigset_t signals = terminationSignals();
     _descriptor = signalfd(-1, &signals, SFD_CLOEXEC | SFD_NONBLOCK);
     _notifier = std::make_unique<QSocketNotifier>(_descriptor, QSocketNotifier::Read);
     QObject::connect(_notifier.get(), &QSocketNotifier::activated, [this] { receive(); });

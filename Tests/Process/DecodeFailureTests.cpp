@@ -1,0 +1,119 @@
+#include "Tests/Process/DecodeFixture.h"
+
+namespace ventrik
+{
+
+namespace
+{
+
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::StartsWith;
+
+class DecodeFailure : public DecodeFixture
+{
+  protected:
+    /// An antenna count and a second message that ends too soon.
+    Bytes damagedCapture() const
+    {
+        const PcapBytes capture = lteCapture()
+                                      .record(captureStart, 0, antennaMessage(2))
+                                      .record(captureStart, 1, antennaMessage(4));
+        return Bytes(capture.bytes().begin(), capture.bytes().end() - 5);
+    }
+};
+
+} // namespace
+
+TEST_F(DecodeFailure, OfDamageComesBehindWhatWasDecoded)
+{
+    const std::string file = writeFile("damaged.pcap", damagedCapture());
+    const Result result = decode({"--format", "json", file});
+    EXPECT_EQ(result.status, 1);
+    EXPECT_EQ(result.output, std::string(R"({"technology": "lte", "packets": 1, "display": )") +
+                                 twoAntennas + "}\n");
+    EXPECT_THAT(result.complaints,
+                ElementsAre(StartsWith("ventrik-decode: " + file + ": message 1: ")));
+}
+
+TEST_F(DecodeFailure, OfDamageLeavesTheLinesBeforeIt)
+{
+    const std::string file = writeFile("damaged.pcap", damagedCapture());
+    const Result result = decode({"--format", "jsonl", file});
+    EXPECT_EQ(result.status, 1);
+    EXPECT_THAT(linesOf(result.output), ElementsAre(StartsWith(R"({"packet": 0, )")));
+}
+
+TEST_F(DecodeFailure, OfDamageStillWritesTheSnapshot)
+{
+    const std::string file = writeFile("damaged.pcap", damagedCapture());
+    EXPECT_EQ(decode({"--snapshot", path("s.ventrik"), file}).status, 1);
+    EXPECT_THAT(readFile(path("s.ventrik")), HasSubstr("2001-09-09 01:46:40 +0000"));
+}
+
+TEST_F(DecodeFailure, OfAMessageThatWasCutWhenCapturedSaysSo)
+{
+    const PcapBytes capture = lteCapture().record(captureStart, 0, antennaMessage(2), 100);
+    const Result result = decode(capture);
+    EXPECT_EQ(result.status, 1);
+    EXPECT_THAT(result.complaints, ElementsAre(HasSubstr("message 0: cut short")));
+}
+
+TEST_F(DecodeFailure, OfAMissingFileNamesIt)
+{
+    const Result result = decode(Arguments{path("missing.pcap")});
+    EXPECT_EQ(result.status, 1);
+    EXPECT_THAT(result.output, IsEmpty());
+    EXPECT_THAT(linesOf(result.errors),
+                ElementsAre(AllOf(StartsWith("ventrik-decode: "), HasSubstr("missing.pcap"))));
+}
+
+TEST_F(DecodeFailure, OfAFileThatIsNoCaptureNamesIt)
+{
+    const std::string file = writeFile("letter.txt", "Dear reader, this is not a capture at all.");
+    const Result result = decode(Arguments{file});
+    EXPECT_EQ(result.status, 1);
+    EXPECT_THAT(result.output, IsEmpty());
+    EXPECT_THAT(linesOf(result.errors), ElementsAre(StartsWith("ventrik-decode: " + file)));
+}
+
+TEST_F(DecodeFailure, OfEmptyStandardInputNamesIt)
+{
+    const auto program = start("ventrik-decode", {"-"});
+    program->closeInput();
+    EXPECT_EQ(program->waitForEnd(), 1);
+    EXPECT_THAT(linesOf(program->errors()),
+                ElementsAre(StartsWith("ventrik-decode: standard input: ")));
+}
+
+TEST_F(DecodeFailure, OfAnUnknownLinkTypeIsWrongUsage)
+{
+    const Result result = decode(PcapBytes(1).record(captureStart, 0, antennaMessage(2)));
+    EXPECT_EQ(result.status, 2);
+    EXPECT_THAT(result.output, IsEmpty());
+    EXPECT_THAT(linesOf(result.errors), ElementsAre(HasSubstr("link type 1 names no technology")));
+}
+
+TEST_F(DecodeFailure, OfATechnologyWithoutADecoderNamesIt)
+{
+    for (const char* name : {"c2k", "ifx"}) {
+        const Result result = decode(lteCapture(), {"--technology", name});
+        EXPECT_EQ(result.status, 1) << name;
+        EXPECT_THAT(result.output, IsEmpty());
+        EXPECT_THAT(linesOf(result.errors),
+                    ElementsAre(HasSubstr(std::string("no decoder for the technology ") + name)));
+    }
+}
+
+TEST_F(DecodeFailure, ToWriteTheSystemLogOrTheSnapshotIsTold)
+{
+    for (const char* option : {"--system-log", "--snapshot"}) {
+        const Result result = decode(cellCapture(), {option, path("missing/file")});
+        EXPECT_EQ(result.status, 1) << option;
+        EXPECT_THAT(result.complaints, ElementsAre(HasSubstr(path("missing/file")))) << option;
+    }
+}
+
+} // namespace ventrik

@@ -1,0 +1,60 @@
+#include "Tests/Process/ToolUsageFixture.h"
+
+namespace ventrik
+{
+
+namespace
+{
+
+class ToolUsage : public ToolUsageFixture
+{
+};
+
+} // namespace
+
+TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
+{
+    expectRefused("ventrik-telephony", {{},
+                                        {"--technology"},
+                                        {"--technology", "5g"},
+                                        {"--technology", "lte", "--replay", "x.pcap"},
+                                        {"--technology", "lte", "--loop"},
+                                        {"--replay", "x.pcap", "--speed", "0"},
+                                        {"--replay", "x.pcap", "--speed", "fast"},
+                                        {"--technology", "lte", "--seed", "-x"},
+                                        {"--technology", "lte", "more"},
+                                        {"--unheard-of"}});
+}
+
+TEST_F(ToolUsage, WatchRefusesWhatIsWrong)
+{
+    expectRefused("ventrik-watch", {{"--unheard-of"}, {"more"}, {"--once=1"}});
+}
+
+TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
+{
+    expectRefused("ventrik-decode", {{},
+                                     {"a.pcap", "b.pcap"},
+                                     {"--format", "xml", "a.pcap"},
+                                     {"--technology", "5g", "a.pcap"},
+                                     {"--resources", path("missing"), "a.pcap"},
+                                     {"--snapshot"},
+                                     {"--unheard-of", "a.pcap"}});
+}
+
+TEST_F(ToolUsage, TelephonyTellsItsUsageAndVersion)
+{
+    expectHelpAndVersion("ventrik-telephony");
+}
+
+TEST_F(ToolUsage, WatchTellsItsUsageAndVersion)
+{
+    expectHelpAndVersion("ventrik-watch");
+}
+
+TEST_F(ToolUsage, DecodeTellsItsUsageAndVersion)
+{
+    expectHelpAndVersion("ventrik-decode");
+}
+
+} // namespace ventrik

@@ -1,0 +1,65 @@
+#include "Tests/Process/ProcessFixture.h"
+
+#include <csignal>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::StartsWith;
+
+class WatchProcess : public ProcessFixture
+{
+};
+
+} // namespace
+
+TEST_F(WatchProcess, OncePrintsATreeAndEnds)
+{
+    const auto service = startScenario();
+    const auto watch = start("ventrik-watch", {"--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), StartsWith("Ventrik\n"));
+    EXPECT_THAT(watch->output(), HasSubstr("\n  Serving Cell Info\n"));
+}
+
+TEST_F(WatchProcess, EndsOnSIGTERMAndLeavesNoSocket)
+{
+    const auto watch = start("ventrik-watch", {"--verbose"});
+    ASSERT_TRUE(waitUntil([&] { return watch->says("Could not create the ports necessary"); }));
+    watch->send(SIGTERM);
+    EXPECT_EQ(watch->waitForEnd(), 0);
+    EXPECT_THAT(sockets(), IsEmpty());
+}
+
+TEST_F(WatchProcess, EndsOnSIGTERMWhileItIsConnected)
+{
+    const auto service = startScenario();
+    const auto watch = start("ventrik-watch", {"--verbose"});
+    ASSERT_TRUE(waitUntil([&] { return watch->says("Starting the display update timer"); }));
+    watch->send(SIGTERM);
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    // Its port has gone, and the service follows.
+    EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
+}
+
+TEST_F(WatchProcess, BesideAnotherOneSaysSoAndTakesOverWhenThatEnds)
+{
+    const auto service = startScenario();
+    const auto first = start("ventrik-watch", {"--verbose"});
+    ASSERT_TRUE(waitUntil([&] { return first->says("Starting the display update timer"); }));
+    const auto second = start("ventrik-watch", {"--verbose"});
+    ASSERT_TRUE(waitUntil([&] { return second->says("Could not create the ports necessary"); }));
+    EXPECT_TRUE(second->says("<3> Could not create local message port\n"));
+    EXPECT_FALSE(second->says("Starting the display update timer"));
+
+    first->send(SIGTERM);
+    EXPECT_EQ(first->waitForEnd(), 0);
+    EXPECT_TRUE(waitUntil([&] { return second->prints("  Serving Cell Info\n"); }));
+}
+
+} // namespace ventrik

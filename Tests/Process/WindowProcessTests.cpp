@@ -1,0 +1,153 @@
+#include "Tests/Process/ToolUsageFixture.h"
+
+#include <csignal>
+#include <filesystem>
+#include <fstream>
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+constexpr const char* timerStarted = "Starting the display update timer";
+
+std::size_t count(const std::string& text, std::string_view part)
+{
+    std::size_t result = 0;
+    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
+        ++result;
+    return result;
+}
+
+/// State and parent of a process; state 'X' when there is none.
+struct ProcessState {
+    char state = 'X';
+    pid_t parent = 0;
+};
+
+ProcessState stateOf(pid_t processId)
+{
+    std::ifstream file(fmt::format("/proc/{}/stat", processId));
+    std::string line;
+    std::getline(file, line);
+    ProcessState result;
+    // The name in parentheses may hold anything; the fields go on behind it.
+    const auto name = line.rfind(')');
+    if (name != std::string::npos)
+        std::sscanf(line.c_str() + name + 1, " %c %d", &result.state, &result.parent);
+    return result;
+}
+
+bool hasEnded(pid_t processId)
+{
+    const char state = stateOf(processId).state;
+    return state == 'X' || state == 'Z';
+}
+
+std::vector<pid_t> childrenOf(pid_t parent)
+{
+    std::vector<pid_t> children;
+    for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
+        const pid_t processId = std::atoi(entry.path().filename().c_str());
+        if (processId > 0 && stateOf(processId).parent == parent && !hasEnded(processId))
+            children.push_back(processId);
+    }
+    return children;
+}
+
+class WindowProcess : public ToolUsageFixture
+{
+  protected:
+    ProgramPointer startWindow()
+    {
+        auto window = start("ventrik", {"--verbose"});
+        EXPECT_TRUE(waitUntil([&] { return window->says(timerStarted); })) << window->errors();
+        return window;
+    }
+    /// A window with a service of its own; whatever it makes, it makes in this directory.
+    ProgramPointer startDemo()
+    {
+        std::filesystem::create_directories(temporary);
+        std::filesystem::permissions(temporary, std::filesystem::perms::owner_all);
+        environment.remove("VENTRIK_RUNTIME_DIR");
+        environment.insert("TMPDIR", QString::fromStdString(temporary));
+        environment.insert("XDG_RUNTIME_DIR", QString::fromStdString(temporary));
+        auto window = start("ventrik", {"--demo", "lte", "--verbose"});
+        EXPECT_TRUE(waitUntil([&] { return window->says(timerStarted); })) << window->errors();
+        return window;
+    }
+
+    std::string temporary = path("temporary");
+};
+
+} // namespace
+
+TEST_F(WindowProcess, ConnectsAndEndsOnSIGTERM)
+{
+    const auto service = startScenario();
+    const auto window = startWindow();
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+    EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
+}
+
+TEST_F(WindowProcess, ReconnectsAfterTheServiceWasKilled)
+{
+    auto service = startScenario();
+    const auto window = startWindow();
+    service->kill();
+    service = startScenario();
+    EXPECT_TRUE(waitUntil([&] { return count(window->errors(), timerStarted) == 2; }));
+    EXPECT_TRUE(window->says(" ***** INVALIDATED "));
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+}
+
+TEST_F(WindowProcess, OfADemoTakesItsServiceAlongWhenItEnds)
+{
+    const auto window = startDemo();
+    const auto children = childrenOf(window->processId());
+    EXPECT_FALSE(children.empty());
+    EXPECT_FALSE(namesIn(temporary).empty());
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+    for (const pid_t child : children)
+        EXPECT_TRUE(waitUntil([&] { return hasEnded(child); }));
+    EXPECT_THAT(namesIn(temporary), IsEmpty());
+}
+
+TEST_F(WindowProcess, OfADemoTakesItsServiceAlongWhenItIsKilled)
+{
+    const auto window = startDemo();
+    const auto children = childrenOf(window->processId());
+    EXPECT_FALSE(children.empty());
+    window->kill();
+    for (const pid_t child : children)
+        EXPECT_TRUE(waitUntil([&] { return hasEnded(child); }));
+}
+
+TEST_F(WindowProcess, RefusesWhatIsWrong)
+{
+    expectRefused("ventrik", {{"--unheard-of"}, {"more"}, {"--demo"}, {"--demo", "5g"}});
+}
+
+TEST_F(WindowProcess, TellsItsUsageAndVersion)
+{
+    expectHelpAndVersion("ventrik");
+}
+
+TEST_F(WindowProcess, ExportsItsTwoFunctions)
+{
+    Program nm("/usr/bin/nm", {"-D", "--defined-only", VENTRIK_PROGRAMS "/ventrik"}, environment);
+    EXPECT_EQ(nm.waitForEnd(), 0) << nm.errors();
+    EXPECT_THAT(nm.output(), HasSubstr(" T ETLDLFAddVersionReport\n"));
+    EXPECT_THAT(nm.output(), HasSubstr(" T lz4_decode_fast\n"));
+}
+
+} // namespace ventrik

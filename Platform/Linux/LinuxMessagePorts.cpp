@@ -13,16 +13,6 @@
 namespace ventrik
 {
 
-namespace
-{
-
-LocalPortCreation refusal(std::string error)
-{
-    return {nullptr, false, std::move(error)};
-}
-
-} // namespace
-
 LinuxMessagePorts::LinuxMessagePorts(std::string runtimeDirectory, SystemLog& log,
                                      std::optional<uid_t> trustedUser)
     : _directory(std::move(runtimeDirectory)),
@@ -38,25 +28,32 @@ LocalPortCreation LinuxMessagePorts::createLocalPort(std::string_view name, Port
         if (auto existing = found->second.lock(); existing != nullptr && existing->isValid())
             return {std::move(existing), true, {}};
     if (auto fault = _directory.nameFault(name); !fault.empty())
-        return refusal(std::move(fault));
+        return refuse(std::move(fault));
     if (auto fault = _directory.prepare(PortDirectory::IfMissing::Create); !fault.empty())
-        return refusal(std::move(fault));
+        return refuse(std::move(fault));
     // Between finding a stale file and replacing it nobody else may do the same.
     const FileDescriptor lock = _directory.lock();
     if (!lock.isOpen())
-        return refusal(fmt::format("runtime directory {} cannot be locked", _directory.path()));
+        return refuse(fmt::format("runtime directory {} cannot be locked", _directory.path()));
     if (auto fault = claimPath(name); !fault.empty())
-        return refusal(std::move(fault));
+        return refuse(std::move(fault));
     const std::string path = _directory.socketPath(name);
     FileDescriptor listener = listenSocket(path);
     if (!listener.isOpen())
-        return refusal(fmt::format("port {} cannot listen: {}", path, std::strerror(errno)));
+        return refuse(fmt::format("port {} cannot listen: {}", path, std::strerror(errno)));
     auto port = std::make_shared<LinuxLocalPort>(
         LinuxLocalPort::Parts{std::string(name), std::move(listener), SocketFile(path), senders,
                               _trustedUser, std::move(callback)},
         _log);
     _localPorts[std::string(name)] = port;
     return {std::move(port), false, {}};
+}
+
+// The viewer's own line says only that there is no port; this one says why.
+LocalPortCreation LinuxMessagePorts::refuse(std::string reason) const
+{
+    _log.warning("{}", reason);
+    return {nullptr, false, std::move(reason)};
 }
 
 // Frees the path of a file that a crash left; one line that says why, when that cannot be done.

@@ -34,6 +34,7 @@ class LinuxMessagePorts : public MessagePorts
     std::shared_ptr<RemotePort> createRemotePort(std::string_view name) override;
 
   private:
+    LocalPortCreation refuse(std::string reason) const;
     std::string claimPath(std::string_view name) const;
 
     PortDirectory _directory;

@@ -1,5 +1,6 @@
 #include "Capture/CaptureReader.h"
 #include "Tests/Capture/PcapBytes.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <gmock/gmock.h>
 
@@ -79,7 +80,8 @@ TEST(CaptureReader, RefusesAMissingFileWithOneLine)
 
 TEST(CaptureReader, RefusesWhatIsNoCapture)
 {
-    const std::string path = testing::TempDir() + "no-capture.pcap";
+    const TemporaryFile file("no-capture.pcap");
+    const std::string& path = file.path();
     std::ofstream(path) << "this is no capture, whatever its name may say";
     std::string error;
     EXPECT_FALSE(CaptureReader::open(path, error));
@@ -111,7 +113,8 @@ TEST(CaptureReader, AnAbsurdLengthIsDamage)
     PcapBytes capture(150);
     Bytes bytes = capture.record(100, 0, {1, 2}).bytes();
     bytes[24 + 8 + 3] = 0x7F; // the record's captured length
-    const std::string path = testing::TempDir() + "absurd.pcap";
+    const TemporaryFile file("absurd.pcap");
+    const std::string& path = file.path();
     std::ofstream(path, std::ios::binary)
         .write(static_cast<const char*>(static_cast<const void*>(bytes.data())),
                static_cast<std::streamsize>(bytes.size()));

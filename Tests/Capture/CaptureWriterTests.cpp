@@ -1,5 +1,6 @@
 #include "Capture/CaptureWriter.h"
 #include "Tests/Capture/PcapBytes.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <gmock/gmock.h>
 
@@ -16,11 +17,12 @@ class CaptureWriterTest : public testing::Test
   protected:
     Bytes written()
     {
-        std::ifstream file(path, std::ios::binary);
-        return {std::istreambuf_iterator<char>(file), {}};
+        std::ifstream stream(path, std::ios::binary);
+        return {std::istreambuf_iterator<char>(stream), {}};
     }
 
-    std::string path = testing::TempDir() + "written.pcap";
+    const TemporaryFile file{"written.pcap"};
+    const std::string& path = file.path();
     std::string error;
 };
 

@@ -1,8 +1,10 @@
 #pragma once
 
 #include "PropertyList/PlistValue.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <fstream>
+#include <memory>
 #include <string>
 
 #include <gtest/gtest.h>
@@ -41,16 +43,14 @@ class PcapBytes
 
     const Bytes& bytes() const { return _bytes; }
 
-    /// Writes the first `size` bytes to a file under the test's own name and gives its path.
+    /// Writes the first `size` bytes to a file, which lives as long as these bytes, and gives its
+    /// path.
     std::string file(std::size_t size = SIZE_MAX) const
     {
-        const auto* test = testing::UnitTest::GetInstance()->current_test_info();
-        const std::string path =
-            testing::TempDir() + test->test_suite_name() + "." + test->name() + ".pcap";
-        std::ofstream stream(path, std::ios::binary);
+        std::ofstream stream(_file->path(), std::ios::binary);
         for (std::size_t i = 0; i < std::min(size, _bytes.size()); ++i)
             stream.put(static_cast<char>(_bytes[i]));
-        return path;
+        return _file->path();
     }
 
   private:
@@ -61,6 +61,7 @@ class PcapBytes
     }
 
     Bytes _bytes;
+    std::shared_ptr<TemporaryFile> _file = std::make_shared<TemporaryFile>("capture.pcap");
 };
 
 } // namespace ventrik

@@ -1,5 +1,6 @@
 #include "Capture/SnapshotFile.h"
 #include "PropertyList/PropertyListReader.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -62,7 +63,8 @@ TEST(SnapshotFile, IsWrittenAsAPropertyListThatReadsBackUnchanged)
                      PlistArray{PlistDictionary{{"Description", "DLF binary (2 bytes)"},
                                                 {"DLF", Bytes{0, 255}}}},
                      "a < b");
-    const std::string path = testing::TempDir() + "written.ventrik";
+    const TemporaryFile file("written.ventrik");
+    const std::string& path = file.path();
     std::string error;
     ASSERT_TRUE(writeSnapshot(snapshot, path, error)) << error;
     const auto reading = readPropertyList(contentsOf(path));
@@ -72,7 +74,8 @@ TEST(SnapshotFile, IsWrittenAsAPropertyListThatReadsBackUnchanged)
 
 TEST(SnapshotFile, OverwritesAnEarlierFileOfItsName)
 {
-    const std::string path = testing::TempDir() + "twice.ventrik";
+    const TemporaryFile file("twice.ventrik");
+    const std::string& path = file.path();
     std::string error;
     ASSERT_TRUE(
         writeSnapshot(makeSnapshot("a", PlistArray(), std::string(1000, 'x')), path, error));

@@ -1,9 +1,9 @@
 #include "PropertyList/PropertyListWriter.h"
 #include "Tests/PropertyList/PlistText.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <array>
 #include <cstdio>
-#include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <limits>
@@ -21,27 +21,18 @@ constexpr auto largest = std::numeric_limits<std::uint64_t>::max();
 constexpr auto largestSigned = std::numeric_limits<std::int64_t>::max();
 constexpr auto least = std::numeric_limits<std::int64_t>::min();
 
-// A file of this test's own, gone afterwards.
-class TemporaryFile
+class ExchangedFile : public TemporaryFile
 {
   public:
-    explicit TemporaryFile(const std::string& name) : _path(testing::TempDir() + name) {}
-    TemporaryFile(const TemporaryFile&) = delete;
-    TemporaryFile& operator=(const TemporaryFile&) = delete;
-    ~TemporaryFile() { std::filesystem::remove(_path); }
+    using TemporaryFile::TemporaryFile;
 
-    const std::string& path() const { return _path; }
-
-    void write(std::string_view text) const { std::ofstream(_path, std::ios::binary) << text; }
+    void write(std::string_view text) const { std::ofstream(path(), std::ios::binary) << text; }
 
     Bytes content() const
     {
-        std::ifstream file(_path, std::ios::binary);
+        std::ifstream file(path(), std::ios::binary);
         return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
     }
-
-  private:
-    std::string _path;
 };
 
 // Standard output of the bridge with those arguments.
@@ -64,7 +55,7 @@ std::string dumpOf(const PlistValue& value, const std::string& name)
 {
     const PropertyListWriting writing = writeXmlPropertyList(value);
     EXPECT_TRUE(writing) << writing.error;
-    const TemporaryFile file(name);
+    const ExchangedFile file(name);
     file.write(writing.text.value_or(""));
     return runBridge("dump \"" + file.path() + "\"");
 }
@@ -87,7 +78,7 @@ PlistDictionary expectedDocument()
 
 void expectWritten(const PlistDictionary& expected, const std::string& form)
 {
-    const TemporaryFile file("ventrik-plistlib-" + form + ".plist");
+    const ExchangedFile file("ventrik-plistlib-" + form + ".plist");
     runBridge("write " + form + " \"" + file.path() + "\"");
     const PropertyListReading reading = readPropertyList(file.content());
     ASSERT_TRUE(reading) << reading.error;

@@ -1,5 +1,6 @@
 #include "Capture/CaptureWriter.h"
 #include "TelephonyService/ReplaySource.h"
+#include "Tests/Support/TemporaryFile.h"
 
 #include <gtest/gtest.h>
 
@@ -41,7 +42,8 @@ class ReplaySourceTest : public testing::Test
         return times;
     }
 
-    std::string path = testing::TempDir() + "replayed.pcap";
+    const TemporaryFile file{"replayed.pcap"};
+    const std::string& path = file.path();
 };
 
 } // namespace

@@ -1,5 +1,6 @@
 #include "Capture/CaptureReader.h"
 #include "TelephonyService/ScenarioCapture.h"
+#include "Tests/Support/TemporaryFile.h"
 #include "Tests/TelephonyService/ListSource.h"
 
 #include <gtest/gtest.h>
@@ -31,7 +32,8 @@ class ScenarioCaptureTest : public testing::Test
         return count;
     }
 
-    std::string path = testing::TempDir() + "scenario.pcap";
+    const TemporaryFile file{"scenario.pcap"};
+    std::string path = file.path();
     std::string error;
 };
 

@@ -1,3 +1,4 @@
+#include "Tests/Support/TemporaryFile.h"
 #include "Tools/FileSystemLog.h"
 
 #include <gtest/gtest.h>
@@ -9,7 +10,8 @@ namespace ventrik
 
 TEST(FileSystemLog, WritesPriorityTabAndEscapedText)
 {
-    const std::string path = testing::TempDir() + "system.log";
+    const TemporaryFile logFile("system.log");
+    const std::string& path = logFile.path();
     std::string error;
     const auto log = FileSystemLog::create(path, error);
     ASSERT_TRUE(log) << error;

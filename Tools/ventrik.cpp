@@ -12,11 +12,13 @@
 #include <QProcess>
 #include <QTemporaryDir>
 
+#include <algorithm>
+#include <charconv>
 #include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <memory>
-#include <regex>
+#include <optional>
 
 #include <fmt/format.h>
 #include <getopt.h>
@@ -50,13 +52,25 @@ struct ViewerOptions {
     bool verbose = false;
 };
 
+// A side of the window, from 1 to 99999; none for anything else.
+std::optional<int> sideOf(std::string_view text)
+{
+    int side = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), side);
+    if (error != std::errc() || end != text.data() + text.size() || side < 1 || side > 99999)
+        return std::nullopt;
+    return side;
+}
+
 QSize sizeArgument(const CommandLine& line)
 {
-    static const std::regex form("([1-9][0-9]{0,4})x([1-9][0-9]{0,4})");
-    std::cmatch match;
-    if (!std::regex_match(line.value(), match, form))
-        line.refuse(fmt::format("--size takes WIDTHxHEIGHT, not '{}'", line.value()));
-    return {std::stoi(match[1]), std::stoi(match[2])};
+    const std::string_view text = line.value();
+    const std::size_t cross = std::min(text.find('x'), text.size());
+    const auto width = sideOf(text.substr(0, cross));
+    const auto height = sideOf(text.substr(std::min(cross + 1, text.size())));
+    if (!width || !height)
+        line.refuse(fmt::format("--size takes WIDTHxHEIGHT, not '{}'", text));
+    return {*width, *height};
 }
 
 std::string technologyArgument(const CommandLine& line)

@@ -3,10 +3,23 @@
 #include "PropertyList/PropertyListWriter.h"
 
 #include <fstream>
-#include <regex>
 
 namespace ventrik
 {
+
+namespace
+{
+
+std::string withoutAddresses(std::string text)
+{
+    for (std::size_t at = 0; (at = text.find("0x", at)) != text.npos;) {
+        const std::size_t end = text.find_first_not_of("0123456789abcdef", at + 2);
+        text.replace(at, end - at, "%p");
+    }
+    return text;
+}
+
+} // namespace
 
 ModelFixture::ModelFixture()
 {
@@ -41,10 +54,9 @@ Bytes ModelFixture::cellInfo(std::uint16_t physicalCellId)
 
 std::vector<std::string> ModelFixture::errors()
 {
-    static const std::regex address("0x[0-9a-f]+");
     std::vector<std::string> result;
     for (const std::string& text : fake.log.texts(LogPriority::error))
-        result.push_back(std::regex_replace(text, address, "%p"));
+        result.push_back(withoutAddresses(text));
     return result;
 }
 

@@ -8,6 +8,14 @@
 namespace ventrik
 {
 
+namespace
+{
+
+// In the year 2255. What is later cannot be counted in nanoseconds for long.
+constexpr std::int64_t latestSecond = 9'000'000'000;
+
+} // namespace
+
 void CaptureReader::Closer::operator()(pcap* handle) const
 {
     pcap_close(handle);
@@ -51,6 +59,11 @@ std::optional<CapturedMessage> CaptureReader::next()
     if (header->caplen < header->len) {
         _error = fmt::format("{}: message {}: cut short when it was captured ({} of {} bytes)",
                              _path, _count, header->caplen, header->len);
+        return std::nullopt;
+    }
+    if (header->ts.tv_sec < 0 || header->ts.tv_sec > latestSecond) {
+        _error = fmt::format("{}: message {}: its time, {} s, is out of range", _path, _count,
+                             header->ts.tv_sec);
         return std::nullopt;
     }
     ++_count;

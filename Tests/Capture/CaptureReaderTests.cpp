@@ -108,6 +108,27 @@ TEST(CaptureReader, AMessageThatWasCutWhenCapturedIsDamage)
     EXPECT_THAT(reader.error(), testing::HasSubstr("cut short when it was captured (2 of 40"));
 }
 
+TEST(CaptureReader, AnAbsurdTimeIsDamage)
+{
+    // The newer form of the format counts 64-bit times in units of its own: here in seconds.
+    constexpr std::uint32_t words[] = {
+        0x0A0D0D0A, 28, 0x1A2B3C4D, 1,          0xFFFFFFFF, 0xFFFFFFFF, 28, // section header
+        1,          32, 150,        262144,     0x00010009, 0,          0,
+        32, // interface: resolution 10^0 s
+        6,          36, 0,          0x7FFFFFFF, 0xFFFFFFFF, 1,          1,
+        0x00000001, 36, // one message of one byte
+    };
+    const TemporaryFile file("absurd.pcapng");
+    std::ofstream stream(file.path(), std::ios::binary);
+    for (const std::uint32_t word : words)
+        for (unsigned shift = 0; shift < 32; shift += 8)
+            stream.put(static_cast<char>(word >> shift));
+    stream.close();
+    auto reader = opened(file.path());
+    EXPECT_FALSE(reader.next());
+    EXPECT_THAT(reader.error(), testing::HasSubstr("message 0: its time"));
+}
+
 TEST(CaptureReader, AnAbsurdLengthIsDamage)
 {
     PcapBytes capture(150);

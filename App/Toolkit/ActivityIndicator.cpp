@@ -23,7 +23,7 @@ int currentSpoke()
 
 ActivityIndicator::ActivityIndicator(QWidget* parent) : QWidget(parent)
 {
-    setFixedSize(sizeHint());
+    setFixedSize(ActivityIndicator::sizeHint());
 }
 
 void ActivityIndicator::startAnimating()

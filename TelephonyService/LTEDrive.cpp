@@ -28,7 +28,7 @@ constexpr std::array<LTECell, 6> roadCells{{
 
 LTEDrive::LTEDrive(std::uint32_t seed) : _random(seed)
 {
-    _position = uniform(0, 400);
+    _position = _random.uniform(0, 400);
 }
 
 std::span<const LTECell> LTEDrive::cells()
@@ -50,8 +50,8 @@ bool LTEDrive::step()
 void LTEDrive::fade()
 {
     for (std::size_t i = 0; i < cellCount; ++i) {
-        _smoothed[i] = 0.995 * _smoothed[i] + uniform(-0.35, 0.35);
-        _fading[i] = _smoothed[i] + uniform(-2.0, 2.0);
+        _smoothed[i] = 0.995 * _smoothed[i] + _random.uniform(-0.35, 0.35);
+        _fading[i] = _smoothed[i] + _random.uniform(-2.0, 2.0);
     }
 }
 
@@ -105,12 +105,6 @@ double LTEDrive::rssi(const LTECell& cell, double rsrp, double rsrq) const
 std::size_t LTEDrive::indexOf(const LTECell& cell) const
 {
     return static_cast<std::size_t>(&cell - roadCells.data());
-}
-
-double LTEDrive::uniform(double from, double to)
-{
-    constexpr double range = 4294967295.0;
-    return from + (to - from) * static_cast<double>(_random()) / range;
 }
 
 } // namespace ventrik

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "TelephonyService/ScenarioRandom.h"
+
 #include <array>
-#include <chrono>
 #include <cstdint>
-#include <random>
 #include <span>
 
 namespace ventrik
@@ -26,8 +26,6 @@ struct LTECell {
 class LTEDrive
 {
   public:
-    static constexpr std::chrono::milliseconds stepDuration{50};
-
     explicit LTEDrive(std::uint32_t seed);
 
     /// Moves on by one step. True when the serving cell has changed.
@@ -47,12 +45,11 @@ class LTEDrive
     static constexpr std::size_t cellCount = 6;
 
     std::size_t indexOf(const LTECell& cell) const;
-    double uniform(double from, double to);
     void fade();
     void changeMode();
     bool reselect();
 
-    std::mt19937 _random;
+    ScenarioRandom _random;
     double _position = 0;  ///< metres
     double _direction = 1; ///< 1 or -1
     bool _isConnected = false;

@@ -15,55 +15,37 @@ namespace
 constexpr std::uint64_t cellMonitorSteps = 60;  // every 3 s
 constexpr std::uint64_t idleNeighborSteps = 10; // every 0.5 s while idle
 constexpr std::uint64_t reselectionSteps = 40;  // every 2 s while idle
-constexpr std::uint64_t prefixedMessageGap = 7; // some messages carry the transport prefix
 constexpr int qrxlevmin = -124;                 // dBm
 constexpr double detectableRsrp = -118;         // dBm
 constexpr std::size_t measuredNeighbours = 2;
 
-// A level as a record carries it: steps above a floor, in so many bits.
-std::uint16_t raw(double level, double floor, double step, unsigned bits)
-{
-    const double top = static_cast<double>((1U << bits) - 1);
-    return static_cast<std::uint16_t>(std::clamp(std::round((level - floor) / step), 0.0, top));
-}
-
 } // namespace
-
-std::optional<TimedMessage> LTEScenario::next()
-{
-    while (_messages.empty())
-        reportStep();
-    TimedMessage message = std::move(_messages.front());
-    _messages.pop_front();
-    return message;
-}
 
 void LTEScenario::reportStep()
 {
-    const bool hasNewCell = _drive.step() || _step == 0;
-    if (_step == 0)
-        reportSimFiles();
+    const bool hasNewCell = _drive.step() || step() == 0;
+    if (step() == 0)
+        reportSimFiles("E-UTRAN");
     if (hasNewCell)
         reportNewCell();
-    if (_step == 0 || _drive.isConnected() != _wasConnected)
-        reportPdpContexts();
+    if (step() == 0 || _drive.isConnected() != _wasConnected)
+        reportPdpContexts(_drive.isConnected());
     _wasConnected = _drive.isConnected();
 
     if (_drive.isConnected())
         reportConnectedMeasurement();
     else
         reportIdleStep();
-    if (_step % cellMonitorSteps == cellMonitorSteps - 1)
+    if (step() % cellMonitorSteps == cellMonitorSteps - 1)
         reportCellMonitor();
-    ++_step;
 }
 
 void LTEScenario::reportIdleStep()
 {
     reportIdleMeasurement();
-    if (_step % idleNeighborSteps == 0)
+    if (step() % idleNeighborSteps == 0)
         reportIdleNeighbors();
-    if (_step % reselectionSteps == 0)
+    if (step() % reselectionSteps == 0)
         reportReselectionCandidates();
 }
 
@@ -76,15 +58,6 @@ void LTEScenario::reportNewCell()
     reportIdleNeighbors();
     reportReselectionCandidates();
     reportCellMonitor();
-}
-
-void LTEScenario::report(PacketBuilder packet)
-{
-    const auto due = _step * LTEDrive::stepDuration;
-    packet.timestamp(static_cast<std::uint64_t>(due.count()));
-    if (++_messageCount % prefixedMessageGap == 0)
-        packet.withPrefix();
-    _messages.push_back({due, packet.build()});
 }
 
 void LTEScenario::reportCellInfo()
@@ -121,15 +94,15 @@ void LTEScenario::reportIdleMeasurement()
                .u16(17, cell.downlinkEarfcn)
                .bits(19, 0, 9, cell.physicalCellId)
                .bits(19, 9, 4, cell.layerPriority)
-               .bits(21, 0, 9, raw(measured, -140, 0.25, 9))
-               .bits(22, 1, 9, raw(average, -140, 0.25, 9))
-               .bits(23, 2, 7, raw(measuredRsrq, -30, 0.25, 7))
-               .bits(24, 1, 7, raw(averageRsrq, -30, 0.25, 7))
-               .bits(25, 0, 9, raw(_drive.rssi(cell, measured, measuredRsrq), -140, 0.5, 9))
+               .bits(21, 0, 9, rawLevel(measured, -140, 0.25, 9))
+               .bits(22, 1, 9, rawLevel(average, -140, 0.25, 9))
+               .bits(23, 2, 7, rawLevel(measuredRsrq, -30, 0.25, 7))
+               .bits(24, 1, 7, rawLevel(averageRsrq, -30, 0.25, 7))
+               .bits(25, 0, 9, rawLevel(_drive.rssi(cell, measured, measuredRsrq), -140, 0.5, 9))
                .bits(26, 1, 6, (qrxlevmin + 140) / 2)
                .bits(26, 7, 7, 23 + 30)
                .bits(27, 6, 6, 23 + 30)
-               .bits(29, 0, 7, raw(srxlev, -30, 1, 7))
+               .bits(29, 0, 7, rawLevel(srxlev, -30, 1, 7))
                .bits(29, 7, 6, srxlev < 0 ? 1 : 0)
                .bits(30, 5, 6, 62 / 2)
                .bits(31, 3, 6, 10 / 2)
@@ -145,9 +118,9 @@ void LTEScenario::reportConnectedMeasurement()
     PacketBuilder packet(0xB179);
     packet.u16(17, serving.downlinkEarfcn)
         .u16(19, serving.physicalCellId)
-        .u16(21, static_cast<std::uint16_t>(_step * 50 % 10240))
-        .u16(23, raw(rsrp, -140, 0.25, 16))
-        .u16(25, raw(_drive.rsrq(serving, rsrp), -20, 0.125, 16));
+        .u16(21, static_cast<std::uint16_t>(step() * 50 % 10240))
+        .u16(23, rawLevel(rsrp, -140, 0.25, 16))
+        .u16(25, rawLevel(_drive.rsrq(serving, rsrp), -20, 0.125, 16));
 
     const auto neighbours = neighborsOfServingCell();
     const std::size_t measured = std::min(neighbours.size(), measuredNeighbours);
@@ -157,8 +130,8 @@ void LTEScenario::reportConnectedMeasurement()
     for (std::size_t i = 0; i < measured; ++i, offset += 6) {
         const double level = _drive.averageRsrp(*neighbours[i]);
         packet.u16(offset, neighbours[i]->physicalCellId)
-            .u16(offset + 2, raw(level, -140, 0.25, 16))
-            .u16(offset + 4, raw(_drive.rsrq(*neighbours[i], level), -20, 0.125, 16));
+            .u16(offset + 2, rawLevel(level, -140, 0.25, 16))
+            .u16(offset + 4, rawLevel(_drive.rsrq(*neighbours[i], level), -20, 0.125, 16));
     }
     for (std::size_t i = measured; i < neighbours.size(); ++i, offset += 2)
         packet.u16(offset, neighbours[i]->physicalCellId);
@@ -192,14 +165,15 @@ void LTEScenario::reportIdleNeighbors()
         const double average = _drive.averageRsrp(*cell);
         const double measuredRsrq = _drive.rsrq(*cell, measured);
         packet.bits(offset, 0, 9, cell->physicalCellId)
-            .bits(offset + 1, 1, 8, raw(_drive.rssi(*cell, measured, measuredRsrq), -140, 0.5, 8))
-            .bits(offset + 2, 1, 9, raw(measured, -140, 0.5, 9))
-            .bits(offset + 4, 0, 9, raw(average, -140, 0.5, 9))
-            .bits(offset + 5, 1, 7, raw(measuredRsrq, -30, 0.25, 7))
-            .bits(offset + 6, 0, 7, raw(_drive.rsrq(*cell, average), -30, 0.25, 7))
-            .bits(offset + 6, 7, 7, raw(average - qrxlevmin, -30, 1, 7))
+            .bits(offset + 1, 1, 8,
+                  rawLevel(_drive.rssi(*cell, measured, measuredRsrq), -140, 0.5, 8))
+            .bits(offset + 2, 1, 9, rawLevel(measured, -140, 0.5, 9))
+            .bits(offset + 4, 0, 9, rawLevel(average, -140, 0.5, 9))
+            .bits(offset + 5, 1, 7, rawLevel(measuredRsrq, -30, 0.25, 7))
+            .bits(offset + 6, 0, 7, rawLevel(_drive.rsrq(*cell, average), -30, 0.25, 7))
+            .bits(offset + 6, 7, 7, rawLevel(average - qrxlevmin, -30, 1, 7))
             .u16(offset + 8, static_cast<std::uint16_t>(cell->physicalCellId % 40))
-            .bits(offset + 12, 0, 11, static_cast<std::uint32_t>(_step % 1024))
+            .bits(offset + 12, 0, 11, static_cast<std::uint32_t>(step() % 1024))
             .bits(offset + 12, 11, 19, static_cast<std::uint32_t>(cell->position))
             .u32(offset + 16, 0);
         offset += 20;
@@ -227,45 +201,6 @@ void LTEScenario::reportReselectionCandidates()
                .size(29));
 }
 
-void LTEScenario::reportSimFiles()
-{
-    reportList(0xFF0000, PlistDictionary{{"kSimFile_ICCID", "89490200001234567890"},
-                                         {"kSimFile_MSISDN", "+491701234567"},
-                                         {"kSimFile_MBDN", "+491703311"},
-                                         {"kSimFile_HPPLMN", "30 min"},
-                                         {"kSimFile_LOCI", "262 07 LAC 4711 updated"},
-                                         {"kSimFile_PSLOCI", "262 07 RAC 17 updated"},
-                                         {"kSimFile_ACC", "0x0008"},
-                                         {"kSimFile_AD", "normal operation, MNC of 2 digits"},
-                                         {"kSimFile_FPLMN", "262 01, 262 02"},
-                                         {"kSimFile_AHPLMN", "262 07"},
-                                         {"kSimFile_RATMODE", "automatic"},
-                                         {"kSimFile_PNN", "Ventrik Mobile"},
-                                         {"kSimFile_OPL", "262 07 0000-FFFE"},
-                                         {"kSimFile_OPLMNAcT", "262 07 E-UTRAN"}});
-}
-
-void LTEScenario::reportPdpContexts()
-{
-    PlistArray contexts{PlistDictionary{{"APN", "ims"},
-                                        {"Bearer", "5"},
-                                        {"Type", "IPv6"},
-                                        {"Address", "2001:db8:2:1::17"},
-                                        {"QCI", "5"}}};
-    if (_drive.isConnected())
-        contexts.append(PlistDictionary{{"APN", "internet"},
-                                        {"Bearer", "6"},
-                                        {"Type", "IPv4v6"},
-                                        {"Address", "192.0.2.17"},
-                                        {"QCI", "9"}});
-    reportList(0xFF0002, contexts);
-}
-
-void LTEScenario::reportList(std::uint32_t logCode, const PlistValue& root)
-{
-    _messages.push_back({_step * LTEDrive::stepDuration, propertyListPacket(logCode, root)});
-}
-
 void LTEScenario::reportCellMonitor()
 {
     PlistArray cells;
@@ -285,7 +220,7 @@ void LTEScenario::reportCellMonitor()
             {kQXCellMonitorBandInfo, cell.band},
             {kQXCellMonitorUARFCN, cell.downlinkEarfcn}});
     }
-    reportList(0xFF0001, cells);
+    reportPropertyList(0xFF0001, cells);
 }
 
 } // namespace ventrik

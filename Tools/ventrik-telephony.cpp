@@ -1,8 +1,8 @@
 #include "Platform/Linux/LinuxPlatform.h"
 #include "Platform/Linux/TerminationSignals.h"
-#include "TelephonyService/LTEScenario.h"
 #include "TelephonyService/ReplaySource.h"
 #include "TelephonyService/ScenarioCapture.h"
+#include "TelephonyService/Scenarios.h"
 #include "TelephonyService/TelephonyService.h"
 #include "Tools/CommandLine.h"
 
@@ -26,7 +26,7 @@ constexpr const char* usage =
     "A telephony service for machines without a baseband: answers the log-channel protocol and\n"
     "streams a built-in scenario, or a capture, to every viewer that connects.\n"
     "\n"
-    "  --technology NAME  the scenario of that technology (lte)\n"
+    "  --technology NAME  the scenario of that technology: lte or utran\n"
     "  --seed N           another drive through the same scenario (default 1)\n"
     "  --write CAPTURE    writes the scenario's messages to a capture instead, and ends\n"
     "  --count N          so many of them (default 10000)\n"
@@ -70,7 +70,7 @@ CaptureTechnology technologyArgument(const CommandLine& line)
     const auto technology = technologyNamed(line.value());
     if (!technology)
         line.refuse(fmt::format("there is no technology '{}'", line.value()));
-    if (technology->name != "lte")
+    if (!makeScenario(*technology, 1))
         line.refuse(fmt::format("there is no scenario for '{}' yet", line.value()));
     return *technology;
 }
@@ -154,9 +154,10 @@ std::optional<LogChannelContent> makeContent(const ServiceOptions& options, Syst
                                              std::string& error)
 {
     if (options.technology) {
-        return LogChannelContent{
-            std::string(options.technology->identifier),
-            [seed = options.seed] { return std::make_unique<LTEScenario>(seed); }};
+        return LogChannelContent{std::string(options.technology->identifier),
+                                 [technology = *options.technology, seed = options.seed] {
+                                     return makeScenario(technology, seed);
+                                 }};
     }
     const auto reader = CaptureReader::open(options.replay->capture, error);
     if (!reader)
@@ -185,9 +186,9 @@ int fail(std::string_view reason)
 
 int writeCapture(const ServiceOptions& options)
 {
-    LTEScenario scenario(options.seed);
+    const auto scenario = makeScenario(*options.technology, options.seed);
     std::string error;
-    if (writeScenarioCapture(scenario, options.messageCount, *options.technology,
+    if (writeScenarioCapture(*scenario, options.messageCount, *options.technology,
                              *options.captureToWrite, error))
         return EXIT_SUCCESS;
     return fail(error);

@@ -10,6 +10,16 @@ std::string decimal(std::int32_t value)
     return fmt::format("{}", value);
 }
 
+std::string sixDecimals(double value)
+{
+    return fmt::format("{:f}", value);
+}
+
+std::string sixDecimalsDb(double value)
+{
+    return fmt::format("{:f} dB", value);
+}
+
 std::string wholeDb(std::int32_t value)
 {
     return fmt::format("{} dB", value);

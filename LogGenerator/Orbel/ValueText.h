@@ -10,6 +10,10 @@ namespace ventrik
 
 /// "%d"
 std::string decimal(std::int32_t value);
+/// "%f"
+std::string sixDecimals(double value);
+/// "%f dB"
+std::string sixDecimalsDb(double value);
 /// "%d dB"
 std::string wholeDb(std::int32_t value);
 /// "%d dBm"

@@ -102,11 +102,93 @@ TEST_F(ClassIndexTest, HasEveryLTESection)
         EXPECT_NE(index.getClass(name), nullptr) << name;
 }
 
-// What is not built yet is not there at all. Each family leaves this test when it comes.
-TEST_F(ClassIndexTest, GSMAndUTRANSectionsAreNotBuiltYet)
+TEST_F(ClassIndexTest, RoutesTheUTRANCodes)
 {
-    EXPECT_TRUE(Orbel_GSMClassIndex(log).sections().empty());
-    EXPECT_TRUE(UTRANClassIndex(log).sections().empty());
+    const UTRANClassIndex index(log);
+    EXPECT_THAT(subscriberNames(index, 0xD0E0), testing::ElementsAre("RRC Info"));
+    EXPECT_THAT(subscriberNames(index, 0xD0E2), testing::ElementsAre("Serving Cell Info"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0001), testing::ElementsAre("Serving Cell Info"));
+    EXPECT_THAT(subscriberNames(index, 0xD00A), testing::ElementsAre("Neighbor Cell List"));
+    EXPECT_THAT(subscriberNames(index, 0xD00E), testing::ElementsAre("GSM Neighbor Cell List"));
+    EXPECT_THAT(subscriberNames(index, 0xD00C), testing::ElementsAre("TRCH BLER", "CCTRCH SIR"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0002), testing::ElementsAre("PDP Context Info"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0000), testing::ElementsAre("SIM Info"));
+    EXPECT_EQ(index.getSubscribers(0xD0E1), nullptr);
+}
+
+// The keys come in the order in which the sections registered them.
+TEST_F(ClassIndexTest, CreatesTheUTRANSectionsInTheirOrder)
+{
+    const UTRANClassIndex index(log);
+    EXPECT_THAT(index.getAllLogCodes(),
+                testing::ElementsAre("53472", "53474", "16711681", "53258", "53262", "53260",
+                                     "16711682", "16711680"));
+    std::vector<std::string> expected(8, "Array Count: 1");
+    expected[1] = "Array Count: 2";
+    EXPECT_EQ(log.texts(4), expected);
+}
+
+TEST_F(ClassIndexTest, HasEveryUTRANSection)
+{
+    const UTRANClassIndex index(log);
+    EXPECT_EQ(index.sections().size(), 8U);
+    for (const char* name :
+         {"RRC Info", "Serving Cell Info", "Neighbor Cell List", "GSM Neighbor Cell List",
+          "TRCH BLER", "CCTRCH SIR", "PDP Context Info", "SIM Info"})
+        EXPECT_NE(index.getClass(name), nullptr) << name;
+}
+
+TEST_F(ClassIndexTest, RoutesTheGSMCodes)
+{
+    const Orbel_GSMClassIndex index(log);
+    EXPECT_THAT(
+        subscriberNames(index, 0x417A),
+        testing::ElementsAre("Active Set", "Detected Set", "Monitored Set", "Virtual Active Set"));
+    EXPECT_THAT(subscriberNames(index, 0x7132),
+                testing::ElementsAre("Process PS", "Process CO", "Serving PLMN", "Process CS"));
+    EXPECT_THAT(subscriberNames(index, 0x7131), testing::ElementsAre("Process CO", "Process CS"));
+    EXPECT_THAT(subscriberNames(index, 0x4005), testing::ElementsAre("GSM Set", "UMTS Set"));
+    EXPECT_THAT(subscriberNames(index, 0x7130), testing::ElementsAre("Process PS"));
+    EXPECT_THAT(subscriberNames(index, 0x7135), testing::ElementsAre("Serving PLMN"));
+    EXPECT_THAT(subscriberNames(index, 0x7150), testing::ElementsAre("Equivalent PLMN List"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0001), testing::ElementsAre("Serving PLMN", "UMTS Set"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0002), testing::ElementsAre("PDP Context Info"));
+    EXPECT_THAT(subscriberNames(index, 0xFF0000), testing::ElementsAre("SIM Info"));
+}
+
+// Each section tells its number of codes when it is created.
+TEST_F(ClassIndexTest, CreatesTheGSMSectionsInTheirOrder)
+{
+    const Orbel_GSMClassIndex index(log);
+    std::vector<std::string> expected;
+    for (const int codes : {1, 0, 1, 2, 0, 1, 1, 0, 2, 3, 2, 1, 1, 0, 2, 1, 1})
+        expected.push_back(fmt::format("Array Count: {}", codes));
+    EXPECT_EQ(log.texts(4), expected);
+    EXPECT_THAT(index.getAllLogCodes(),
+                testing::ElementsAre("16762", "16711682", "28976", "28978", "16389", "28977",
+                                     "28981", "16711681", "29008", "16711680"));
+}
+
+TEST_F(ClassIndexTest, HasTheGSMSectionsThatAreBuilt)
+{
+    const Orbel_GSMClassIndex index(log);
+    EXPECT_EQ(index.sections().size(), 17U);
+    for (const char* name :
+         {"Active Set", "Coding Scheme", "PDP Context Info", "Process PS", "Cell Change Counters",
+          "Detected Set", "GSM Set", "Non-Ranked GSM Set", "Process CO", "Serving PLMN", "UMTS Set",
+          "Equivalent PLMN List", "Monitored Set", "Non-Ranked UMTS Set", "Process CS",
+          "Virtual Active Set", "SIM Info"})
+        EXPECT_NE(index.getClass(name), nullptr) << name;
+}
+
+// What is not built yet is not there at all. A section leaves this test when it comes.
+TEST_F(ClassIndexTest, LacksTheGSMSectionsThatAreNotBuiltYet)
+{
+    const Orbel_GSMClassIndex index(log);
+    for (const char* name :
+         {"GPRS Information", "GSM Serving Cell", "Mobile Allocation", "Neighboring Cells",
+          "UMTS RR Measurement", "GSM RR Info", "UMTS RR Info", "BLER", "HSDPA Info"})
+        EXPECT_EQ(index.getClass(name), nullptr) << name;
 }
 
 } // namespace ventrik

@@ -17,7 +17,7 @@ bool containsIgnoringCase(std::string_view text, std::string_view part)
     const auto same = [](unsigned char a, unsigned char b) {
         return std::toupper(a) == std::toupper(b);
     };
-    return !std::ranges::search(text, part, same).empty();
+    return std::search(text.begin(), text.end(), part.begin(), part.end(), same) != text.end();
 }
 
 } // namespace

@@ -1,0 +1,19 @@
+#pragma once
+
+#include "LogGenerator/Orbel/Base.h"
+
+namespace ventrik
+{
+
+/// The cells of the active set with their signal levels, one row each.
+class ActiveSet : public Base
+{
+  public:
+    using Base::Base;
+
+    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
+    std::string_view getSectionName() const override;
+    std::vector<std::uint32_t> getLogCodeArray() const override;
+};
+
+} // namespace ventrik

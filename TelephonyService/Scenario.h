@@ -1,0 +1,49 @@
+#pragma once
+
+#include "TelephonyService/MessageSource.h"
+
+#include <cstdint>
+#include <deque>
+#include <string_view>
+
+namespace ventrik
+{
+
+class PacketBuilder;
+
+/// What the scenarios of all technologies have in common: steps of equal length, each of which
+/// reports some packets; and the SIM's files and packet data contexts, which are the phone's own.
+class Scenario : public MessageSource
+{
+  public:
+    static constexpr std::chrono::milliseconds stepDuration{50};
+
+    /// Endless.
+    std::optional<TimedMessage> next() final;
+
+  protected:
+    /// The number of the step that is being reported, from 0.
+    std::uint64_t step() const { return _step; }
+
+    /// Sends a packet at the time of this step; now and then one with the transport prefix.
+    void report(PacketBuilder packet);
+    /// Sends a packet that carries a property list.
+    void reportPropertyList(std::uint32_t logCode, const PlistValue& root);
+    /// The access technology is the one that the SIM prefers.
+    void reportSimFiles(std::string_view accessTechnology);
+    /// One context that always stands, and one for data while the phone is connected.
+    void reportPdpContexts(bool isConnected);
+
+  private:
+    /// Moves the world on by one step and reports it.
+    virtual void reportStep() = 0;
+
+    std::uint64_t _step = 0;
+    std::uint64_t _messageCount = 0;
+    std::deque<TimedMessage> _messages;
+};
+
+/// A level as a record carries it: steps above a floor, cut to what so many bits hold.
+std::uint16_t rawLevel(double level, double floor, double step, unsigned bits);
+
+} // namespace ventrik

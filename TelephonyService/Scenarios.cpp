@@ -1,0 +1,19 @@
+#include "TelephonyService/Scenarios.h"
+
+#include "Platform/TelephonyConstants.h"
+#include "TelephonyService/LTEScenario.h"
+#include "TelephonyService/UTRANScenario.h"
+
+namespace ventrik
+{
+
+std::unique_ptr<MessageSource> makeScenario(const CaptureTechnology& technology, std::uint32_t seed)
+{
+    if (technology.identifier == kQXLogChannelTechnology_Orbel_LTE)
+        return std::make_unique<LTEScenario>(seed);
+    if (technology.identifier == kQXLogChannelTechnology_Orbel_UTRAN2)
+        return std::make_unique<UTRANScenario>(seed);
+    return nullptr;
+}
+
+} // namespace ventrik

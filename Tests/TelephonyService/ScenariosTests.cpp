@@ -1,0 +1,40 @@
+#include "TelephonyService/Scenarios.h"
+#include "Tests/TelephonyService/ScenarioFixture.h"
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+
+std::set<std::uint32_t> codesOfScenario(std::string_view technology)
+{
+    const auto scenario = makeScenario(*technologyNamed(technology), 1);
+    return scenario ? codesOf(messagesUpTo(*scenario, 60s)) : std::set<std::uint32_t>{};
+}
+
+} // namespace
+
+TEST(Scenarios, EachTechnologyGetsItsOwn)
+{
+    EXPECT_TRUE(codesOfScenario("lte").contains(0xB17F));
+    EXPECT_TRUE(codesOfScenario("utran").contains(0xD00A));
+}
+
+TEST(Scenarios, TheSeedReachesTheScenario)
+{
+    const auto technology = *technologyNamed("utran");
+    EXPECT_FALSE(areSame(messagesUpTo(*makeScenario(technology, 1), 10s),
+                         messagesUpTo(*makeScenario(technology, 2), 10s)));
+    EXPECT_TRUE(areSame(messagesUpTo(*makeScenario(technology, 2), 10s),
+                        messagesUpTo(*makeScenario(technology, 2), 10s)));
+}
+
+TEST(Scenarios, ATechnologyWithoutAScenarioGetsNone)
+{
+    EXPECT_EQ(makeScenario({200, "kQXLogChannelTechnology_Other", "other"}, 1), nullptr);
+}
+
+} // namespace ventrik

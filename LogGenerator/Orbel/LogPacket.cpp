@@ -1,5 +1,7 @@
 #include "LogGenerator/Orbel/LogPacket.h"
 
+#include "LogGenerator/Orbel/ArrayOutOfBoundsException.h"
+
 #include <algorithm>
 
 namespace ventrik
@@ -20,6 +22,13 @@ std::size_t RecordElements::completeIn(const LogPacket& packet) const
     if (packet.size() < offset + needed)
         return 0;
     return std::min(count, (packet.size() - offset - needed) / stride + 1);
+}
+
+LogPacket RecordElements::element(const LogPacket& packet, std::size_t index) const
+{
+    if (index >= count)
+        throw ArrayOutOfBoundsException();
+    return packet.from(offset + stride * index);
 }
 
 ByteView stripPrefix(ByteView data)

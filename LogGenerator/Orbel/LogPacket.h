@@ -65,10 +65,8 @@ struct RecordElements {
 
     /// How many can be read: the count that the record declares may promise more than it holds.
     std::size_t completeIn(const LogPacket& packet) const;
-    LogPacket element(const LogPacket& packet, std::size_t index) const
-    {
-        return packet.from(offset + stride * index);
-    }
+    /// Throws ArrayOutOfBoundsException for an index that is not below the count.
+    LogPacket element(const LogPacket& packet, std::size_t index) const;
 };
 
 /// Removes the transport prefix. The data must be empty or hold at least 2 bytes.

@@ -1,3 +1,4 @@
+#include "LogGenerator/Orbel/ArrayOutOfBoundsException.h"
 #include "LogGenerator/Orbel/LogPacket.h"
 #include "TelephonyService/PacketBuilder.h"
 
@@ -105,6 +106,14 @@ TEST(RecordElements, AnElementCountsFromItsOwnFirstByte)
     const LogPacket packet(bytes);
     EXPECT_EQ((RecordElements{2, 2, 2, 2}.element(packet, 1).u16(0)), 0x0403);
     EXPECT_EQ(packet.from(9).size(), 0U);
+}
+
+TEST(RecordElements, AnIndexOutsideTheDeclaredCountIsRefused)
+{
+    const Bytes bytes(100);
+    const RecordElements elements{13, 4, 3, 2};
+    EXPECT_NO_THROW(elements.element(LogPacket(bytes), 2));
+    EXPECT_THROW(elements.element(LogPacket(bytes), 3), ArrayOutOfBoundsException);
 }
 
 TEST(PacketBuilder, WritesTheHeader)

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/Base.h"
 
 #include "LogGenerator/Orbel/ArrayLock.h"
+#include "LogGenerator/Orbel/ValueText.h"
 
 #include <algorithm>
 #include <array>
@@ -80,6 +81,17 @@ void Base::withdraw(std::string_view key) const
 {
     if (auto dictionary = sectionRef.dictionary())
         dictionary->remove(key);
+}
+
+void Base::showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
+                          std::string_view nameInLog) const
+{
+    for (const CellField& field : fields) {
+        if (const auto number = cellNumber(cell, field.cellKey))
+            show(field.displayKey, decimal(*number));
+        else
+            log().error("{}: Failed to retrieve {}\n", nameInLog, field.nameInLog);
+    }
 }
 
 void Base::clearRows() const

@@ -1,11 +1,13 @@
 #pragma once
 
+#include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/CodeDictionary.h"
 #include "LogGenerator/Orbel/LogPacket.h"
 #include "Platform/SystemLog.h"
 #include "PropertyList/PlistValue.h"
 
 #include <cstdint>
+#include <span>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -61,6 +63,10 @@ class Base
     /// Removes a key from the section's dictionary.
     void withdraw(std::string_view key) const;
 
+    /// Shows each number that the cell has; reports each other one in a line that begins with the
+    /// given name, and leaves its key as it was.
+    void showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
+                        std::string_view nameInLog) const;
     /// Empties the section's list.
     void clearRows() const;
     /// Puts the rows in the place of the section's list.

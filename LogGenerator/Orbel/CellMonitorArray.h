@@ -20,6 +20,13 @@ std::optional<PlistArray> parseCellMonitorArray(const LogPacket& packet, SystemL
 /// real truncated toward zero first. None when the key is missing or is no number.
 std::optional<std::int32_t> cellNumber(const PlistDictionary& cell, std::string_view key);
 
+/// A number of a cell, where a section shows it and how the log names it when it is missing.
+struct CellField {
+    std::string_view cellKey;
+    std::string_view displayKey;
+    std::string_view nameInLog;
+};
+
 /// Whether the cell's entry under the key is that string.
 bool cellEntryIs(const PlistDictionary& cell, std::string_view key, std::string_view value);
 

@@ -49,12 +49,6 @@ bool isServingCell(const PlistDictionary& cell)
            cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeServing);
 }
 
-struct CellField {
-    std::string_view cellKey;
-    std::string_view displayKey;
-    std::string_view nameInLog;
-};
-
 constexpr std::array<CellField, 3> cellFields{{
     {kQXCellMonitorMCC, "Mobile Country Code", "MCC"},
     {kQXCellMonitorMNC, "Mobile Network Code", "MNC"},
@@ -115,6 +109,7 @@ void ServingPLMN::updateFromRegistration(const LogPacket& packet)
     show("PLMN Sel Mod", labelOr(selectionModeLabels, packet.u8(14), "Unknown"));
 }
 
+// Plain numbers here: no leading zeros, no blanks. Whichever record came last is shown.
 void ServingPLMN::updateFromCellMonitor(const LogPacket& packet)
 {
     const auto cells = parseCellMonitorArray(packet, log());
@@ -126,18 +121,7 @@ void ServingPLMN::updateFromCellMonitor(const LogPacket& packet)
         return cell.dictionary() && isServingCell(*cell.dictionary());
     });
     if (serving != cells->end())
-        showCell(*serving->dictionary());
-}
-
-// Plain numbers here: no leading zeros, no blanks. Whichever record came last is shown.
-void ServingPLMN::showCell(const PlistDictionary& cell)
-{
-    for (const CellField& field : cellFields) {
-        if (const auto number = cellNumber(cell, field.cellKey))
-            show(field.displayKey, decimal(*number));
-        else
-            log().error("ServingPLMN: Failed to retrieve {}\n", field.nameInLog);
-    }
+        showCellFields(*serving->dictionary(), cellFields, "ServingPLMN");
 }
 
 } // namespace ventrik

@@ -19,7 +19,6 @@ class ServingPLMN : public Base
     void updateFromServingPLMN(const LogPacket& packet);
     void updateFromRegistration(const LogPacket& packet);
     void updateFromCellMonitor(const LogPacket& packet);
-    void showCell(const PlistDictionary& cell);
 };
 
 } // namespace ventrik

@@ -44,12 +44,6 @@ bool isLTEServingCell(const PlistDictionary& cell)
            cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeServing);
 }
 
-struct CellField {
-    std::string_view cellKey;
-    std::string_view displayKey;
-    std::string_view nameInLog;
-};
-
 constexpr std::array<CellField, 5> cellFields{{
     {kQXCellMonitorTAC, "Tracking Area Code", "TAC"},
     {kQXCellMonitorCellId, "Cell Identity", "Cell ID"},
@@ -126,17 +120,7 @@ void LTEServingCellInfo::updateFromCellMonitor(const LogPacket& packet)
         return cell.dictionary() && isLTEServingCell(*cell.dictionary());
     });
     if (serving != cells->end())
-        showCell(*serving->dictionary());
-}
-
-void LTEServingCellInfo::showCell(const PlistDictionary& cell)
-{
-    for (const CellField& field : cellFields) {
-        if (const auto number = cellNumber(cell, field.cellKey))
-            show(field.displayKey, decimal(*number));
-        else
-            log().error("Serving Cell Info: Failed to retrieve {}\n", field.nameInLog);
-    }
+        showCellFields(*serving->dictionary(), cellFields, "Serving Cell Info");
 }
 
 } // namespace ventrik

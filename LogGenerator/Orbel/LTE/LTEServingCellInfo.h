@@ -19,7 +19,6 @@ class LTEServingCellInfo : public Base
     void updateFromCellInfo(const LogPacket& packet);
     void updateFromAntennaCount(const LogPacket& packet, std::uint32_t logCode);
     void updateFromCellMonitor(const LogPacket& packet);
-    void showCell(const PlistDictionary& cell);
 };
 
 } // namespace ventrik

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Orbel/ArrayLock.h"
 #include "LogGenerator/Orbel/ValueText.h"
+#include "Platform/TelephonyConstants.h"
 
 #include <algorithm>
 #include <array>
@@ -83,6 +84,14 @@ void Base::withdraw(std::string_view key) const
         dictionary->remove(key);
 }
 
+std::optional<PlistArray> Base::getCellArray(const LogPacket& packet) const
+{
+    auto cells = parseCellMonitorArray(packet, log());
+    if (!cells)
+        log().error("Failed to get Cell Array\n");
+    return cells;
+}
+
 void Base::showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
                           std::string_view nameInLog) const
 {
@@ -92,6 +101,30 @@ void Base::showCellFields(const PlistDictionary& cell, std::span<const CellField
         else
             log().error("{}: Failed to retrieve {}\n", nameInLog, field.nameInLog);
     }
+}
+
+void Base::showNeighborCells(const LogPacket& packet, std::string_view technology,
+                             std::span<const CellRowField> fields, std::string_view nameInLog) const
+{
+    clearRows();
+    const auto cells = getCellArray(packet);
+    if (!cells)
+        return;
+    PlistArray rows;
+    for (const PlistValue& element : *cells) {
+        const PlistDictionary* cell = element.dictionary();
+        if (!cell || !isCell(*cell, technology, kQXCellMonitorCellTypeNeighbor))
+            continue;
+        PlistDictionary row;
+        for (const CellRowField& field : fields) {
+            if (const auto number = cellNumber(*cell, field.cellKey))
+                row.set(field.rowKey, field.text(*number));
+            else
+                log().error("{}: Failed to retrieve {}\n", nameInLog, field.rowKey);
+        }
+        rows.append(row);
+    }
+    showRows(rows);
 }
 
 void Base::clearRows() const

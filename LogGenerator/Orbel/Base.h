@@ -7,6 +7,7 @@
 #include "PropertyList/PlistValue.h"
 
 #include <cstdint>
+#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -63,10 +64,17 @@ class Base
     /// Removes a key from the section's dictionary.
     void withdraw(std::string_view key) const;
 
+    /// The cells of a cell-monitor packet; none, with two error lines, when there is no such array.
+    std::optional<PlistArray> getCellArray(const LogPacket& packet) const;
     /// Shows each number that the cell has; reports each other one in a line that begins with the
     /// given name, and leaves its key as it was.
     void showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
                         std::string_view nameInLog) const;
+    /// Puts a row for each neighbour cell of the technology in the place of the section's list. A
+    /// packet without a cell array empties it. A number that a cell lacks is reported in a line
+    /// that begins with the given name.
+    void showNeighborCells(const LogPacket& packet, std::string_view technology,
+                           std::span<const CellRowField> fields, std::string_view nameInLog) const;
     /// Empties the section's list.
     void clearRows() const;
     /// Puts the rows in the place of the section's list.

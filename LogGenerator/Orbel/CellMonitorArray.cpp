@@ -1,7 +1,9 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 
+#include "Platform/TelephonyConstants.h"
 #include "PropertyList/PropertyListReader.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace ventrik
@@ -17,6 +19,12 @@ std::optional<std::int32_t> truncated(double number)
     constexpr double twoTo32 = 4294967296.0;
     const auto lowBits = static_cast<std::int64_t>(std::fmod(std::trunc(number), twoTo32));
     return static_cast<std::int32_t>(lowBits);
+}
+
+bool entryIs(const PlistDictionary& cell, std::string_view key, std::string_view value)
+{
+    const PlistValue* entry = cell.find(key);
+    return entry && entry->string() && *entry->string() == value;
 }
 
 } // namespace
@@ -42,10 +50,30 @@ std::optional<std::int32_t> cellNumber(const PlistDictionary& cell, std::string_
     return std::nullopt;
 }
 
-bool cellEntryIs(const PlistDictionary& cell, std::string_view key, std::string_view value)
+std::optional<std::int16_t> cellLevel(std::int32_t number)
 {
-    const PlistValue* entry = cell.find(key);
-    return entry && entry->string() && *entry->string() == value;
+    constexpr std::int16_t notMeasured = 32767;
+    const auto level = static_cast<std::int16_t>(number);
+    return level == notMeasured ? std::nullopt : std::optional(level);
+}
+
+bool isCell(const PlistDictionary& cell, std::string_view technology, std::string_view type)
+{
+    return entryIs(cell, kQXCellMonitorCellRadioAccessTechnology, technology) &&
+           entryIs(cell, kQXCellMonitorCellType, type);
+}
+
+const PlistDictionary* servingCell(const PlistArray& cells,
+                                   std::initializer_list<std::string_view> technologies)
+{
+    for (const PlistValue& element : cells) {
+        const PlistDictionary* cell = element.dictionary();
+        if (cell && std::ranges::any_of(technologies, [&](std::string_view technology) {
+                return isCell(*cell, technology, kQXCellMonitorCellTypeServing);
+            }))
+            return cell;
+    }
+    return nullptr;
 }
 
 } // namespace ventrik

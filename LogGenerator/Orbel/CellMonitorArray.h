@@ -4,6 +4,7 @@
 #include "Platform/SystemLog.h"
 
 #include <cstdint>
+#include <initializer_list>
 #include <optional>
 
 namespace ventrik
@@ -27,7 +28,21 @@ struct CellField {
     std::string_view nameInLog;
 };
 
-/// Whether the cell's entry under the key is that string.
-bool cellEntryIs(const PlistDictionary& cell, std::string_view key, std::string_view value);
+/// A number of a cell as a list of cells shows it; the row's key names it in the log as well.
+struct CellRowField {
+    std::string_view cellKey;
+    std::string_view rowKey;
+    std::string (*text)(std::int32_t);
+};
+
+/// A level of a cell: the low 16 bits of its number; none when they say that it was not measured.
+std::optional<std::int16_t> cellLevel(std::int32_t number);
+
+/// Whether the cell is of that radio access technology and of that type.
+bool isCell(const PlistDictionary& cell, std::string_view technology, std::string_view type);
+
+/// The first serving cell of one of the technologies; null when there is none.
+const PlistDictionary* servingCell(const PlistArray& cells,
+                                   std::initializer_list<std::string_view> technologies);
 
 } // namespace ventrik

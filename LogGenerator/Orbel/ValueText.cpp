@@ -10,6 +10,11 @@ std::string decimal(std::int32_t value)
     return fmt::format("{}", value);
 }
 
+std::string unsignedDecimal(std::uint32_t value)
+{
+    return fmt::format("{}", value);
+}
+
 std::string sixDecimals(double value)
 {
     return fmt::format("{:f}", value);
@@ -32,12 +37,12 @@ std::string wholeDbm(std::int32_t value)
 
 std::string db(double value)
 {
-    return fmt::format("{:4.2f} dB", value);
+    return fmt::format("{:>4.2f} dB", value);
 }
 
 std::string dbm(double value)
 {
-    return fmt::format("{:4.2f} dBm", value);
+    return fmt::format("{:>4.2f} dBm", value);
 }
 
 } // namespace ventrik

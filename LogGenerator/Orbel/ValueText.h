@@ -10,6 +10,8 @@ namespace ventrik
 
 /// "%d"
 std::string decimal(std::int32_t value);
+/// "%u"
+std::string unsignedDecimal(std::uint32_t value);
 /// "%f"
 std::string sixDecimals(double value);
 /// "%f dB"

@@ -4,6 +4,7 @@
 #include "LogGenerator/Orbel/GSM/MonitoredSet.h"
 #include "LogGenerator/Orbel/GSM/NonRankedGSMSet.h"
 #include "LogGenerator/Orbel/GSM/NonRankedUMTSSet.h"
+#include "LogGenerator/Orbel/GSM/UMTSRRMeasurement.h"
 #include "LogGenerator/Orbel/GSM/VirtualActiveSet.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
@@ -32,6 +33,8 @@ constexpr Names namesOf<NonRankedGSMSet>{"Non-Ranked GSM Set", "NonRankedGSMSet"
 template <>
 constexpr Names namesOf<NonRankedUMTSSet>{"Non-Ranked UMTS Set", "NonRankedUMTSSet"};
 template <>
+constexpr Names namesOf<UMTSRRMeasurement>{"UMTS RR Measurement", "UMTSRRMeasurement"};
+template <>
 constexpr Names namesOf<DetectedSet>{"Detected Set", "DetectedSet"};
 template <>
 constexpr Names namesOf<MonitoredSet>{"Monitored Set", "MonitoredSet"};
@@ -54,8 +57,8 @@ class PlaceholderTest : public testing::Test
     Section section{log};
 };
 
-using Placeholders =
-    testing::Types<CellChangeCounters, CodingScheme, NonRankedGSMSet, NonRankedUMTSSet>;
+using Placeholders = testing::Types<CellChangeCounters, CodingScheme, NonRankedGSMSet,
+                                    NonRankedUMTSSet, UMTSRRMeasurement>;
 TYPED_TEST_SUITE(PlaceholderTest, Placeholders);
 
 // Sections that stay empty whatever the cell list holds.

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/GSM/ServingPLMN.h"
 #include "Platform/TelephonyConstants.h"
+#include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -31,15 +32,10 @@ class ServingPLMNTest : public SectionFixture<ServingPLMN>
     {
         return PacketBuilder(0x7132).u8(14, selectionMode).size(16);
     }
-    static PlistDictionary cell(std::string_view technology, std::string_view type)
-    {
-        return {{kQXCellMonitorCellRadioAccessTechnology, technology},
-                {kQXCellMonitorCellType, type}};
-    }
     static PlistDictionary servingCell(std::int32_t countryCode)
     {
         PlistDictionary result =
-            cell(kQXCellMonitorRadioAccessTechnologyGSM, kQXCellMonitorCellTypeServing);
+            cellEntry(kQXCellMonitorRadioAccessTechnologyGSM, kQXCellMonitorCellTypeServing);
         result.set(kQXCellMonitorMCC, countryCode);
         result.set(kQXCellMonitorMNC, 1);
         result.set(kQXCellMonitorLAC, 4711);
@@ -206,7 +202,7 @@ TEST_F(ServingPLMNTest, CellMonitorWithoutAServingCellChangesNothing)
 {
     monitor({});
     monitor({7, "no cell"});
-    monitor({cell(kQXCellMonitorRadioAccessTechnologyGSM, kQXCellMonitorCellTypeNeighbor)});
+    monitor({cellEntry(kQXCellMonitorRadioAccessTechnologyGSM, kQXCellMonitorCellTypeNeighbor)});
     EXPECT_TRUE(values.empty());
     EXPECT_TRUE(log.texts(3).empty());
 }

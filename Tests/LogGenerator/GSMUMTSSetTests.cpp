@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/GSM/UMTSSet.h"
 #include "Platform/TelephonyConstants.h"
+#include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -46,14 +47,9 @@ constexpr FieldRow fieldRows[] = {
     {5, 16, 32767, "Rank Cell RSCP", "32767 dB"},
 };
 
-PlistDictionary cell(std::string_view technology, std::string_view type)
-{
-    return {{kQXCellMonitorCellRadioAccessTechnology, technology}, {kQXCellMonitorCellType, type}};
-}
-
 PlistDictionary bareNeighbor()
 {
-    return cell(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeNeighbor);
+    return cellEntry(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeNeighbor);
 }
 
 PlistDictionary neighbor(std::int32_t code)
@@ -237,7 +233,7 @@ TEST_F(UMTSSetTest, CellMonitorWithoutNeighborsEmptiesTheList)
     monitor({});
     EXPECT_TRUE(rows.empty());
     rows.append("row");
-    monitor({cell(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeServing)});
+    monitor({cellEntry(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeServing)});
     EXPECT_TRUE(rows.empty());
     EXPECT_TRUE(log.texts(3).empty());
 }

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/LTE/LTEServingCellInfo.h"
 #include "Platform/TelephonyConstants.h"
+#include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -28,14 +29,9 @@ class LTEServingCellInfoTest : public SectionFixture<LTEServingCellInfo>
             .u32(28, 3)
             .size(38);
     }
-    static PlistDictionary cell(std::string_view technology, std::string_view type)
-    {
-        return {{kQXCellMonitorCellRadioAccessTechnology, technology},
-                {kQXCellMonitorCellType, type}};
-    }
     static PlistDictionary servingCell()
     {
-        return cell(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeServing);
+        return cellEntry(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeServing);
     }
     static PlistDictionary fullServingCell()
     {
@@ -153,10 +149,10 @@ TEST_F(LTEServingCellInfoTest, CellInfoSupersedesTheUARFCN)
 TEST_F(LTEServingCellInfoTest, CellMonitorSkipsCellsThatAreNotTheLTEServingOne)
 {
     PlistDictionary neighbour =
-        cell(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeNeighbor);
+        cellEntry(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeNeighbor);
     neighbour.set(kQXCellMonitorPID, 1);
     PlistDictionary umts =
-        cell(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeServing);
+        cellEntry(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeServing);
     PlistDictionary withoutType{
         {kQXCellMonitorCellRadioAccessTechnology, kQXCellMonitorRadioAccessTechnologyLTE}};
     monitor({neighbour, umts, withoutType, "no cell", fullServingCell()});
@@ -174,7 +170,7 @@ TEST_F(LTEServingCellInfoTest, CellMonitorTakesTheFirstServingCell)
 TEST_F(LTEServingCellInfoTest, CellMonitorWithoutAServingCellChangesNothing)
 {
     monitor({});
-    monitor({cell(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeNeighbor)});
+    monitor({cellEntry(kQXCellMonitorRadioAccessTechnologyLTE, kQXCellMonitorCellTypeNeighbor)});
     EXPECT_TRUE(values.empty());
     EXPECT_TRUE(log.texts(3).empty());
 }

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/UTRAN/UTRANServingCellInfo.h"
 #include "Platform/TelephonyConstants.h"
+#include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -16,20 +17,15 @@ class UTRANServingCellInfoTest : public SectionFixture<UTRANServingCellInfo>
 {
   protected:
     static PacketBuilder cellInfo() { return PacketBuilder(0xD0E2).size(26); }
-    static PlistDictionary cell(std::string_view technology, std::string_view type)
-    {
-        return {{kQXCellMonitorCellRadioAccessTechnology, technology},
-                {kQXCellMonitorCellType, type}};
-    }
     static PlistDictionary servingCell()
     {
-        return cell(kQXCellMonitorRadioAccessTechnologyUTRAN2, kQXCellMonitorCellTypeServing);
+        return cellEntry(kQXCellMonitorRadioAccessTechnologyUTRAN2, kQXCellMonitorCellTypeServing);
     }
     static PlistDictionary
     fullServingCell(std::string_view technology = kQXCellMonitorRadioAccessTechnologyUTRAN2,
                     std::string_view type = kQXCellMonitorCellTypeServing)
     {
-        PlistDictionary result = cell(technology, type);
+        PlistDictionary result = cellEntry(technology, type);
         result.set(kQXCellMonitorLAC, 4711);
         result.set(kQXCellMonitorCellId, 667905);
         result.set(kQXCellMonitorBandInfo, 34);

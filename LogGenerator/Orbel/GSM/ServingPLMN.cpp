@@ -2,11 +2,11 @@
 
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/GSM/RegistrationRecord.h"
+#include "LogGenerator/Orbel/GSM/ServingPLMNRecord.h"
 #include "LogGenerator/Orbel/Labels.h"
 #include "LogGenerator/Orbel/ValueText.h"
 #include "Platform/TelephonyConstants.h"
 
-#include <algorithm>
 #include <array>
 
 namespace ventrik
@@ -14,8 +14,6 @@ namespace ventrik
 
 namespace
 {
-
-constexpr std::uint32_t servingPLMNLogCode = 0x7135;
 
 constexpr std::array<std::string_view, 5> selectionModeLabels{
     "Automatic", "Manual", "Limited", "LIMITED_ROUTINE_ACQ", "LIMITED_MANUAL_ACQ"};
@@ -39,16 +37,6 @@ char highDigit(std::uint8_t byte)
     return digit(byte >> 4);
 }
 
-bool isServingCell(const PlistDictionary& cell)
-{
-    const auto hasTechnology = [&](std::string_view technology) {
-        return cellEntryIs(cell, kQXCellMonitorCellRadioAccessTechnology, technology);
-    };
-    return (hasTechnology(kQXCellMonitorRadioAccessTechnologyUMTS) ||
-            hasTechnology(kQXCellMonitorRadioAccessTechnologyGSM)) &&
-           cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeServing);
-}
-
 constexpr std::array<CellField, 3> cellFields{{
     {kQXCellMonitorMCC, "Mobile Country Code", "MCC"},
     {kQXCellMonitorMNC, "Mobile Network Code", "MNC"},
@@ -64,14 +52,14 @@ std::string_view ServingPLMN::getSectionName() const
 
 std::vector<std::uint32_t> ServingPLMN::getLogCodeArray() const
 {
-    return {servingPLMNLogCode, RegistrationRecord::logCode, cellMonitorLogCode};
+    return {ServingPLMNRecord::logCode, RegistrationRecord::logCode, cellMonitorLogCode};
 }
 
 void ServingPLMN::updateWithData(const LogPacket& packet, std::uint32_t logCode)
 {
     log().warning("Serving PLMN");
     switch (logCode) {
-    case servingPLMNLogCode:
+    case ServingPLMNRecord::logCode:
         return updateFromServingPLMN(packet);
     case RegistrationRecord::logCode:
         return updateFromRegistration(packet);
@@ -82,13 +70,9 @@ void ServingPLMN::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     }
 }
 
-// Serving PLMN, 0x7135, at least 32 bytes
-//   14 u8 service type | 15 PLMN identity, 3 bytes of two decimal digits each, low nibble first:
-//   country 1, 2 | country 3, network 3 | network 1, 2
-//   18 u16 big-endian location area code | 20 u8 routing area code
 void ServingPLMN::updateFromServingPLMN(const LogPacket& packet)
 {
-    if (packet.size() < 32)
+    if (packet.size() < ServingPLMNRecord::minimumSize)
         return;
     const std::uint8_t first = packet.u8(15);
     const std::uint8_t second = packet.u8(16);
@@ -112,16 +96,12 @@ void ServingPLMN::updateFromRegistration(const LogPacket& packet)
 // Plain numbers here: no leading zeros, no blanks. Whichever record came last is shown.
 void ServingPLMN::updateFromCellMonitor(const LogPacket& packet)
 {
-    const auto cells = parseCellMonitorArray(packet, log());
-    if (!cells) {
-        log().error("Failed to get Cell Array\n");
+    const auto cells = getCellArray(packet);
+    if (!cells)
         return;
-    }
-    const auto* serving = std::ranges::find_if(*cells, [](const PlistValue& cell) {
-        return cell.dictionary() && isServingCell(*cell.dictionary());
-    });
-    if (serving != cells->end())
-        showCellFields(*serving->dictionary(), cellFields, "ServingPLMN");
+    if (const auto* serving = servingCell(*cells, {kQXCellMonitorRadioAccessTechnologyUMTS,
+                                                   kQXCellMonitorRadioAccessTechnologyGSM}))
+        showCellFields(*serving, cellFields, "ServingPLMN");
 }
 
 } // namespace ventrik

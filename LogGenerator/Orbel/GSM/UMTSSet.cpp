@@ -26,35 +26,19 @@ PlistDictionary rankedRow(const LogPacket& cell)
             {"Rank Cell RSCP", wholeDb(cell.i16(5))}};
 }
 
-bool isUMTSNeighbor(const PlistDictionary& cell)
+std::string levelDbm(std::int32_t number)
 {
-    return cellEntryIs(cell, kQXCellMonitorCellRadioAccessTechnology,
-                       kQXCellMonitorRadioAccessTechnologyUMTS) &&
-           cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeNeighbor);
+    const auto level = cellLevel(number);
+    return level ? wholeDbm(*level) : "";
 }
 
-// Levels are 16 bits wide; one of them says that the baseband has no value.
-constexpr std::int16_t noLevel = 32767;
-
-std::string levelDbm(std::int32_t value)
+std::string levelDb(std::int32_t number)
 {
-    const auto level = static_cast<std::int16_t>(value);
-    return level == noLevel ? "" : wholeDbm(level);
+    const auto level = cellLevel(number);
+    return level ? wholeDb(*level) : "";
 }
 
-std::string levelDb(std::int32_t value)
-{
-    const auto level = static_cast<std::int16_t>(value);
-    return level == noLevel ? "" : wholeDb(level);
-}
-
-struct NeighborField {
-    std::string_view cellKey;
-    std::string_view rowKey; // also the name in the log
-    std::string (*text)(std::int32_t);
-};
-
-constexpr std::array<NeighborField, 4> neighborFields{{
+constexpr std::array<CellRowField, 4> neighborFields{{
     {kQXCellMonitorUARFCN, "UARFCN", decimal},
     {kQXCellMonitorSCN, "Scrambling Code", decimal},
     {kQXCellMonitorRSCP, "RSCP", levelDbm},
@@ -101,29 +85,7 @@ void UMTSSet::updateFromRankedCells(const LogPacket& packet)
 
 void UMTSSet::updateFromCellMonitor(const LogPacket& packet)
 {
-    const auto cells = parseCellMonitorArray(packet, log());
-    clearRows(); // a record that holds no array empties the list
-    if (!cells) {
-        log().error("Failed to get Cell Array\n");
-        return;
-    }
-    PlistArray rows;
-    for (const PlistValue& cell : *cells)
-        if (cell.dictionary() && isUMTSNeighbor(*cell.dictionary()))
-            rows.append(neighborRow(*cell.dictionary()));
-    showRows(rows);
-}
-
-PlistDictionary UMTSSet::neighborRow(const PlistDictionary& cell) const
-{
-    PlistDictionary row;
-    for (const NeighborField& field : neighborFields) {
-        if (const auto number = cellNumber(cell, field.cellKey))
-            row.set(field.rowKey, field.text(*number));
-        else
-            log().error("UMTSSet: Failed to retrieve {}\n", field.rowKey);
-    }
-    return row;
+    showNeighborCells(packet, kQXCellMonitorRadioAccessTechnologyUMTS, neighborFields, "UMTSSet");
 }
 
 } // namespace ventrik

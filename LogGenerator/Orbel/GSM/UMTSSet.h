@@ -19,7 +19,6 @@ class UMTSSet : public Base
   private:
     void updateFromRankedCells(const LogPacket& packet);
     void updateFromCellMonitor(const LogPacket& packet);
-    PlistDictionary neighborRow(const PlistDictionary& cell) const;
 };
 
 } // namespace ventrik

@@ -4,7 +4,6 @@
 #include "LogGenerator/Orbel/ValueText.h"
 #include "Platform/TelephonyConstants.h"
 
-#include <algorithm>
 #include <array>
 
 namespace ventrik
@@ -35,13 +34,6 @@ std::string bandwidthLabel(std::uint8_t resourceBlocks)
     default:
         return "Unknown";
     }
-}
-
-bool isLTEServingCell(const PlistDictionary& cell)
-{
-    return cellEntryIs(cell, kQXCellMonitorCellRadioAccessTechnology,
-                       kQXCellMonitorRadioAccessTechnologyLTE) &&
-           cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeServing);
 }
 
 constexpr std::array<CellField, 5> cellFields{{
@@ -111,16 +103,11 @@ void LTEServingCellInfo::updateFromAntennaCount(const LogPacket& packet, std::ui
 
 void LTEServingCellInfo::updateFromCellMonitor(const LogPacket& packet)
 {
-    const auto cells = parseCellMonitorArray(packet, log());
-    if (!cells) {
-        log().error("Failed to get Cell Array\n");
+    const auto cells = getCellArray(packet);
+    if (!cells)
         return;
-    }
-    const auto* serving = std::ranges::find_if(*cells, [](const PlistValue& cell) {
-        return cell.dictionary() && isLTEServingCell(*cell.dictionary());
-    });
-    if (serving != cells->end())
-        showCellFields(*serving->dictionary(), cellFields, "Serving Cell Info");
+    if (const auto* serving = servingCell(*cells, {kQXCellMonitorRadioAccessTechnologyLTE}))
+        showCellFields(*serving, cellFields, "Serving Cell Info");
 }
 
 } // namespace ventrik

@@ -14,9 +14,7 @@ constexpr std::uint32_t cellInfoLogCode = 0xD0E2;
 
 bool isUTRANServingCell(const PlistDictionary& cell)
 {
-    return cellEntryIs(cell, kQXCellMonitorCellRadioAccessTechnology,
-                       kQXCellMonitorRadioAccessTechnologyUTRAN2) &&
-           cellEntryIs(cell, kQXCellMonitorCellType, kQXCellMonitorCellTypeServing);
+    return isCell(cell, kQXCellMonitorRadioAccessTechnologyUTRAN2, kQXCellMonitorCellTypeServing);
 }
 
 } // namespace

@@ -54,11 +54,15 @@ const PlistValue* TemplateFixture::only(const std::string& key)
     return entry == entries.end() ? nullptr : &entry->second;
 }
 
-void TemplateFixture::expectDictionary(const std::string& name, const Keys& keys)
+void TemplateFixture::expectDictionary(const std::string& name, const Keys& keys, const Keys& lists)
 {
     const PlistValue* container = only(name);
     ASSERT_TRUE(container && container->dictionary()) << name;
-    EXPECT_THAT(keysOf(*container->dictionary()), testing::UnorderedElementsAreArray(keys)) << name;
+    Keys all = keys;
+    all.insert(all.end(), lists.begin(), lists.end());
+    EXPECT_THAT(keysOf(*container->dictionary()), testing::UnorderedElementsAreArray(all)) << name;
+    for (const std::string& list : lists)
+        EXPECT_EQ(*container->dictionary()->find(list), PlistArray()) << name << " " << list;
     for (const std::string& key : keys)
         EXPECT_EQ(textAt(*container, {key}), "-") << name << " " << key;
 }

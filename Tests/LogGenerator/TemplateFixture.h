@@ -22,8 +22,9 @@ class TemplateFixture : public testing::Test
 
     /// The value of a key that must stand in the template once, however deep.
     const PlistValue* only(const std::string& key);
-    /// The section is a dictionary of exactly these keys, with a dash for each value.
-    void expectDictionary(const std::string& name, const Keys& keys);
+    /// The section is a dictionary of exactly these keys: a dash for each value, and an empty array
+    /// for each list.
+    void expectDictionary(const std::string& name, const Keys& keys, const Keys& lists = {});
     void expectEmptyArray(const std::string& name);
 
     PlistDictionary root;

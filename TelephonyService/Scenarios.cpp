@@ -1,6 +1,7 @@
 #include "TelephonyService/Scenarios.h"
 
 #include "Platform/TelephonyConstants.h"
+#include "TelephonyService/GSMScenario.h"
 #include "TelephonyService/LTEScenario.h"
 #include "TelephonyService/UTRANScenario.h"
 
@@ -9,6 +10,8 @@ namespace ventrik
 
 std::unique_ptr<MessageSource> makeScenario(const CaptureTechnology& technology, std::uint32_t seed)
 {
+    if (technology.identifier == kQXLogChannelTechnology_Orbel_GSM)
+        return std::make_unique<GSMScenario>(seed);
     if (technology.identifier == kQXLogChannelTechnology_Orbel_LTE)
         return std::make_unique<LTEScenario>(seed);
     if (technology.identifier == kQXLogChannelTechnology_Orbel_UTRAN2)

@@ -1,6 +1,7 @@
 #include "TelephonyService/UTRANWalk.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 
 namespace ventrik
@@ -47,12 +48,6 @@ constexpr std::array<Phase, 8> phases{{
     {RRCState::connecting, 12},
 }};
 
-double pathLoss(double distance)
-{
-    const double withHeight = std::hypot(distance, 30.0);
-    return 38.0 * std::log10(withHeight / 30.0);
-}
-
 } // namespace
 
 UTRANWalk::UTRANWalk(std::uint32_t seed) : _random(seed)
@@ -87,12 +82,9 @@ RRCState UTRANWalk::state() const
 
 void UTRANWalk::fade()
 {
-    for (double& shadowing : _shadowing)
-        shadowing = 0.99 * shadowing + _random.uniform(-0.4, 0.4);
-    for (double& shadowing : _gsmShadowing)
-        shadowing = 0.99 * shadowing + _random.uniform(-0.4, 0.4);
-    for (double& noise : _slotNoise)
-        noise = 0.8 * noise + _random.uniform(-1.0, 1.0);
+    _shadowing.step(_random);
+    _gsmShadowing.step(_random);
+    _slotNoise.step(_random);
 }
 
 bool UTRANWalk::changeState()
@@ -117,13 +109,13 @@ bool UTRANWalk::reselect()
 double UTRANWalk::rscp(const UTRANCell& cell) const
 {
     const auto index = static_cast<std::size_t>(&cell - streetCells.data());
-    return -58.0 - pathLoss(_position - cell.position) + _shadowing.at(index);
+    return -58.0 - pathLoss(_position - cell.position) + _shadowing.level(index);
 }
 
 double UTRANWalk::rssi(const GSMCell& cell) const
 {
     const auto index = static_cast<std::size_t>(&cell - streetGsmCells.data());
-    return -55.0 - pathLoss(_position - cell.position) + _gsmShadowing.at(index);
+    return -55.0 - pathLoss(_position - cell.position) + _gsmShadowing.level(index);
 }
 
 double UTRANWalk::signalToInterference(unsigned slot) const
@@ -135,7 +127,7 @@ double UTRANWalk::signalToInterference(unsigned slot) const
         if (&other != &servingCell() && other.uarfcn == servingCell().uarfcn)
             interference += std::pow(10.0, rscp(other) / 10.0);
     return rscp(servingCell()) - 10.0 * std::log10(interference) + spreadingGain +
-           _slotNoise.at(slot % slotCount);
+           _slotNoise.level(slot % slotCount);
 }
 
 double UTRANWalk::blockErrorRate(unsigned channel) const

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "TelephonyService/Propagation.h"
 #include "TelephonyService/ScenarioRandom.h"
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <span>
@@ -73,9 +73,9 @@ class UTRANWalk
     std::size_t _phase = 0;
     int _stepsInPhase = 0;
     std::size_t _serving = 0;
-    std::array<double, cellCount> _shadowing{};       ///< dB
-    std::array<double, gsmCellCount> _gsmShadowing{}; ///< dB
-    std::array<double, slotCount> _slotNoise{};       ///< dB
+    Fading _shadowing{cellCount, 0.99, 0.4};
+    Fading _gsmShadowing{gsmCellCount, 0.99, 0.4};
+    Fading _slotNoise{slotCount, 0.8, 1.0};
 };
 
 } // namespace ventrik

@@ -19,6 +19,7 @@ std::set<std::uint32_t> codesOfScenario(std::string_view technology)
 
 TEST(Scenarios, EachTechnologyGetsItsOwn)
 {
+    EXPECT_TRUE(codesOfScenario("gsm").contains(0x417A));
     EXPECT_TRUE(codesOfScenario("lte").contains(0xB17F));
     EXPECT_TRUE(codesOfScenario("utran").contains(0xD00A));
 }

@@ -1,5 +1,6 @@
 #include "Tests/Process/HeadlessViewer.h"
 
+#include "Model/TreePrinter.h"
 #include "Tests/Process/Program.h"
 
 namespace ventrik
@@ -38,6 +39,13 @@ std::string HeadlessViewer::shown(const std::string& path)
 {
     const auto node = _redraws > 0 ? _model.nodeAtPath(path) : nullptr;
     return node && node->value() ? *node->value() : std::string();
+}
+
+std::string HeadlessViewer::tree()
+{
+    refreshNow();
+    const auto root = _redraws > 0 ? _model.nodeAtPath("/") : nullptr;
+    return root ? printTree(*root) : std::string();
 }
 
 bool HeadlessViewer::comesToShow(const std::string& path, const std::string& value)

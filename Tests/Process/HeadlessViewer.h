@@ -49,6 +49,8 @@ class HeadlessViewer
     int redraws() const { return _redraws; }
     /// The value at a path of the tree that was shown last; empty when there is none.
     std::string shown(const std::string& path);
+    /// The whole tree as text, as it is at the next refresh; empty while there is none.
+    std::string tree();
     /// Has that value by the next refresh.
     bool comesToShow(const std::string& path, const std::string& value);
     /// Has a value that came from the service by the next refresh.

@@ -1,0 +1,60 @@
+#include "Tests/Process/HeadlessViewer.h"
+#include "Tests/Process/ProcessFixture.h"
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+struct Journey {
+    const char* technology;
+    int messages; // a whole round of the scenario and more
+};
+
+void PrintTo(const Journey& journey, std::ostream* stream)
+{
+    *stream << journey.technology;
+}
+
+// A technology's scenario on its way from the service through the sockets into the viewer's tree.
+class ScenarioProcess : public ProcessFixture, public testing::WithParamInterface<Journey>
+{
+  protected:
+    /// A scenario's messages, to be sent without their pauses.
+    std::string makeCapture() const
+    {
+        std::string file = path("scenario.pcap");
+        const auto writing =
+            start("ventrik-telephony", {"--technology", GetParam().technology, "--write", file,
+                                        "--count", std::to_string(GetParam().messages)});
+        EXPECT_EQ(writing->waitForEnd(), 0) << writing->errors();
+        return file;
+    }
+    static std::string goldenTree()
+    {
+        return readFile(fmt::format("{}/{}-scenario.txt", VENTRIK_GOLDEN, GetParam().technology));
+    }
+};
+
+} // namespace
+
+TEST_P(ScenarioProcess, EndsInTheTreeThatItsLastRecordsTell)
+{
+    const std::string golden = goldenTree();
+    ASSERT_FALSE(golden.empty());
+    const auto service = startService({"--replay", makeCapture(), "--speed", "max"});
+    HeadlessViewer viewer(runtimeDirectory());
+    viewer.start();
+    EXPECT_TRUE(waitUntil([&] { return viewer.tree() == golden; }));
+    EXPECT_EQ(viewer.tree(), golden);
+}
+
+INSTANTIATE_TEST_SUITE_P(Technologies, ScenarioProcess,
+                         testing::Values(Journey{"lte", 1000}, Journey{"gsm", 1300},
+                                         Journey{"utran", 1700}),
+                         testing::PrintToStringParamName());
+
+} // namespace ventrik

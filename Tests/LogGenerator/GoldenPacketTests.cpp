@@ -1,0 +1,127 @@
+#include "Capture/CaptureTechnology.h"
+#include "Tests/LogGenerator/GeneratorFixture.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+
+namespace ventrik
+{
+
+namespace
+{
+
+const std::filesystem::path goldenDirectory = VENTRIK_GOLDEN;
+const std::filesystem::path resourceDirectory = VENTRIK_RESOURCES;
+
+// Packets in hexadecimal, with an empty line between one and the next.
+std::vector<Bytes> readPackets(const std::filesystem::path& file)
+{
+    std::vector<Bytes> packets(1);
+    std::ifstream input(file);
+    for (std::string line; std::getline(input, line);) {
+        if (line.empty())
+            packets.emplace_back();
+        std::istringstream bytes(line);
+        for (std::string byte; bytes >> byte;)
+            packets.back().push_back(static_cast<std::uint8_t>(std::stoi(byte, nullptr, 16)));
+    }
+    return packets;
+}
+
+std::vector<std::string> readLines(const std::filesystem::path& file)
+{
+    std::vector<std::string> lines;
+    std::ifstream input(file);
+    for (std::string line; std::getline(input, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+// "path: value" for each text below the value that a section has written.
+void collectTexts(const PlistValue& value, const std::string& path, std::vector<std::string>& texts)
+{
+    const auto below = [&](std::string_view name) {
+        return path.empty() ? std::string(name) : fmt::format("{}/{}", path, name);
+    };
+    if (value.string() && *value.string() != "-") {
+        texts.push_back(fmt::format("{}: {}", path, *value.string()));
+    } else if (value.dictionary()) {
+        for (const auto& [key, entry] : *value.dictionary()) {
+            if (key != "_sorted")
+                collectTexts(entry, below(key), texts);
+        }
+    } else if (value.array()) {
+        for (std::size_t i = 0; i < value.array()->size(); ++i)
+            collectTexts((*value.array())[i], below(std::to_string(i)), texts);
+    }
+}
+
+std::vector<std::string> goldenNames()
+{
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(goldenDirectory))
+        if (entry.path().extension() == ".hex")
+            names.push_back(entry.path().stem().string());
+    std::ranges::sort(names);
+    return names;
+}
+
+std::string testName(const testing::TestParamInfo<std::string>& info)
+{
+    std::string name = info.param;
+    std::ranges::replace(name, '-', '_');
+    return name;
+}
+
+// A record as it was received, named for its technology and its kind, and what it shows.
+class GoldenPacketTest : public GeneratorFixture, public testing::WithParamInterface<std::string>
+{
+  protected:
+    void SetUp() override
+    {
+        for (const auto& entry : std::filesystem::directory_iterator(resourceDirectory)) {
+            if (entry.path().extension() != ".plist")
+                continue;
+            std::ifstream file(entry.path(), std::ios::binary);
+            platform.resources.add(fmt::format("/{}", entry.path().filename().string()),
+                                   Bytes{std::istreambuf_iterator<char>(file), {}});
+        }
+        packets = readPackets(goldenDirectory / (GetParam() + ".hex"));
+    }
+    std::unique_ptr<LogGenerator> makeGenerator()
+    {
+        const auto technology = technologyNamed(GetParam().substr(0, GetParam().find('-')));
+        return LogGenerator::generatorFromTechnology(technology->identifier, services());
+    }
+
+    std::vector<Bytes> packets;
+};
+
+} // namespace
+
+TEST_P(GoldenPacketTest, ShowsItsValues)
+{
+    const auto generator = makeGenerator();
+    for (const Bytes& packet : packets)
+        generator->updateState(state, packet);
+    std::vector<std::string> texts;
+    collectTexts(*state.find("Display"), "", texts);
+    std::ranges::sort(texts);
+    EXPECT_EQ(texts, readLines(goldenDirectory / (GetParam() + ".txt")));
+}
+
+// The sanitizers watch over what is read.
+TEST_P(GoldenPacketTest, CutShortAnywhereIsHarmless)
+{
+    const auto generator = makeGenerator();
+    for (const Bytes& packet : packets)
+        for (std::size_t size = 0; size < packet.size(); ++size)
+            generator->updateState(state, Bytes(packet.begin(), packet.begin() + size));
+    EXPECT_TRUE(state.find("Display")->dictionary());
+}
+
+INSTANTIATE_TEST_SUITE_P(Records, GoldenPacketTest, testing::ValuesIn(goldenNames()), testName);
+
+} // namespace ventrik

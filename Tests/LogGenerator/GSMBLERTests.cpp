@@ -1,4 +1,5 @@
 #include "LogGenerator/Orbel/GSM/BLER.h"
+#include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -25,15 +26,7 @@ class BLERTest : public SectionFixture<BLER>
     }
 };
 
-struct FieldRow {
-    std::size_t offset; // in the element
-    unsigned width;
-    std::uint32_t raw;
-    std::string_view key;
-    std::string_view text;
-};
-
-constexpr FieldRow fieldRows[] = {
+constexpr ElementField fields[] = {
     {0, 8, 31, "Transport Channel ID", "31"},
     {0, 8, 255, "Transport Channel ID", "255"},
     {1, 32, 70000, "CRC Received", "70000"},
@@ -53,13 +46,11 @@ TEST_F(BLERTest, NamesItselfAndItsCode)
 
 TEST_F(BLERTest, EachFieldIsReadFromItsBytesAlone)
 {
-    for (const FieldRow& row : fieldRows)
-        for (const std::uint8_t around : {std::uint8_t{0}, std::uint8_t{0xFF}}) {
-            feed(blockErrors(2)
-                     .bytes(16, Bytes(18, around))
-                     .bits(25 + row.offset, 0, row.width, row.raw));
-            EXPECT_EQ(shownOf(1, row.key), row.text) << row.key << " raw " << row.raw;
-        }
+    expectElementFields(fields, blockErrors(2), 25, 9,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shownOf(1, key);
+                        });
 }
 
 TEST_F(BLERTest, ShowsItsKeysInOrder)

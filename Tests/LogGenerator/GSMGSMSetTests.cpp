@@ -1,4 +1,5 @@
 #include "LogGenerator/Orbel/GSM/GSMSet.h"
+#include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -18,15 +19,7 @@ PacketBuilder rankedCells(std::uint8_t g)
     return PacketBuilder(0x4005).u8(14, g).size(15 + std::size_t{7} * g);
 }
 
-struct FieldRow {
-    std::size_t offset; // in the element
-    unsigned width;
-    std::uint32_t raw;
-    std::string_view key;
-    std::string_view text;
-};
-
-constexpr FieldRow fieldRows[] = {
+constexpr ElementField fields[] = {
     {0, 16, 975, "ARFCN", "975"},
     {0, 16, 65535, "ARFCN", "65535"},
     {2, 16, 63, "BSIC", "63"},
@@ -45,21 +38,13 @@ TEST_F(GSMSetTest, NamesItselfAndItsCode)
     EXPECT_THAT(section.getLogCodeArray(), ElementsAre(0x4005));
 }
 
-TEST_F(GSMSetTest, EachFieldIsReadFromItsBytesAndFormatted)
+TEST_F(GSMSetTest, EachFieldIsReadFromItsBytesAlone)
 {
-    for (const FieldRow& row : fieldRows) {
-        feed(rankedCells(2).bits(22 + row.offset, 0, row.width, row.raw));
-        EXPECT_EQ(shown(1, row.key), row.text) << row.key << " raw " << row.raw;
-    }
-}
-
-TEST_F(GSMSetTest, NoFieldIsTouchedByTheBytesAroundIt)
-{
-    for (const FieldRow& row : fieldRows) {
-        PacketBuilder packet = rankedCells(1).bytes(15, Bytes(7, 0xFF));
-        feed(packet.bits(15 + row.offset, 0, row.width, row.raw));
-        EXPECT_EQ(shown(0, row.key), row.text) << row.key << " raw " << row.raw;
-    }
+    expectElementFields(fields, rankedCells(2), 22, 7,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shown(1, key);
+                        });
 }
 
 TEST_F(GSMSetTest, RowsHaveTheirKeysInOrder)

@@ -1,4 +1,5 @@
 #include "LogGenerator/Orbel/GSM/HSDPAInformation.h"
+#include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -30,15 +31,7 @@ class HSDPAInformationTest : public SectionFixture<HSDPAInformation>
     }
 };
 
-struct FieldRow {
-    std::size_t offset; // in the element
-    unsigned width;
-    std::uint32_t raw;
-    std::string_view key;
-    std::string_view text;
-};
-
-constexpr FieldRow fieldRows[] = {
+constexpr ElementField fields[] = {
     {0, 8, 7, "Process ID", "7"},
     {0, 8, 255, "Process ID", "255"},
     {1, 32, 70000, "No Rx Bits", "70000"},
@@ -84,18 +77,23 @@ TEST_F(HSDPAInformationTest, SubFramesHaveTenBitsAndTheCarrierTheNextTwo)
     EXPECT_EQ(shown("Carrier Info"), "Single Carrier");
 }
 
-TEST_F(HSDPAInformationTest, EachFieldOfAProcessIsReadFromItsBytesAlone)
+TEST_F(HSDPAInformationTest, EachFieldOfAPrimaryProcessIsReadFromItsBytesAlone)
 {
-    for (const FieldRow& row : fieldRows)
-        for (const std::uint8_t around : {std::uint8_t{0}, std::uint8_t{0xFF}}) {
-            // The second primary process at 27, the second secondary one at 18 + 2 * 162 + 9.
-            feed(hsdpa(2, 2)
-                     .bytes(18, Bytes(342, around))
-                     .bits(27 + row.offset, 0, row.width, row.raw)
-                     .bits(351 + row.offset, 0, row.width, row.raw));
-            EXPECT_EQ(shownOf(primary, 1, row.key), row.text) << row.key << " raw " << row.raw;
-            EXPECT_EQ(shownOf(secondary, 1, row.key), row.text) << row.key << " raw " << row.raw;
-        }
+    expectElementFields(fields, hsdpa(2, 0), 27, 9,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shownOf(primary, 1, key);
+                        });
+}
+
+TEST_F(HSDPAInformationTest, EachFieldOfASecondaryProcessIsReadFromItsBytesAlone)
+{
+    constexpr std::size_t second = 18 + 2 * 162 + 9;
+    expectElementFields(fields, hsdpa(2, 2), second, 9,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shownOf(secondary, 1, key);
+                        });
 }
 
 TEST_F(HSDPAInformationTest, ProcessesHaveTheirKeysInOrder)

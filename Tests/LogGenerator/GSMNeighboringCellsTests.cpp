@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/GSM/NeighboringCells.h"
 #include "Tests/LogGenerator/CellEntry.h"
+#include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -54,15 +55,7 @@ class NeighboringCellsTest : public ListSectionFixture<NeighboringCells>
     void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
 };
 
-struct FieldRow {
-    std::size_t offset; // in the element
-    unsigned width;
-    std::uint32_t raw;
-    std::string_view key;
-    std::string_view text;
-};
-
-constexpr FieldRow fieldRows[] = {
+constexpr ElementField fields[] = {
     {0, 16, 975, "ARFCN", "975"},
     {0, 16, 65535, "ARFCN", "65535"},
     {2, 8, 0, "RSSI", "0"},
@@ -84,13 +77,11 @@ TEST_F(NeighboringCellsTest, NamesItselfAndItsCodes)
 
 TEST_F(NeighboringCellsTest, EachFieldIsReadFromItsBytesAlone)
 {
-    for (const FieldRow& row : fieldRows)
-        for (const std::uint8_t around : {std::uint8_t{0}, std::uint8_t{0xFF}}) {
-            feed(measurements(2)
-                     .bytes(29, Bytes(28, around))
-                     .bits(43 + row.offset, 0, row.width, row.raw));
-            EXPECT_EQ(shown(1, row.key), row.text) << row.key << " raw " << row.raw;
-        }
+    expectElementFields(fields, measurements(2), 43, 14,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shown(1, key);
+                        });
 }
 
 TEST_F(NeighboringCellsTest, RowsHaveTheirKeysInOrder)
@@ -255,32 +246,6 @@ TEST_F(NeighboringCellsTest, CellMonitorDoesNotAskTheBSICList)
     feed(bsicList({{40, 7}}));
     monitor({neighbor(40, -50)});
     EXPECT_EQ(shown(0, "BSIC"), "(none)");
-}
-
-TEST_F(NeighboringCellsTest, CellMonitorWithoutNeighborsEmptiesTheList)
-{
-    for (const PlistArray& cells :
-         {PlistArray{}, PlistArray{cellEntry(kQXCellMonitorRadioAccessTechnologyGSM,
-                                             kQXCellMonitorCellTypeServing)}}) {
-        rows.append("row");
-        monitor(cells);
-        EXPECT_TRUE(rows.empty());
-    }
-    EXPECT_TRUE(log.texts(3).empty());
-}
-
-TEST_F(NeighboringCellsTest, CellMonitorThatDoesNotParseEmptiesTheList)
-{
-    const Line trace{4, "NeighboringCells"};
-    const Line unparsed{3, "Cell Info Array data could not be constructed"};
-    const Line noArray{3, "Failed to get Cell Array\n"};
-    rows.append("row");
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    EXPECT_TRUE(rows.empty());
-    rows.append("row");
-    feed(propertyListPacket(cellMonitorLogCode, neighbor(1, -50))); // no array
-    EXPECT_TRUE(rows.empty());
-    EXPECT_THAT(log.lines(), ElementsAre(trace, unparsed, noArray, trace, unparsed, noArray));
 }
 
 TEST_F(NeighboringCellsTest, TheRecordThatCameLastIsShown)

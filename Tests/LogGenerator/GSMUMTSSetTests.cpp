@@ -2,6 +2,7 @@
 #include "LogGenerator/Orbel/GSM/UMTSSet.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/CellEntry.h"
+#include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -19,15 +20,7 @@ PacketBuilder rankedCells(std::uint8_t u)
     return PacketBuilder(0x4005).u8(13, u).size(15 + std::size_t{10} * u);
 }
 
-struct FieldRow {
-    std::size_t offset; // in the element
-    unsigned width;
-    std::uint32_t raw;
-    std::string_view key;
-    std::string_view text;
-};
-
-constexpr FieldRow fieldRows[] = {
+constexpr ElementField fields[] = {
     {2, 16, 0, "Scrambling Code", "0"},
     {2, 16, 511, "Scrambling Code", "511"},
     {2, 16, 65535, "Scrambling Code", "65535"},
@@ -76,21 +69,13 @@ TEST_F(UMTSSetTest, NamesItselfAndItsCodes)
     EXPECT_THAT(section.getLogCodeArray(), ElementsAre(0x4005, 0xFF0001));
 }
 
-TEST_F(UMTSSetTest, EachFieldIsReadFromItsBytesAndFormatted)
+TEST_F(UMTSSetTest, EachFieldIsReadFromItsBytesAlone)
 {
-    for (const FieldRow& row : fieldRows) {
-        feed(rankedCells(2).bits(25 + row.offset, 0, row.width, row.raw));
-        EXPECT_EQ(shown(1, row.key), row.text) << row.key << " raw " << row.raw;
-    }
-}
-
-TEST_F(UMTSSetTest, NoFieldIsTouchedByTheBytesAroundIt)
-{
-    for (const FieldRow& row : fieldRows) {
-        PacketBuilder packet = rankedCells(1).bytes(15, Bytes(10, 0xFF));
-        feed(packet.bits(15 + row.offset, 0, row.width, row.raw));
-        EXPECT_EQ(shown(0, row.key), row.text) << row.key << " raw " << row.raw;
-    }
+    expectElementFields(fields, rankedCells(2), 25, 10,
+                        [this](const PacketBuilder& packet, std::string_view key) {
+                            feed(packet);
+                            return shown(1, key);
+                        });
 }
 
 TEST_F(UMTSSetTest, RankedRowsHaveTheirKeysInOrder)
@@ -225,31 +210,6 @@ TEST_F(UMTSSetTest, CellMonitorReportsEachMissingNumberAndKeepsTheRow)
                                           "UMTSSet: Failed to retrieve Energy Per Chip\n",
                                           "UMTSSet: Failed to retrieve UARFCN\n",
                                           "UMTSSet: Failed to retrieve RSCP\n"));
-}
-
-TEST_F(UMTSSetTest, CellMonitorWithoutNeighborsEmptiesTheList)
-{
-    rows.append("row");
-    monitor({});
-    EXPECT_TRUE(rows.empty());
-    rows.append("row");
-    monitor({cellEntry(kQXCellMonitorRadioAccessTechnologyUMTS, kQXCellMonitorCellTypeServing)});
-    EXPECT_TRUE(rows.empty());
-    EXPECT_TRUE(log.texts(3).empty());
-}
-
-TEST_F(UMTSSetTest, CellMonitorThatDoesNotParseEmptiesTheList)
-{
-    const Line trace{4, "UMTSSet"};
-    const Line unparsed{3, "Cell Info Array data could not be constructed"};
-    const Line noArray{3, "Failed to get Cell Array\n"};
-    rows.append("row");
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    EXPECT_TRUE(rows.empty());
-    rows.append("row");
-    feed(propertyListPacket(cellMonitorLogCode, neighbor(1))); // no array
-    EXPECT_TRUE(rows.empty());
-    EXPECT_THAT(log.lines(), ElementsAre(trace, unparsed, noArray, trace, unparsed, noArray));
 }
 
 TEST_F(UMTSSetTest, TheRecordThatCameLastIsShown)

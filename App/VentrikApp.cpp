@@ -14,8 +14,6 @@ namespace
 
 constexpr const char* saveButtonMarker =
     "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
-// The button comes with the screen that it opens.
-constexpr bool hasSaveScreen = false;
 
 constexpr std::string_view homeScreenDomain = "org.ventrik.HomeScreen";
 constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
@@ -46,7 +44,7 @@ VentrikApp::~VentrikApp() = default;
 
 void VentrikApp::getSaveButtonPref()
 {
-    setAllowSaveButton(hasSaveScreen && (_options.saveButton || exists(saveButtonMarker)));
+    setAllowSaveButton(_options.saveButton || exists(saveButtonMarker));
 }
 
 void VentrikApp::applicationDidFinishLaunching()
@@ -109,6 +107,7 @@ void VentrikApp::applicationWillTerminate()
     _setGSMRSSI(false);
     setUpdateMessage(std::nullopt);
     _dateFormatter.reset();
+    setSaveViewController(nullptr);
     _window->hide();
     _navController = nullptr;
     _window.reset();
@@ -122,9 +121,22 @@ void VentrikApp::_setGSMRSSI(bool value)
     _platform.preferences.postChanged(homeScreenDomain, showGSMRSSIKey);
 }
 
-void VentrikApp::showSaveView() {}
+void VentrikApp::showSaveView()
+{
+    if (_saveViewController)
+        return;
+    setSaveViewController(VentrikSaveViewController::initWithSaveHistory(
+        *this, _platform, _options.snapshotDirectory, _model->getSaveContents()));
+    _navController->present(*_saveViewController, true);
+}
 
-void VentrikApp::closeSaveView() {}
+void VentrikApp::closeSaveView()
+{
+    if (!_saveViewController)
+        return;
+    _navController->dismiss(true);
+    setSaveViewController(nullptr);
+}
 
 void VentrikApp::updateStatusForViewController(VentrikPaneController& pane)
 {

@@ -3,6 +3,7 @@
 #include "App/DateFormatter.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "App/VentrikPaneController.h"
+#include "App/VentrikSaveViewController.h"
 #include "Model/VentrikModel.h"
 #include "Platform/Platform.h"
 
@@ -18,7 +19,7 @@ namespace ventrik
 
 struct VentrikAppOptions {
     bool saveButton = false;       ///< offers Save also where the marker path is missing
-    std::string snapshotDirectory; ///< where Save writes; empty: the default directory
+    std::string snapshotDirectory; ///< where Save writes
     bool animation = true;
     std::optional<QSize> windowSize; ///< none: as large as the main screen
 };
@@ -26,7 +27,7 @@ struct VentrikAppOptions {
 /// The application: builds the window, the model and the root pane, brings the panes up to date
 /// after each refresh, and undoes its one system setting at the end. Everything runs on the main
 /// queue; a QApplication exists for as long as this does.
-class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost
+class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, public VentrikSaveHost
 {
   public:
     VentrikApp(const Platform& platform, VentrikAppOptions options);
@@ -41,7 +42,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost
     void _setGSMRSSI(bool value);
 
     void showSaveView() override;
-    void closeSaveView();
+    void closeSaveView() override;
 
     void updateStatusForViewController(VentrikPaneController& pane);
     void updateViewControllerFromModel();
@@ -51,6 +52,12 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost
     QWidget* window() const { return _window.get(); }
     NavigationStack* navController() const { return _navController; }
 
+    /// The save screen while it is open, else null.
+    VentrikSaveViewController* saveViewController() const { return _saveViewController.get(); }
+    void setSaveViewController(std::unique_ptr<VentrikSaveViewController> screen)
+    {
+        _saveViewController = std::move(screen);
+    }
     const std::optional<std::string>& updateMessage() const { return _updateMessage; }
     void setUpdateMessage(std::optional<std::string> message)
     {
@@ -73,6 +80,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost
 
     std::unique_ptr<QWidget> _window;
     NavigationStack* _navController = nullptr;
+    std::unique_ptr<VentrikSaveViewController> _saveViewController;
     std::shared_ptr<VentrikModel> _model;
     bool _allowSaveButton = false;
     std::unique_ptr<DateFormatter> _dateFormatter;

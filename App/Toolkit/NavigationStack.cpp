@@ -12,13 +12,16 @@ namespace ventrik
 
 NavigationStack::NavigationStack(std::unique_ptr<Screen> root, QWidget* parent)
     : QWidget(parent),
-      _titleBar(new TitleBar(this)),
-      _screenArea(new QWidget(this)),
+      _layout(new QStackedLayout(this)),
+      _bars(new QWidget(this)),
+      _titleBar(new TitleBar(_bars)),
+      _screenArea(new QWidget(_bars)),
       _screenLayout(new QStackedLayout(_screenArea)),
-      _toolbarArea(new QWidget(this)),
+      _toolbarArea(new QWidget(_bars)),
       _toolbarLayout(new QStackedLayout(_toolbarArea))
 {
-    auto* layout = new QVBoxLayout(this);
+    _layout->addWidget(_bars);
+    auto* layout = new QVBoxLayout(_bars);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
     layout->addWidget(_titleBar);
@@ -106,8 +109,58 @@ void NavigationStack::showTop()
 {
     _screenLayout->setCurrentWidget(&topScreen());
     _toolbarLayout->setCurrentWidget(&topScreen().toolbar());
-    topScreen().setFocus();
+    focusTop();
     updateTitleBar();
+}
+
+// A change below a presented screen leaves the keyboard where it is.
+void NavigationStack::focusTop()
+{
+    if (!_presented)
+        topScreen().setFocus();
+}
+
+void NavigationStack::present(Screen& screen, bool animated)
+{
+    dismiss(false);
+    const bool moves = animated && canAnimate();
+    const QPixmap before = moves ? grab() : QPixmap();
+    _presented = &screen;
+    screen._stack = this;
+    _layout->addWidget(&screen);
+    screen.viewWillAppear(animated);
+    _layout->setCurrentWidget(&screen);
+    screen.setFocus();
+    if (moves)
+        cover(Transition::Kind::Rise, before);
+}
+
+void NavigationStack::dismiss(bool animated)
+{
+    if (!_presented)
+        return;
+    const bool moves = animated && canAnimate();
+    const QPixmap before = moves ? grab() : QPixmap();
+    _presented->viewWillDisappear(animated);
+    uncover(*_presented);
+    focusTop();
+    if (moves)
+        cover(Transition::Kind::Sink, before);
+}
+
+void NavigationStack::uncover(Screen& presented)
+{
+    _presented = nullptr;
+    presented._stack = nullptr;
+    _layout->setCurrentWidget(_bars);
+    _layout->removeWidget(&presented);
+    presented.setParent(nullptr);
+}
+
+void NavigationStack::cover(Transition::Kind kind, const QPixmap& before)
+{
+    delete _presentTransition;
+    _presentTransition = new Transition(kind, *this, before, _layout->currentWidget()->grab());
 }
 
 void NavigationStack::updateTitleBar()
@@ -135,7 +188,7 @@ void NavigationStack::showEvent(QShowEvent*)
     if (std::exchange(_hasAppeared, true))
         return;
     topScreen().viewWillAppear(false);
-    topScreen().setFocus();
+    focusTop();
 }
 
 void NavigationStack::keyPressEvent(QKeyEvent* event)
@@ -144,7 +197,7 @@ void NavigationStack::keyPressEvent(QKeyEvent* event)
         event->key() == Qt::Key_Escape || event->key() == Qt::Key_Backspace ||
         event->key() == Qt::Key_Back ||
         (event->key() == Qt::Key_Left && event->modifiers().testFlag(Qt::AltModifier));
-    if (goesBack)
+    if (goesBack && !_presented)
         pop(true);
     else
         QWidget::keyPressEvent(event);

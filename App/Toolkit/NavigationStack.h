@@ -28,6 +28,9 @@ class NavigationStackDelegate
 /// Screens on top of each other, of which the top one is seen, between a title bar with the way
 /// back and the top screen's tool bar. The way back is also on Escape, Backspace and Alt+Left.
 ///
+/// One more screen can be presented over all of that, bars included; until it is dismissed the
+/// stack below is out of reach of touch and keys.
+///
 /// The stack changes at once; an animation only covers the change with moving pictures.
 class NavigationStack : public QWidget
 {
@@ -53,6 +56,13 @@ class NavigationStack : public QWidget
     const std::vector<Screen*>& screens() const { return _screens; }
     Screen& topScreen() const { return *_screens.back(); }
 
+    /// Shows a screen over the stack; the caller keeps it. It replaces one that is presented.
+    void present(Screen& screen, bool animated);
+    /// Takes the presented screen away again and leaves it to its owner.
+    void dismiss(bool animated);
+    /// Null while none is presented.
+    Screen* presentedScreen() const { return _presented; }
+
     void setToolbarHidden(bool hidden);
     bool isToolbarHidden() const { return _toolbarArea->isHidden(); }
     TitleBar& titleBar() const { return *_titleBar; }
@@ -66,12 +76,18 @@ class NavigationStack : public QWidget
     void release(Screen& screen);
     void replace(Screen& leaving, Transition::Kind kind, bool animated);
     void showTop();
+    void uncover(Screen& presented);
+    void cover(Transition::Kind kind, const QPixmap& before);
+    void focusTop();
     void updateTitleBar();
 
     NavigationStackDelegate* _delegate = nullptr;
     bool _animationEnabled = true;
     bool _hasAppeared = false;
     std::vector<Screen*> _screens;
+    QPointer<Screen> _presented;
+    QStackedLayout* _layout; // of the stack with its bars, and of what is presented
+    QWidget* _bars;
     TitleBar* _titleBar;
     QWidget* _screenArea;
     QStackedLayout* _screenLayout;
@@ -79,6 +95,7 @@ class NavigationStack : public QWidget
     QStackedLayout* _toolbarLayout;
     QPointer<Transition> _transition;
     QPointer<Transition> _toolbarTransition;
+    QPointer<Transition> _presentTransition;
 };
 
 } // namespace ventrik

@@ -1,7 +1,9 @@
 #include "App/Toolkit/TableRow.h"
 
+#include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/Separator.h"
 
+#include <QLabel>
 #include <QPainter>
 
 namespace ventrik
@@ -12,6 +14,8 @@ namespace
 
 constexpr int accessoryWidth = 34;
 constexpr int rightMargin = 10; // where there is no accessory
+constexpr int textInset = 10;
+constexpr int textPoints = 15;
 constexpr int separatorInset = 10;
 
 } // namespace
@@ -22,8 +26,26 @@ TableRow::TableRow(Style style, QString reuseIdentifier)
     setBackgroundRole(QPalette::Base);
 }
 
+QLabel& TableRow::textLabel()
+{
+    if (!_textLabel) {
+        _textLabel = makeLabel(systemFont(textPoints, FontWeight::Regular), _contentArea);
+        _textLabel->setAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+        layoutSubviews();
+    }
+    return *_textLabel;
+}
+
+void TableRow::setText(const QString& text)
+{
+    textLabel().setText(text);
+    setAccessibleName(text);
+}
+
 void TableRow::setAccessory(TableRowAccessory accessory)
 {
+    if (_accessory == accessory)
+        return;
     _accessory = accessory;
     layoutSubviews();
     update();
@@ -31,6 +53,8 @@ void TableRow::setAccessory(TableRowAccessory accessory)
 
 void TableRow::setSelected(bool selected)
 {
+    if (_isSelected == selected)
+        return;
     _isSelected = selected;
     // The labels take their text colour from the background's role.
     setBackgroundRole(selected ? QPalette::Highlight : QPalette::Base);
@@ -39,6 +63,8 @@ void TableRow::setSelected(bool selected)
 
 void TableRow::setKeyboardFrame(bool visible)
 {
+    if (_hasKeyboardFrame == visible)
+        return;
     _hasKeyboardFrame = visible;
     update();
 }
@@ -47,6 +73,8 @@ void TableRow::layoutSubviews()
 {
     const int taken = _accessory == TableRowAccessory::None ? rightMargin : accessoryWidth;
     _contentArea->setGeometry(0, 0, width() - taken, height());
+    if (_textLabel)
+        _textLabel->setGeometry(_contentArea->rect().adjusted(textInset, 0, 0, 0));
 }
 
 void TableRow::resizeEvent(QResizeEvent*)

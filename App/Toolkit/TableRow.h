@@ -3,13 +3,16 @@
 #include <QString>
 #include <QWidget>
 
+class QLabel;
+
 namespace ventrik
 {
 
 /// What a row shows at its right edge.
 enum class TableRowAccessory { None, DisclosureIndicator, CheckMark };
 
-/// A row of a table: a content area for its subclass, an accessory, and its selected look.
+/// A row of a table: a content area for a text or for what a subclass puts there, an accessory, and
+/// its selected look.
 class TableRow : public QWidget
 {
   public:
@@ -20,6 +23,10 @@ class TableRow : public QWidget
 
     Style style() const { return _style; }
     const QString& reuseIdentifier() const { return _reuseIdentifier; }
+
+    /// A line of text in the content area; there is none until it is asked for.
+    QLabel& textLabel();
+    void setText(const QString& text);
 
     /// The part of the row that the accessory leaves.
     QWidget& contentArea() const { return *_contentArea; }
@@ -45,6 +52,7 @@ class TableRow : public QWidget
     Style _style;
     QString _reuseIdentifier;
     QWidget* _contentArea;
+    QLabel* _textLabel = nullptr;
     TableRowAccessory _accessory = TableRowAccessory::None;
     bool _isSelected = false;
     bool _hasKeyboardFrame = false;

@@ -18,16 +18,9 @@ namespace
 
 constexpr int wheelStep = 20;
 
-int contentHeight(int rowCount)
-{
-    const qint64 height = qint64{rowCount} * TableView::rowHeight;
-    return static_cast<int>(std::min<qint64>(height, std::numeric_limits<int>::max()));
-}
-
 } // namespace
 
-TableView::TableView(TableViewDataSource& dataSource, QWidget* parent)
-    : QAbstractScrollArea(parent), _dataSource(dataSource)
+TableView::TableView(QWidget* parent) : QAbstractScrollArea(parent)
 {
     setFrameShape(QFrame::NoFrame);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
@@ -37,11 +30,22 @@ TableView::TableView(TableViewDataSource& dataSource, QWidget* parent)
     QScroller::grabGesture(viewport(), QScroller::TouchGesture);
 }
 
+TableView::TableView(TableViewDataSource& dataSource, QWidget* parent) : TableView(parent)
+{
+    setDataSource(dataSource);
+}
+
 TableView::~TableView() = default;
+
+int TableView::contentHeight() const
+{
+    const qint64 height = qint64{_rowCount} * rowHeight;
+    return static_cast<int>(std::min<qint64>(height, std::numeric_limits<int>::max()));
+}
 
 void TableView::reloadData()
 {
-    _rowCount = std::max(0, _dataSource.rowsInSection(0));
+    _rowCount = _dataSource ? std::max(0, _dataSource->rowsInSection(0)) : 0;
     // To the front, the topmost one foremost: each row comes back to its own place.
     for (auto row = _rows.rbegin(); row != _rows.rend(); ++row)
         _reusable[row->second->reuseIdentifier()].push_front(std::move(row->second));
@@ -79,7 +83,7 @@ TableView::RowRange TableView::rangeInView() const
 void TableView::updateScrollRange()
 {
     const int height = viewport()->height();
-    verticalScrollBar()->setRange(0, std::max(0, contentHeight(_rowCount) - height));
+    verticalScrollBar()->setRange(0, std::max(0, contentHeight() - height));
     verticalScrollBar()->setPageStep(height);
 }
 
@@ -112,7 +116,7 @@ void TableView::showRow(int row)
 {
     auto& widget = _rows[row];
     if (!widget) {
-        widget = _dataSource.rowForIndexPath(*this, {0, row});
+        widget = _dataSource->rowForIndexPath(*this, {0, row});
         widget->setParent(viewport());
         updateLook(row, *widget);
     }
@@ -221,7 +225,7 @@ void TableView::activate(int row)
 {
     _current = row;
     selectRow({0, row});
-    _dataSource.rowSelected(*this, IndexPath{0, row});
+    _dataSource->rowSelected(*this, IndexPath{0, row});
 }
 
 std::optional<int> TableView::keyTarget(int key) const

@@ -31,6 +31,8 @@ class TableViewDataSource
     /// A row that is ready to be shown, reused where possible.
     virtual std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) = 0;
     virtual void rowSelected(TableView& table, std::optional<IndexPath> indexPath) = 0;
+    /// What copying the row puts on the clipboard; nothing is copied where it is empty.
+    virtual QString textForCopying(IndexPath) { return {}; }
 };
 
 /// A plain list of rows of one height in one section. Only the rows in view exist; those that leave
@@ -40,11 +42,17 @@ class TableView : public QAbstractScrollArea
   public:
     static constexpr int rowHeight = 50;
 
+    /// Empty until it has a data source.
+    explicit TableView(QWidget* parent = nullptr);
     explicit TableView(TableViewDataSource& dataSource, QWidget* parent = nullptr);
     ~TableView() override;
 
+    void setDataSource(TableViewDataSource& dataSource) { _dataSource = &dataSource; }
+
     /// Asks for everything anew; the scroll position stays.
     void reloadData();
+    /// The height of all rows together, which may be more than the table's own.
+    int contentHeight() const;
     /// A row that waits under that identifier, or none. While an unchanged table is reloaded, every
     /// row is handed out for its own former place.
     std::unique_ptr<TableRow> dequeueReusableRow(const QString& identifier);
@@ -89,7 +97,7 @@ class TableView : public QAbstractScrollArea
     void scrollTo(int row);
     std::optional<int> keyTarget(int key) const;
 
-    TableViewDataSource& _dataSource;
+    TableViewDataSource* _dataSource = nullptr;
     int _rowCount = 0;
     // Rows are children of the viewport, which goes after them.
     std::map<int, std::unique_ptr<TableRow>> _rows;

@@ -44,21 +44,34 @@ void Transition::paintEvent(QPaintEvent*)
 
 void Transition::draw(QPainter& painter) const
 {
-    const qreal wide = width();
+    const qreal left = 1 - _progress;
     switch (_kind) {
     case Kind::Fade:
-        painter.setOpacity(1 - _progress);
+        painter.setOpacity(left);
         painter.drawPixmap(0, 0, _before);
         return;
     case Kind::Push:
-        painter.drawPixmap(QPointF(-parallax * _progress * wide, 0), _before);
-        painter.drawPixmap(QPointF((1 - _progress) * wide, 0), _after);
+        drawMoved(painter, _before, -parallax * _progress, 0);
+        drawMoved(painter, _after, left, 0);
         return;
     case Kind::Pop:
-        painter.drawPixmap(QPointF(-parallax * (1 - _progress) * wide, 0), _after);
-        painter.drawPixmap(QPointF(_progress * wide, 0), _before);
+        drawMoved(painter, _after, -parallax * left, 0);
+        drawMoved(painter, _before, _progress, 0);
+        return;
+    case Kind::Rise:
+        drawMoved(painter, _before, 0, 0);
+        drawMoved(painter, _after, 0, left);
+        return;
+    case Kind::Sink:
+        drawMoved(painter, _after, 0, 0);
+        drawMoved(painter, _before, 0, _progress);
         return;
     }
+}
+
+void Transition::drawMoved(QPainter& painter, const QPixmap& look, qreal right, qreal down) const
+{
+    painter.drawPixmap(QPointF(right * width(), down * height()), look);
 }
 
 } // namespace ventrik

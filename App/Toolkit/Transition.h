@@ -16,6 +16,8 @@ class Transition : public QWidget
         Fade, ///< the old look fades away over the widget itself
         Push, ///< the new look comes in from the right
         Pop,  ///< the old look goes away to the right
+        Rise, ///< the new look comes up over the old one
+        Sink, ///< the old look goes down off the new one
     };
 
     /// Deletes itself at the end. `after` is not needed for a fade.
@@ -26,6 +28,8 @@ class Transition : public QWidget
 
   private:
     void draw(QPainter& painter) const;
+    /// Draws the look away from its place by parts of the widget's size, 1 being the whole of it.
+    void drawMoved(QPainter& painter, const QPixmap& look, qreal right, qreal down) const;
 
     Kind _kind;
     QPixmap _before;

@@ -28,6 +28,15 @@ AppFixture::AppFixture()
     changeTechnology(kQXLogChannelTechnology_Orbel_LTE);
 }
 
+VentrikAppOptions AppFixture::options(const std::string& snapshotDirectory)
+{
+    VentrikAppOptions options;
+    options.snapshotDirectory = snapshotDirectory;
+    options.animation = false;
+    options.windowSize = QSize(480, 640);
+    return options;
+}
+
 void AppFixture::changeTechnology(std::string_view technology)
 {
     loseService();

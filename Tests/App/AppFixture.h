@@ -6,6 +6,7 @@
 #include "Tests/Support/FakePlatform.h"
 
 #include <QLabel>
+#include <QTemporaryDir>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -39,7 +40,11 @@ class AppFixture : public testing::Test
     static bool isSpinning(const VentrikPaneController& pane);
 
     FakePlatform fake;
-    VentrikApp app{fake.platform(), {false, {}, false, QSize(480, 640)}};
+    QTemporaryDir temporary;
+    VentrikApp app{fake.platform(), options(temporary.path().toStdString())};
+
+  private:
+    static VentrikAppOptions options(const std::string& snapshotDirectory);
 };
 
 } // namespace ventrik

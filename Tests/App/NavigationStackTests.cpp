@@ -162,6 +162,85 @@ TEST_F(NavigationStackTest, TheToolbarIsHiddenUntilAScreenAsksForIt)
     EXPECT_FALSE(stack.isToolbarHidden());
 }
 
+TEST_F(NavigationStackTest, APresentedScreenCoversEverything)
+{
+    showAt(stack, 400, 600);
+    const auto sheet = screen("Sheet");
+    events.clear();
+    stack.present(*sheet, true);
+    EXPECT_EQ(stack.presentedScreen(), sheet.get());
+    EXPECT_THAT(events, ElementsAre("Sheet appears"));
+    EXPECT_EQ(sheet->geometry(), stack.rect());
+    EXPECT_TRUE(sheet->isVisible());
+    EXPECT_FALSE(stack.topScreen().isVisible());
+    EXPECT_FALSE(stack.titleBar().isVisible());
+}
+
+TEST_F(NavigationStackTest, ADismissedScreenIsLeftToItsOwner)
+{
+    showAt(stack, 400, 600);
+    const auto sheet = screen("Sheet");
+    stack.present(*sheet, true);
+    events.clear();
+    stack.dismiss(true);
+    EXPECT_THAT(events, ElementsAre("Sheet disappears"));
+    EXPECT_EQ(stack.presentedScreen(), nullptr);
+    EXPECT_EQ(sheet->parentWidget(), nullptr);
+    EXPECT_EQ(sheet->navigationStack(), nullptr);
+    EXPECT_TRUE(stack.topScreen().isVisible());
+    EXPECT_TRUE(stack.topScreen().hasFocus());
+}
+
+TEST_F(NavigationStackTest, APresentedScreenThatIsDeletedUncoversTheStack)
+{
+    showAt(stack, 400, 600);
+    auto sheet = screen("Sheet");
+    stack.present(*sheet, true);
+    sheet.reset();
+    EXPECT_EQ(stack.presentedScreen(), nullptr);
+    EXPECT_TRUE(stack.topScreen().isVisible());
+}
+
+TEST_F(NavigationStackTest, TheKeysForTheWayBackDoNotReachBelowAPresentedScreen)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    const auto sheet = screen("Sheet");
+    stack.present(*sheet, true);
+    QTest::keyClick(sheet.get(), Qt::Key_Escape);
+    QTest::keyClick(sheet.get(), Qt::Key_Backspace);
+    EXPECT_EQ(top(), "Child");
+}
+
+TEST_F(NavigationStackTest, AChangeBelowAPresentedScreenLeavesItTheKeyboard)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    const auto sheet = screen("Sheet");
+    sheet->setFocusPolicy(Qt::StrongFocus);
+    stack.present(*sheet, true);
+    ASSERT_TRUE(sheet->hasFocus());
+    stack.pop(true);
+    EXPECT_EQ(top(), "Root");
+    EXPECT_TRUE(sheet->hasFocus());
+    EXPECT_TRUE(sheet->isVisible());
+}
+
+TEST_F(NavigationStackTest, AnAnimatedPresentationEndsWithTheScreenUncovered)
+{
+    stack.setAnimationEnabled(true);
+    showAt(stack, 400, 600);
+    const auto children = [this] { return stack.children().size(); };
+    const auto before = children();
+    const auto sheet = screen("Sheet");
+    stack.present(*sheet, true);
+    EXPECT_EQ(children(), before + 2); // the sheet and the moving pictures
+    EXPECT_TRUE(QTest::qWaitFor([&] { return children() == before + 1; }));
+    stack.dismiss(true);
+    EXPECT_EQ(children(), before + 1);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return children() == before; }));
+}
+
 TEST_F(NavigationStackTest, AnAnimatedPushChangesTheStackAtOnceAndItsCoverGoesAway)
 {
     stack.setAnimationEnabled(true);

@@ -3,7 +3,10 @@
 #include "App/VentrikCell.h"
 
 #include <QGuiApplication>
+#include <QLineEdit>
+#include <QPushButton>
 #include <QScreen>
+#include <QTest>
 
 namespace ventrik
 {
@@ -26,6 +29,12 @@ class VentrikAppTest : public AppFixture
         openRow(0);
         ASSERT_THAT(titles(), ElementsAre("Ventrik", "Cell", "Details", "More"));
     }
+    // The toolbar's Save button of the top pane.
+    QPushButton& saveButton()
+    {
+        return dynamic_cast<QPushButton&>(*topPane().toolbar().items().at(3));
+    }
+    int savedRows() { return app.saveViewController()->rowsInSection(0); }
     std::string valueText(int row)
     {
         const auto& cell = dynamic_cast<VentrikCell&>(*topPane().table().rowAt({0, row}));
@@ -211,6 +220,106 @@ TEST_F(VentrikAppTest, WhereSavingIsAllowedEveryPaneHasTheButton)
     openRow(0);
     EXPECT_EQ(pane(0).toolbar().items().size(), 4U);
     EXPECT_EQ(pane(1).toolbar().items().size(), 4U);
+}
+
+TEST_F(VentrikAppTest, TheSaveButtonOpensTheSaveScreenWithWhatThereIsToSave)
+{
+    launchAndConnect();
+    app.setAllowSaveButton(true);
+    refreshWithData();
+    refreshWithData();
+    QTest::mouseClick(&saveButton(), Qt::LeftButton);
+    ASSERT_NE(app.saveViewController(), nullptr);
+    EXPECT_EQ(app.navController()->presentedScreen(), app.saveViewController());
+    EXPECT_EQ(savedRows(), 3); // two displays and the DLF
+}
+
+TEST_F(VentrikAppTest, ASecondPressOfSaveDoesNothing)
+{
+    launchAndConnect();
+    app.showSaveView();
+    const auto* first = app.saveViewController();
+    app.showSaveView();
+    EXPECT_EQ(app.saveViewController(), first);
+}
+
+TEST_F(VentrikAppTest, HistoryGatheredAfterTheOpeningIsNotShown)
+{
+    launchAndConnect();
+    refreshWithData();
+    app.showSaveView();
+    refreshWithData();
+    EXPECT_EQ(savedRows(), 2);
+    app.closeSaveView();
+    app.showSaveView();
+    EXPECT_EQ(savedRows(), 3);
+}
+
+TEST_F(VentrikAppTest, ClosingTheSaveScreenReleasesIt)
+{
+    launchAndConnect();
+    app.showSaveView();
+    app.closeSaveView();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+    EXPECT_EQ(app.navController()->presentedScreen(), nullptr);
+    EXPECT_TRUE(topPane().isVisible());
+    app.closeSaveView();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+}
+
+TEST_F(VentrikAppTest, CancelClosesTheSaveScreenOnTheMainQueue)
+{
+    launchAndConnect();
+    app.showSaveView();
+    QTest::mouseClick(&app.saveViewController()->cancelButton(), Qt::LeftButton);
+    EXPECT_NE(app.saveViewController(), nullptr);
+    fake.mainQueue.run();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+}
+
+TEST_F(VentrikAppTest, SaveWritesIntoTheSnapshotDirectoryAndClosesTheScreen)
+{
+    launchAndConnect();
+    refreshWithData();
+    app.showSaveView();
+    QTest::mouseClick(&app.saveViewController()->saveButton(), Qt::LeftButton);
+    fake.mainQueue.run();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+    EXPECT_TRUE(QFile::exists(temporary.filePath("VentrikSnapshot-1794809428.ventrik")));
+}
+
+TEST_F(VentrikAppTest, ARefreshBehindTheSaveScreenLeavesItTheKeyboard)
+{
+    launchAndConnect();
+    refreshWithData();
+    openAll();
+    app.showSaveView();
+    QCoreApplication::processEvents();
+    app.saveViewController()->saveDescription().setFocus();
+    ASSERT_TRUE(app.saveViewController()->saveDescription().hasFocus());
+    changeTechnology(kQXLogChannelTechnology_Orbel_UTRAN2);
+    fake.mainQueue.advance(2s);
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell"));
+    EXPECT_TRUE(app.saveViewController()->saveDescription().hasFocus());
+}
+
+TEST_F(VentrikAppTest, TerminationClosesAnOpenSaveScreen)
+{
+    launchAndConnect();
+    app.showSaveView();
+    app.applicationWillTerminate();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+    fake.mainQueue.run();
+}
+
+TEST_F(VentrikAppTest, TheOptionOffersSaveWithoutTheMarker)
+{
+    VentrikAppOptions options;
+    options.saveButton = true;
+    VentrikApp saving(fake.platform(), options);
+    saving.getSaveButtonPref();
+    EXPECT_TRUE(saving.allowSaveButton());
 }
 
 TEST_F(VentrikAppTest, TheHomeScreenIsLeftAloneUntilTheEnd)

@@ -1,3 +1,4 @@
+#include "Platform/Linux/DiagnosticLogs.h"
 #include "Platform/Linux/LinuxPlatform.h"
 #include "Tests/Platform/PortsFixture.h"
 
@@ -62,6 +63,19 @@ TEST(LinuxPreferences, PostsNothingWithoutABus)
     LinuxPreferences preferences;
     EXPECT_LT(secondsOf([&] { preferences.postChanged("org.ventrik.HomeScreen", "FieldTest"); }),
               1.0);
+}
+
+TEST(DiagnosticLogs, LieWithTheUsersState)
+{
+    qputenv("HOME", "/home/someone");
+    qputenv("XDG_STATE_HOME", "/state");
+    EXPECT_EQ(defaultDiagnosticLogDirectory(), "/state/ventrik/DiagnosticLogs");
+    for (const char* unusable : {"", "relative"}) {
+        qputenv("XDG_STATE_HOME", unusable);
+        EXPECT_EQ(defaultDiagnosticLogDirectory(),
+                  "/home/someone/.local/state/ventrik/DiagnosticLogs");
+    }
+    qunsetenv("XDG_STATE_HOME");
 }
 
 class LinuxResourcesTest : public ::testing::Test

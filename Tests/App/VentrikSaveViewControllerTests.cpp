@@ -1,0 +1,326 @@
+#include "App/VentrikSaveViewController.h"
+#include "PropertyList/PropertyListReader.h"
+#include "Tests/App/TestScreen.h"
+#include "Tests/Support/FakePlatform.h"
+
+#include <QApplication>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include <filesystem>
+#include <fstream>
+#include <set>
+
+#include <gmock/gmock.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+PlistDictionary entry(const std::string& description)
+{
+    return {{"Description", description}};
+}
+
+PlistArray history()
+{
+    return {entry("Snapshot (2026-11-16 06:10:26 +0000)"), entry("DLF binary (161 bytes)")};
+}
+
+class SaveScreenTest : public testing::Test, public VentrikSaveHost
+{
+  protected:
+    SaveScreenTest()
+    {
+        stack.setAnimationEnabled(false);
+        showAt(stack, 390, 780);
+    }
+    void closeSaveView() override { ++closings; }
+
+    VentrikSaveViewController& open(const std::optional<PlistValue>& saveContents)
+    {
+        screen = VentrikSaveViewController::initWithSaveHistory(*this, fake.platform(), directory,
+                                                                saveContents);
+        stack.present(*screen, false);
+        QCoreApplication::processEvents();
+        return *screen;
+    }
+    TableRow& row(int index) { return *screen->saveContentTable().rowAt({0, index}); }
+    bool fieldHasFocus() { return screen->saveDescription().hasFocus(); }
+    void type(const QString& text)
+    {
+        screen->saveDescription().setFocus();
+        QTest::keyClicks(&screen->saveDescription(), text);
+    }
+    void press(QPushButton& button) { QTest::mouseClick(&button, Qt::LeftButton); }
+
+    std::set<std::string> files() const
+    {
+        std::set<std::string> names;
+        std::error_code error;
+        for (const auto& file : std::filesystem::directory_iterator(directory, error))
+            names.insert(file.path().filename());
+        return names;
+    }
+    PlistDictionary saved(const std::string& name = "VentrikSnapshot-1794809428.ventrik") const
+    {
+        std::ifstream file(directory + "/" + name, std::ios::binary);
+        const Bytes bytes{std::istreambuf_iterator<char>(file), {}};
+        const auto reading = readPropertyList(bytes);
+        EXPECT_TRUE(reading) << reading.error;
+        return reading ? *reading.value->dictionary() : PlistDictionary();
+    }
+    QMessageBox* alert() const { return stack.findChild<QMessageBox*>(); }
+
+    FakePlatform fake;
+    QTemporaryDir temporary;
+    std::string directory = temporary.filePath("logs").toStdString();
+    Events events;
+    NavigationStack stack{std::make_unique<TestScreen>("Root", events)};
+    int closings = 0;
+    std::unique_ptr<VentrikSaveViewController> screen;
+};
+
+} // namespace
+
+TEST_F(SaveScreenTest, EveryEntryIsListedWithACheckMark)
+{
+    open(history());
+    ASSERT_EQ(screen->saveContentTable().visibleRows().size(), 2U);
+    EXPECT_EQ(row(0).textLabel().text(), "Snapshot (2026-11-16 06:10:26 +0000)");
+    EXPECT_EQ(row(1).textLabel().text(), "DLF binary (161 bytes)");
+    for (const int index : {0, 1}) {
+        EXPECT_EQ(row(index).accessory(), TableRowAccessory::CheckMark);
+        EXPECT_EQ(row(index).style(), TableRow::Style::Default);
+        EXPECT_EQ(row(index).reuseIdentifier(), "SaveHistoryContentCell");
+        EXPECT_EQ(row(index).textLabel().font().family(), "Helvetica");
+        EXPECT_EQ(row(index).textLabel().font().pixelSize(), 13);
+    }
+}
+
+TEST_F(SaveScreenTest, TheTableIsAsHighAsItsContent)
+{
+    open(history());
+    EXPECT_EQ(screen->saveContentTable().height(), 100);
+}
+
+TEST_F(SaveScreenTest, AnEmptyHistoryShowsAnEmptyTable)
+{
+    open(PlistArray());
+    EXPECT_TRUE(screen->saveContentTable().isVisible());
+    EXPECT_GT(screen->saveContentTable().height(), 0);
+    EXPECT_THAT(screen->saveContentTable().visibleRows(), IsEmpty());
+}
+
+TEST_F(SaveScreenTest, AnEntryWithoutADescriptionHasAnEmptyRow)
+{
+    open(PlistArray{PlistDictionary(), 7});
+    EXPECT_EQ(row(0).textLabel().text(), "");
+    EXPECT_EQ(row(1).textLabel().text(), "");
+}
+
+TEST_F(SaveScreenTest, CoversTheWholeWindow)
+{
+    EXPECT_EQ(open(history()).geometry(), QRect(0, 0, 390, 780));
+}
+
+TEST_F(SaveScreenTest, TheFieldHintsAtWhatToWrite)
+{
+    EXPECT_FALSE(open(history()).saveDescription().placeholderText().isEmpty());
+    EXPECT_EQ(screen->saveDescription().text(), "");
+}
+
+TEST_F(SaveScreenTest, SaveWritesTheTimeOfOpeningTheHistoryAndTheDescription)
+{
+    open(history());
+    fake.clock.advance(75s);
+    type("On the road");
+    press(screen->saveButton());
+    EXPECT_THAT(files(), ElementsAre("VentrikSnapshot-1794809503.ventrik"));
+    EXPECT_EQ(saved("VentrikSnapshot-1794809503.ventrik"),
+              (PlistDictionary{{"Timestamp", "2026-11-16 06:10:28 +0000"},
+                               {"Data", history()},
+                               {"Description", "On the road"}}));
+}
+
+TEST_F(SaveScreenTest, AnEmptyDescriptionIsWrittenEmpty)
+{
+    open(history());
+    press(screen->saveButton());
+    EXPECT_EQ(*saved().find("Description"), PlistValue(""));
+}
+
+TEST_F(SaveScreenTest, WithoutAGeneratorTheFileHoldsTheTimeAlone)
+{
+    open(std::nullopt);
+    EXPECT_THAT(screen->saveContentTable().visibleRows(), IsEmpty());
+    press(screen->saveButton());
+    EXPECT_EQ(saved(), (PlistDictionary{{"Timestamp", "2026-11-16 06:10:28 +0000"}}));
+}
+
+TEST_F(SaveScreenTest, TwoSavesWithinASecondWriteOneFile)
+{
+    open(history());
+    type("first");
+    press(screen->saveButton());
+    fake.clock.advance(999ms);
+    open(history());
+    type("second");
+    press(screen->saveButton());
+    EXPECT_THAT(files(), ElementsAre("VentrikSnapshot-1794809428.ventrik"));
+    EXPECT_EQ(*saved().find("Description"), PlistValue("second"));
+}
+
+TEST_F(SaveScreenTest, WhatChangesAfterTheOpeningIsNotInTheFile)
+{
+    PlistArray contents = history();
+    PlistDictionary cell{{"RSRP", "-94 dBm"}};
+    contents.append(PlistDictionary{{"Display", PlistDictionary{{"Cell", cell}}}});
+    open(contents);
+    contents.append(entry("later"));
+    cell.set("RSRP", "-70 dBm");
+    press(screen->saveButton());
+    PlistArray expected = history();
+    expected.append(PlistDictionary{
+        {"Display", PlistDictionary{{"Cell", PlistDictionary{{"RSRP", "-94 dBm"}}}}}});
+    EXPECT_EQ(*saved().find("Data"), PlistValue(expected));
+}
+
+TEST_F(SaveScreenTest, TheDirectoryIsMadeAtTheFirstSave)
+{
+    open(history());
+    EXPECT_FALSE(std::filesystem::exists(directory));
+    press(screen->saveButton());
+    EXPECT_TRUE(std::filesystem::is_directory(directory));
+}
+
+TEST_F(SaveScreenTest, SaveClosesThroughTheMainQueue)
+{
+    open(history());
+    press(screen->saveButton());
+    EXPECT_EQ(closings, 0);
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 1);
+}
+
+TEST_F(SaveScreenTest, CancelClosesThroughTheMainQueueAndWritesNothing)
+{
+    open(history());
+    press(screen->cancelButton());
+    EXPECT_EQ(closings, 0);
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 1);
+    EXPECT_THAT(files(), IsEmpty());
+}
+
+TEST_F(SaveScreenTest, EscapeCancels)
+{
+    open(history());
+    type("half a sent");
+    QTest::keyClick(&screen->saveDescription(), Qt::Key_Escape);
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 1);
+    EXPECT_THAT(files(), IsEmpty());
+}
+
+TEST_F(SaveScreenTest, AScreenThatIsGoneClosesNothing)
+{
+    open(history());
+    press(screen->cancelButton());
+    screen.reset();
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 0);
+}
+
+TEST_F(SaveScreenTest, AFailedWriteIsLoggedAndShownAndTheScreenClosesAllTheSame)
+{
+    std::ofstream(directory) << "a file where the directory should be";
+    open(history());
+    fake.log.clear();
+    press(screen->saveButton());
+    EXPECT_THAT(fake.log.texts(LogPriority::error),
+                ElementsAre("Unable to write snapshot to " + directory +
+                            "/VentrikSnapshot-1794809428.ventrik"));
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(alert()->isVisible());
+    EXPECT_EQ(alert()->windowTitle(), "File Error");
+    EXPECT_EQ(alert()->text(), "Unable to write file to disk");
+    ASSERT_EQ(alert()->buttons().size(), 1);
+    EXPECT_EQ(alert()->buttons().front()->text(), "Close");
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 1);
+}
+
+TEST_F(SaveScreenTest, TheAlertOutlivesTheScreenAndGoesByItsButton)
+{
+    std::ofstream(directory) << "a file where the directory should be";
+    open(history());
+    press(screen->saveButton());
+    stack.dismiss(false);
+    screen.reset();
+    ASSERT_NE(alert(), nullptr);
+    QTest::mouseClick(alert()->buttons().front(), Qt::LeftButton);
+    deletePopped();
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(SaveScreenTest, ASuccessfulSaveShowsNoAlertAndLogsNothing)
+{
+    open(history());
+    press(screen->saveButton());
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_THAT(fake.log.texts(LogPriority::error), IsEmpty());
+}
+
+TEST_F(SaveScreenTest, EnterHidesTheKeyboardAndKeepsTheText)
+{
+    open(history());
+    type("drive");
+    ASSERT_TRUE(fieldHasFocus());
+    QTest::keyClick(&screen->saveDescription(), Qt::Key_Return);
+    EXPECT_FALSE(fieldHasFocus());
+    EXPECT_EQ(screen->saveDescription().text(), "drive");
+    EXPECT_EQ(closings, 0);
+    EXPECT_TRUE(screen->textFieldShouldReturn(screen->saveDescription()));
+}
+
+TEST_F(SaveScreenTest, ATouchOnTheBackgroundHidesTheKeyboard)
+{
+    open(history());
+    type("drive");
+    QTest::mouseClick(screen.get(), Qt::LeftButton, {}, {200, 700});
+    EXPECT_FALSE(fieldHasFocus());
+}
+
+TEST_F(SaveScreenTest, ATouchOnARowHidesTheKeyboardAndLeavesTheRowAsItIs)
+{
+    open(history());
+    type("drive");
+    QTest::mouseClick(&row(1), Qt::LeftButton, {}, {60, 25});
+    EXPECT_FALSE(fieldHasFocus());
+    EXPECT_EQ(row(1).accessory(), TableRowAccessory::CheckMark);
+    EXPECT_EQ(screen->saveContentTable().indexPathForSelectedRow(), (IndexPath{0, 1}));
+}
+
+TEST_F(SaveScreenTest, TheTabKeyStaysOnTheScreen)
+{
+    open(history());
+    screen->saveDescription().setFocus();
+    for (int i = 0; i < 6; ++i) {
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+        ASSERT_TRUE(screen->isAncestorOf(QApplication::focusWidget()) ||
+                    QApplication::focusWidget() == screen.get());
+    }
+}
+
+} // namespace ventrik

@@ -1,20 +1,17 @@
 #include "App/VentrikApp.h"
 #include "Capture/CaptureTechnology.h"
+#include "Platform/Linux/DiagnosticLogs.h"
 #include "Platform/Linux/LinuxPlatform.h"
-#include "Platform/Linux/PortDirectory.h"
 #include "Platform/Linux/TerminationSignals.h"
-#include "Platform/TelephonyConstants.h"
 #include "Tools/CommandLine.h"
+#include "Tools/DemoDirectory.h"
+#include "Tools/DemoService.h"
 
 #include <QApplication>
-#include <QElapsedTimer>
 #include <QIcon>
-#include <QProcess>
-#include <QTemporaryDir>
 
 #include <algorithm>
 #include <charconv>
-#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <memory>
@@ -22,8 +19,6 @@
 
 #include <fmt/format.h>
 #include <getopt.h>
-#include <sys/prctl.h>
-#include <unistd.h>
 
 using namespace ventrik;
 
@@ -93,6 +88,7 @@ ViewerOptions parseArguments(int argc, char** argv)
                                      {}};
     CommandLine line("ventrik", argc, argv);
     ViewerOptions result;
+    result.app.snapshotDirectory = defaultDiagnosticLogDirectory();
     for (int letter = 0; (letter = line.next(options)) != -1;) {
         if (letter == 'd')
             result.demoTechnology = technologyArgument(line);
@@ -144,100 +140,6 @@ std::unique_ptr<QApplication> makeApplication(int& argc, char** argv)
     return application;
 }
 
-// The service's last words, or how it ended where it had none.
-std::string lastWords(QProcess& process)
-{
-    const QStringList lines =
-        QString::fromUtf8(process.readAllStandardError()).split('\n', Qt::SkipEmptyParts);
-    if (!lines.isEmpty())
-        return lines.last().toStdString();
-    if (process.error() == QProcess::FailedToStart || process.exitStatus() == QProcess::CrashExit)
-        return process.errorString().toStdString();
-    return fmt::format("exit status {}", process.exitCode());
-}
-
-/// A telephony service of our own, in a runtime directory that nobody else uses. It ends with this
-/// process, however that ends.
-class DemoService
-{
-  public:
-    ~DemoService();
-    /// Waits until the service listens; false when it does not come up, which is then told.
-    bool start(const std::string& technology);
-    std::string runtimeDirectory() const { return _directory.path().toStdString(); }
-
-  private:
-    bool waitUntilListening();
-    void tellEnd() { complain("the demo service ended: " + lastWords(_process)); }
-
-    QTemporaryDir _directory; // made with mode 0700
-    QProcess _process;
-};
-
-bool DemoService::start(const std::string& technology)
-{
-    if (!_directory.isValid()) {
-        complain("no directory for the demo: " + _directory.errorString().toStdString());
-        return false;
-    }
-    auto environment = QProcessEnvironment::systemEnvironment();
-    environment.insert("VENTRIK_RUNTIME_DIR", _directory.path());
-    _process.setProcessEnvironment(environment);
-    _process.setStandardOutputFile(QProcess::nullDevice());
-    _process.setChildProcessModifier([parent = getpid()] {
-        // The signal mask is inherited; the service shall see its own signals.
-        sigset_t none;
-        sigemptyset(&none);
-        sigprocmask(SIG_SETMASK, &none, nullptr);
-        prctl(PR_SET_PDEATHSIG, SIGTERM);
-        if (getppid() != parent)
-            _exit(EXIT_FAILURE);
-    });
-    _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
-                   {"--technology", QString::fromStdString(technology)});
-    if (!waitUntilListening())
-        return false;
-    QObject::connect(&_process, &QProcess::finished, qApp, [this] {
-        tellEnd();
-        QCoreApplication::exit(EXIT_FAILURE);
-    });
-    return true;
-}
-
-bool DemoService::waitUntilListening()
-{
-    constexpr int longestWait = 5000; // milliseconds
-    constexpr int turn = 20;
-    const std::string socket =
-        PortDirectory(runtimeDirectory()).socketPath(telephonyServicePortName);
-    QElapsedTimer elapsed;
-    elapsed.start();
-    while (access(socket.c_str(), F_OK) != 0) {
-        if (_process.waitForFinished(turn) || _process.state() == QProcess::NotRunning) {
-            tellEnd();
-            return false;
-        }
-        if (elapsed.hasExpired(longestWait)) {
-            complain("the demo service does not come up");
-            return false;
-        }
-    }
-    return true;
-}
-
-DemoService::~DemoService()
-{
-    constexpr int longestWait = 2000; // milliseconds
-    _process.disconnect(qApp);
-    if (_process.state() == QProcess::NotRunning)
-        return;
-    _process.terminate();
-    if (!_process.waitForFinished(longestWait)) {
-        _process.kill();
-        _process.waitForFinished(longestWait);
-    }
-}
-
 void setWindowIcon(const Resources& resources)
 {
     if (const auto icon = resources.path("ventrik", "svg"))
@@ -259,6 +161,18 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     return status;
 }
 
+int runDemo(const ViewerOptions& options, const DemoDirectory& directory)
+{
+    if (directory.path().empty()) {
+        complain("no directory for the demo: " + directory.error());
+        return EXIT_FAILURE;
+    }
+    DemoService service;
+    if (!service.start(directory, options.demoTechnology))
+        return EXIT_FAILURE;
+    return runViewer(options, directory.path());
+}
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -269,13 +183,11 @@ int main(int argc, char** argv)
         return EXIT_FAILURE;
     }
     TerminationSignals::block(); // the toolkit starts threads
+    std::optional<DemoDirectory> demoDirectory;
+    if (!options.demoTechnology.empty())
+        demoDirectory.emplace();
     int toolkitArgc = 1;
     const auto application = makeApplication(toolkitArgc, argv);
     const TerminationSignals termination([] { QCoreApplication::quit(); });
-    if (options.demoTechnology.empty())
-        return runViewer(options, {});
-    DemoService demo;
-    if (!demo.start(options.demoTechnology))
-        return EXIT_FAILURE;
-    return runViewer(options, demo.runtimeDirectory());
+    return demoDirectory ? runDemo(options, *demoDirectory) : runViewer(options, {});
 }

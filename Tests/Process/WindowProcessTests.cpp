@@ -130,6 +130,7 @@ TEST_F(WindowProcess, OfADemoTakesItsServiceAlongWhenItIsKilled)
     window->kill();
     for (const pid_t child : children)
         EXPECT_TRUE(waitUntil([&] { return hasEnded(child); }));
+    EXPECT_THAT(namesIn(temporary), IsEmpty());
 }
 
 TEST_F(WindowProcess, RefusesWhatIsWrong)

@@ -1,0 +1,93 @@
+#include "Tools/DemoDirectory.h"
+
+#include <cerrno>
+#include <csignal>
+#include <cstdlib>
+#include <cstring>
+#include <filesystem>
+
+#include <fcntl.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+void removeAll(const std::string& path)
+{
+    std::error_code ignored;
+    std::filesystem::remove_all(path, ignored);
+}
+
+void closeStandardStreams()
+{
+    const int null = open("/dev/null", O_RDWR);
+    for (const int descriptor : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO})
+        dup2(null, descriptor);
+}
+
+// What ends the other process by a signal to the whole group must not end this one.
+[[noreturn]] void keep(const std::string& path, int lifeline)
+{
+    for (const int number : {SIGTERM, SIGINT, SIGHUP, SIGQUIT})
+        std::signal(number, SIG_IGN);
+    closeStandardStreams();
+    char byte = 0;
+    while (read(lifeline, &byte, 1) == -1 && errno == EINTR) {
+    }
+    removeAll(path);
+    _exit(EXIT_SUCCESS);
+}
+
+} // namespace
+
+DemoDirectory::DemoDirectory()
+{
+    if (!make() || !startKeeper())
+        fail();
+}
+
+bool DemoDirectory::make()
+{
+    std::error_code error;
+    std::string name = std::filesystem::temp_directory_path(error) / "ventrik-XXXXXX";
+    if (mkdtemp(name.data()) == nullptr)
+        return false;
+    _path = name;
+    return true;
+}
+
+bool DemoDirectory::startKeeper()
+{
+    int ends[2];
+    if (pipe2(ends, O_CLOEXEC) == -1)
+        return false;
+    _lifeline = ends[1];
+    _keeper = fork();
+    if (_keeper == 0) {
+        close(ends[1]);
+        keep(_path, ends[0]);
+    }
+    close(ends[0]);
+    return _keeper != -1;
+}
+
+void DemoDirectory::fail()
+{
+    _error = std::strerror(errno);
+    removeAll(_path);
+    _path.clear();
+}
+
+DemoDirectory::~DemoDirectory()
+{
+    if (_lifeline != -1)
+        close(_lifeline);
+    if (_keeper > 0)
+        waitpid(_keeper, nullptr, 0);
+}
+
+} // namespace ventrik

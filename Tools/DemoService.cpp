@@ -1,0 +1,107 @@
+#include "Tools/DemoService.h"
+
+#include "Platform/Linux/PortDirectory.h"
+#include "Platform/TelephonyConstants.h"
+
+#include <csignal>
+#include <cstdio>
+#include <cstdlib>
+#include <string_view>
+
+#include <QCoreApplication>
+#include <QElapsedTimer>
+
+#include <fmt/format.h>
+#include <sys/prctl.h>
+#include <unistd.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+void complain(std::string_view reason)
+{
+    fmt::print(stderr, "ventrik: {}\n", reason);
+}
+
+// The service's last words, or how it ended where it had none.
+std::string lastWords(QProcess& process)
+{
+    const QStringList lines =
+        QString::fromUtf8(process.readAllStandardError()).split('\n', Qt::SkipEmptyParts);
+    if (!lines.isEmpty())
+        return lines.last().toStdString();
+    if (process.error() == QProcess::FailedToStart || process.exitStatus() == QProcess::CrashExit)
+        return process.errorString().toStdString();
+    return fmt::format("exit status {}", process.exitCode());
+}
+
+} // namespace
+
+bool DemoService::start(const DemoDirectory& directory, const std::string& technology)
+{
+    auto environment = QProcessEnvironment::systemEnvironment();
+    environment.insert("VENTRIK_RUNTIME_DIR", QString::fromStdString(directory.path()));
+    _process.setProcessEnvironment(environment);
+    _process.setStandardOutputFile(QProcess::nullDevice());
+    _process.setChildProcessModifier([parent = getpid()] {
+        // The signal mask is inherited; the service shall see its own signals.
+        sigset_t none;
+        sigemptyset(&none);
+        sigprocmask(SIG_SETMASK, &none, nullptr);
+        prctl(PR_SET_PDEATHSIG, SIGTERM);
+        if (getppid() != parent)
+            _exit(EXIT_FAILURE);
+    });
+    _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
+                   {"--technology", QString::fromStdString(technology)});
+    if (!waitUntilListening(directory.path()))
+        return false;
+    QObject::connect(&_process, &QProcess::finished, qApp, [this] {
+        tellEnd();
+        QCoreApplication::exit(EXIT_FAILURE);
+    });
+    return true;
+}
+
+bool DemoService::waitUntilListening(const std::string& runtimeDirectory)
+{
+    constexpr int longestWait = 5000; // milliseconds
+    constexpr int turn = 20;
+    const std::string socket = PortDirectory(runtimeDirectory).socketPath(telephonyServicePortName);
+    QElapsedTimer elapsed;
+    elapsed.start();
+    while (access(socket.c_str(), F_OK) != 0) {
+        if (_process.waitForFinished(turn) || _process.state() == QProcess::NotRunning) {
+            tellEnd();
+            return false;
+        }
+        if (elapsed.hasExpired(longestWait)) {
+            complain("the demo service does not come up");
+            return false;
+        }
+    }
+    return true;
+}
+
+void DemoService::tellEnd()
+{
+    complain("the demo service ended: " + lastWords(_process));
+}
+
+DemoService::~DemoService()
+{
+    constexpr int longestWait = 2000; // milliseconds
+    _process.disconnect(qApp);
+    if (_process.state() == QProcess::NotRunning)
+        return;
+    _process.terminate();
+    if (!_process.waitForFinished(longestWait)) {
+        _process.kill();
+        _process.waitForFinished(longestWait);
+    }
+}
+
+} // namespace ventrik

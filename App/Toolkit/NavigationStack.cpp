@@ -1,8 +1,9 @@
 #include "App/Toolkit/NavigationStack.h"
 
+#include "App/Toolkit/EdgeSwipe.h"
+
 #include <QKeyEvent>
 #include <QStackedLayout>
-#include <QStyle>
 #include <QVBoxLayout>
 
 #include <utility>
@@ -29,9 +30,17 @@ NavigationStack::NavigationStack(std::unique_ptr<Screen> root, QWidget* parent)
     layout->addWidget(_toolbarArea);
     _toolbarArea->setFixedHeight(ToolBar::barHeight);
     _toolbarArea->hide();
-    connect(&_titleBar->backButton(), &QAbstractButton::clicked, this, [this] { pop(true); });
+    connect(&_titleBar->backButton(), &QAbstractButton::clicked, this, [this] { goBack(); });
+    new EdgeSwipe(*this, [this] { goBack(); });
     adopt(std::move(root));
     showTop();
+}
+
+// The user's wish; it does not reach below a presented screen.
+void NavigationStack::goBack()
+{
+    if (!_presented)
+        pop(true);
 }
 
 void NavigationStack::adopt(std::unique_ptr<Screen> screen)
@@ -174,8 +183,7 @@ void NavigationStack::updateTitleBar()
 
 bool NavigationStack::canAnimate() const
 {
-    return _animationEnabled && isVisible() &&
-           style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, this) > 0;
+    return _animationEnabled && isVisible() && Transition::isWanted(*this);
 }
 
 void NavigationStack::setToolbarHidden(bool hidden)
@@ -197,8 +205,8 @@ void NavigationStack::keyPressEvent(QKeyEvent* event)
         event->key() == Qt::Key_Escape || event->key() == Qt::Key_Backspace ||
         event->key() == Qt::Key_Back ||
         (event->key() == Qt::Key_Left && event->modifiers().testFlag(Qt::AltModifier));
-    if (goesBack && !_presented)
-        pop(true);
+    if (goesBack)
+        goBack();
     else
         QWidget::keyPressEvent(event);
 }

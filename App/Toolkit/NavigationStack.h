@@ -26,7 +26,8 @@ class NavigationStackDelegate
 };
 
 /// Screens on top of each other, of which the top one is seen, between a title bar with the way
-/// back and the top screen's tool bar. The way back is also on Escape, Backspace and Alt+Left.
+/// back and the top screen's tool bar. The way back is also on Escape, Backspace and Alt+Left, and
+/// on a swipe from the left edge.
 ///
 /// One more screen can be presented over all of that, bars included; until it is dismissed the
 /// stack below is out of reach of touch and keys.
@@ -72,6 +73,7 @@ class NavigationStack : public QWidget
     void keyPressEvent(QKeyEvent* event) override;
 
   private:
+    void goBack();
     void adopt(std::unique_ptr<Screen> screen);
     void release(Screen& screen);
     void replace(Screen& leaving, Transition::Kind kind, bool animated);

@@ -69,6 +69,11 @@ void TableRow::setKeyboardFrame(bool visible)
     update();
 }
 
+bool TableRow::scrollSideways(int)
+{
+    return false;
+}
+
 void TableRow::layoutSubviews()
 {
     const int taken = _accessory == TableRowAccessory::None ? rightMargin : accessoryWidth;

@@ -39,6 +39,10 @@ class TableRow : public QWidget
     bool hasKeyboardFrame() const { return _hasKeyboardFrame; }
     void setKeyboardFrame(bool visible);
 
+    /// Moves what is wider than the row by so many steps to the left, or to the right where they
+    /// are negative; false where there is no such thing.
+    virtual bool scrollSideways(int steps);
+
     /// Fits the content area into the row; called whenever the row's size changes.
     virtual void layoutSubviews();
 

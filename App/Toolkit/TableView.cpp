@@ -1,7 +1,13 @@
 #include "App/Toolkit/TableView.h"
 
+#include "App/Toolkit/TableAccessibility.h"
+
+#include <QAccessible>
 #include <QApplication>
+#include <QClipboard>
+#include <QContextMenuEvent>
 #include <QKeyEvent>
+#include <QMenu>
 #include <QMouseEvent>
 #include <QScrollBar>
 #include <QScroller>
@@ -22,6 +28,7 @@ constexpr int wheelStep = 20;
 
 TableView::TableView(QWidget* parent) : QAbstractScrollArea(parent)
 {
+    installTableAccessibility();
     setFrameShape(QFrame::NoFrame);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     setFocusPolicy(Qt::StrongFocus);
@@ -43,23 +50,44 @@ int TableView::contentHeight() const
     return static_cast<int>(std::min<qint64>(height, std::numeric_limits<int>::max()));
 }
 
-void TableView::reloadData()
+void TableView::reloadData(const RowMapping& newPlaceOf)
 {
-    _rowCount = _dataSource ? std::max(0, _dataSource->rowsInSection(0)) : 0;
+    const int former = verticalScrollBar()->value();
+    const auto top =
+        newPlaceOf && former > 0 ? newPlaceOf(former / rowHeight) : std::optional<int>();
+    if (newPlaceOf)
+        moveMarks(newPlaceOf);
     // To the front, the topmost one foremost: each row comes back to its own place.
-    for (auto row = _rows.rbegin(); row != _rows.rend(); ++row)
+    for (auto row = _rows.rbegin(); row != _rows.rend(); ++row) {
+        _dataSource->rowWillBeReused(*row->second);
         _reusable[row->second->reuseIdentifier()].push_front(std::move(row->second));
+    }
     _rows.clear();
-    const auto dropIfGone = [this](std::optional<int>& row) {
-        if (row && *row >= _rowCount)
-            row.reset();
-    };
-    dropIfGone(_selected);
-    dropIfGone(_pressed);
+    _rowCount = _dataSource ? std::max(0, _dataSource->rowsInSection(0)) : 0;
+    keepInRange();
+    updateScrollRange();
+    if (top)
+        verticalScrollBar()->setValue(*top * rowHeight + former % rowHeight);
+    layoutRows();
+}
+
+void TableView::moveMarks(const RowMapping& newPlaceOf)
+{
+    for (std::optional<int>* row : {&_selected, &_pressed})
+        if (*row)
+            *row = newPlaceOf(**row);
+    // The keyboard stays at its place where its row is gone.
+    if (_current)
+        _current = newPlaceOf(*_current).value_or(*_current);
+}
+
+void TableView::keepInRange()
+{
+    for (std::optional<int>* row : {&_selected, &_pressed})
+        if (*row && **row >= _rowCount)
+            row->reset();
     if (_current)
         _current = _rowCount > 0 ? std::optional(std::min(*_current, _rowCount - 1)) : std::nullopt;
-    updateScrollRange();
-    layoutRows();
 }
 
 std::unique_ptr<TableRow> TableView::dequeueReusableRow(const QString& identifier)
@@ -109,6 +137,7 @@ void TableView::layoutRows()
 
 void TableView::retire(std::unique_ptr<TableRow> row)
 {
+    _dataSource->rowWillBeReused(*row);
     _reusable[row->reuseIdentifier()].push_back(std::move(row));
 }
 
@@ -169,6 +198,18 @@ std::vector<TableRow*> TableView::visibleRows() const
     return result;
 }
 
+std::optional<IndexPath> TableView::indexPathForCurrentRow() const
+{
+    return _current ? std::optional(IndexPath{0, *_current}) : std::nullopt;
+}
+
+void TableView::copyRow(IndexPath indexPath) const
+{
+    const QString text = _dataSource->textForCopying(indexPath);
+    if (!text.isEmpty())
+        QGuiApplication::clipboard()->setText(text);
+}
+
 void TableView::resizeEvent(QResizeEvent*)
 {
     updateScrollRange();
@@ -221,6 +262,12 @@ void TableView::mouseReleaseEvent(QMouseEvent* event)
         updateLooks();
 }
 
+// Two quick clicks are two clicks.
+void TableView::mouseDoubleClickEvent(QMouseEvent* event)
+{
+    mousePressEvent(event);
+}
+
 void TableView::activate(int row)
 {
     _current = row;
@@ -254,15 +301,40 @@ std::optional<int> TableView::keyTarget(int key) const
 
 void TableView::keyPressEvent(QKeyEvent* event)
 {
-    const bool isPlain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
-    const auto target = isPlain ? keyTarget(event->key()) : std::nullopt;
-    const bool isEnter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-    if (target && _rowCount > 0)
-        moveTo(std::clamp(*target, 0, _rowCount - 1));
-    else if (isPlain && isEnter && _current)
-        activate(*_current);
-    else
+    if (_rowCount == 0 || !(useKey(*event) || (_current && useRowKey(*event, *_current))))
         event->ignore();
+}
+
+bool TableView::useKey(const QKeyEvent& event)
+{
+    const bool isPlain = (event.modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
+    const auto target = isPlain ? keyTarget(event.key()) : std::nullopt;
+    if (target)
+        moveTo(std::clamp(*target, 0, _rowCount - 1));
+    return target.has_value();
+}
+
+bool TableView::useRowKey(const QKeyEvent& event, int row)
+{
+    if (event.matches(QKeySequence::Copy)) {
+        copyRow({0, row});
+        return true;
+    }
+    if ((event.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
+        return false;
+    if (event.key() == Qt::Key_Return || event.key() == Qt::Key_Enter) {
+        activate(row);
+        return true;
+    }
+    return scrollSideways(row, event.key());
+}
+
+bool TableView::scrollSideways(int row, int key)
+{
+    TableRow* widget = rowAt({0, row});
+    if (!widget || (key != Qt::Key_Left && key != Qt::Key_Right))
+        return false;
+    return widget->scrollSideways(key == Qt::Key_Right ? 1 : -1);
 }
 
 void TableView::moveTo(int row)
@@ -271,6 +343,10 @@ void TableView::moveTo(int row)
     _showsKeyboardFrame = true;
     scrollTo(row);
     updateLooks();
+    if (TableRow* widget = rowAt({0, row})) {
+        QAccessibleEvent focused(widget, QAccessible::Focus);
+        QAccessible::updateAccessibility(&focused);
+    }
 }
 
 void TableView::scrollTo(int row)
@@ -279,6 +355,24 @@ void TableView::scrollTo(int row)
     const int value = verticalScrollBar()->value();
     const int highest = std::min(value, top);
     verticalScrollBar()->setValue(std::max(highest, top + rowHeight - viewport()->height()));
+}
+
+void TableView::contextMenuEvent(QContextMenuEvent* event)
+{
+    if (event->reason() == QContextMenuEvent::Mouse)
+        _current = rowAtPosition(event->pos());
+    if (!_current || _dataSource->textForCopying({0, *_current}).isEmpty())
+        return;
+    auto* menu = new QMenu(this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    QAction* copy = menu->addAction(QStringLiteral("Copy"));
+    copy->setShortcut(QKeySequence::Copy);
+    // The row may have moved by then, and the current one with it.
+    connect(copy, &QAction::triggered, this, [this] {
+        if (_current)
+            copyRow({0, *_current});
+    });
+    menu->popup(event->globalPos());
 }
 
 void TableView::focusInEvent(QFocusEvent*)

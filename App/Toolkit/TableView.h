@@ -5,6 +5,7 @@
 #include <QAbstractScrollArea>
 
 #include <deque>
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -31,12 +32,17 @@ class TableViewDataSource
     /// A row that is ready to be shown, reused where possible.
     virtual std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) = 0;
     virtual void rowSelected(TableView& table, std::optional<IndexPath> indexPath) = 0;
+    /// The row is about to be used again, for this place or for another one.
+    virtual void rowWillBeReused(TableRow&) {}
     /// What copying the row puts on the clipboard; nothing is copied where it is empty.
     virtual QString textForCopying(IndexPath) { return {}; }
 };
 
 /// A plain list of rows of one height in one section. Only the rows in view exist; those that leave
 /// it wait to be used again.
+///
+/// One row is the current one: the row touched last, or the one that the keyboard has gone to.
+/// Ctrl+C and the context menu copy it.
 class TableView : public QAbstractScrollArea
 {
   public:
@@ -49,8 +55,12 @@ class TableView : public QAbstractScrollArea
 
     void setDataSource(TableViewDataSource& dataSource) { _dataSource = &dataSource; }
 
-    /// Asks for everything anew; the scroll position stays.
-    void reloadData();
+    /// Where a former row stands now; none when it is gone.
+    using RowMapping = std::function<std::optional<int>(int)>;
+
+    /// Asks for everything anew; the scroll position stays. Selection, current row and the rows in
+    /// view go along with rows that have moved, where a mapping tells so.
+    void reloadData(const RowMapping& newPlaceOf = {});
     /// The height of all rows together, which may be more than the table's own.
     int contentHeight() const;
     /// A row that waits under that identifier, or none. While an unchanged table is reloaded, every
@@ -65,6 +75,9 @@ class TableView : public QAbstractScrollArea
     TableRow* rowAt(IndexPath indexPath) const;
     /// From the top down.
     std::vector<TableRow*> visibleRows() const;
+    std::optional<IndexPath> indexPathForCurrentRow() const;
+    /// Puts the row's text on the clipboard.
+    void copyRow(IndexPath indexPath) const;
 
   protected:
     void resizeEvent(QResizeEvent* event) override;
@@ -72,9 +85,11 @@ class TableView : public QAbstractScrollArea
     void mousePressEvent(QMouseEvent* event) override;
     void mouseMoveEvent(QMouseEvent* event) override;
     void mouseReleaseEvent(QMouseEvent* event) override;
+    void mouseDoubleClickEvent(QMouseEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
     void focusOutEvent(QFocusEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
 
   private:
     struct RowRange {
@@ -84,6 +99,8 @@ class TableView : public QAbstractScrollArea
     };
 
     RowRange rangeInView() const;
+    void moveMarks(const RowMapping& newPlaceOf);
+    void keepInRange();
     std::optional<int> rowAtPosition(const QPoint& position) const;
     void updateScrollRange();
     void layoutRows();
@@ -96,6 +113,9 @@ class TableView : public QAbstractScrollArea
     void moveTo(int row);
     void scrollTo(int row);
     std::optional<int> keyTarget(int key) const;
+    bool useKey(const QKeyEvent& event);
+    bool useRowKey(const QKeyEvent& event, int row);
+    bool scrollSideways(int row, int key);
 
     TableViewDataSource* _dataSource = nullptr;
     int _rowCount = 0;

@@ -16,6 +16,11 @@ namespace
 constexpr int chevronSpace = 28;
 constexpr int margin = 12;
 
+QFont titleFont()
+{
+    return systemFont(17, FontWeight::Bold);
+}
+
 QFont backFont()
 {
     return systemFont(15, FontWeight::Regular);
@@ -91,14 +96,21 @@ void TitleBar::resizeEvent(QResizeEvent*)
     placeBackButton();
 }
 
+QRect TitleBar::titleRect() const
+{
+    const int side = margin + (_back->isHidden() ? 0 : _back->width());
+    const QRect middle = rect().adjusted(side, 0, -side, -1);
+    const bool fits = measured(_title, titleFont()).width() <= middle.width();
+    return fits ? middle : rect().adjusted(side, 0, -margin, -1);
+}
+
 void TitleBar::paintEvent(QPaintEvent*)
 {
     QPainter painter(this);
     painter.fillRect(0, height() - 1, width(), 1, separatorColor(palette()));
     painter.setPen(palette().color(QPalette::WindowText));
-    painter.setFont(systemFont(17, FontWeight::Bold));
-    const int side = margin + (_back->isHidden() ? 0 : _back->width());
-    const QRect room = rect().adjusted(side, 0, -side, -1);
+    painter.setFont(titleFont());
+    const QRect room = titleRect();
     painter.drawText(room, Qt::AlignCenter | Qt::TextSingleLine,
                      painter.fontMetrics().elidedText(_title, Qt::ElideMiddle, room.width()));
 }

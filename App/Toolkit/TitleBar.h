@@ -28,6 +28,9 @@ class TitleBar : public QWidget
 
     void setTitle(const QString& title);
     const QString& title() const { return _title; }
+    /// Where the title is written: in the middle of the bar, or of what the way back leaves when it
+    /// is too long for that.
+    QRect titleRect() const;
     void showBackButton(const QString& previousTitle);
     void hideBackButton();
     BackButton& backButton() const { return *_back; }

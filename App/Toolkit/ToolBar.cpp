@@ -2,8 +2,11 @@
 
 #include "App/Toolkit/Separator.h"
 
+#include <QAbstractButton>
 #include <QHBoxLayout>
 #include <QPainter>
+
+#include <algorithm>
 
 namespace ventrik
 {
@@ -25,6 +28,11 @@ ToolBar::ToolBar(QWidget* parent) : QWidget(parent), _layout(new QHBoxLayout(thi
 
 void ToolBar::setItems(std::vector<ToolBarItem> items, bool animated)
 {
+    if (QAbstractButton* pressed = pressedButton()) {
+        setItemsOnRelease(*pressed, std::move(items), animated);
+        return;
+    }
+    const std::size_t focused = placeOfFocus();
     const bool fades = animated && isVisible();
     QPixmap before;
     if (fades)
@@ -33,8 +41,45 @@ void ToolBar::setItems(std::vector<ToolBarItem> items, bool animated)
     clear();
     for (ToolBarItem& item : items)
         add(std::move(item));
+    if (focused < _items.size())
+        giveFocus(_items[focused]);
     if (fades)
         _transition = new Transition(Transition::Kind::Fade, *this, std::move(before));
+}
+
+QAbstractButton* ToolBar::pressedButton() const
+{
+    for (QWidget* widget : _items)
+        if (auto* button = qobject_cast<QAbstractButton*>(widget); button && button->isDown())
+            return button;
+    return nullptr;
+}
+
+// The press is meant for the button that it began on.
+void ToolBar::setItemsOnRelease(QAbstractButton& pressed, std::vector<ToolBarItem> items,
+                                bool animated)
+{
+    _waitingItems = std::move(items);
+    pressed.disconnect(this);
+    connect(&pressed, &QAbstractButton::released, this,
+            [this, animated] { setItems(std::move(_waitingItems), animated); });
+}
+
+// The number of items where the keyboard is elsewhere.
+std::size_t ToolBar::placeOfFocus() const
+{
+    const auto focused =
+        std::ranges::find_if(_items, [](QWidget* item) { return item && item->hasFocus(); });
+    return static_cast<std::size_t>(focused - _items.begin());
+}
+
+// The layout would show the item only later, and what is hidden cannot have the keyboard.
+void ToolBar::giveFocus(QWidget* item)
+{
+    if (!item || item->focusPolicy() == Qt::NoFocus)
+        return;
+    item->show();
+    item->setFocus();
 }
 
 void ToolBar::clear()
@@ -42,6 +87,7 @@ void ToolBar::clear()
     while (QLayoutItem* item = _layout->takeAt(0)) {
         // Later, since the change may come from the click of one of these.
         if (QWidget* widget = item->widget()) {
+            widget->disconnect(this);
             widget->hide();
             widget->deleteLater();
         }

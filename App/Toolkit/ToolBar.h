@@ -8,6 +8,7 @@
 #include <memory>
 #include <vector>
 
+class QAbstractButton;
 class QHBoxLayout;
 
 namespace ventrik
@@ -35,7 +36,8 @@ class ToolBar : public QWidget
 
     explicit ToolBar(QWidget* parent = nullptr);
 
-    /// Replaces all items; a bar that nobody sees does so without animation.
+    /// Replaces all items; a bar that nobody sees does so without animation. The keyboard stays at
+    /// its place in the bar. While one of the bar's buttons is held down, the new items wait.
     void setItems(std::vector<ToolBarItem> items, bool animated);
 
     /// The widgets in their order, null for a flexible space.
@@ -45,11 +47,16 @@ class ToolBar : public QWidget
     void paintEvent(QPaintEvent* event) override;
 
   private:
+    QAbstractButton* pressedButton() const;
+    void setItemsOnRelease(QAbstractButton& pressed, std::vector<ToolBarItem> items, bool animated);
+    std::size_t placeOfFocus() const;
+    static void giveFocus(QWidget* item);
     void clear();
     void add(ToolBarItem item);
 
     QHBoxLayout* _layout;
     std::vector<QWidget*> _items;
+    std::vector<ToolBarItem> _waitingItems;
     QPointer<Transition> _transition;
 };
 

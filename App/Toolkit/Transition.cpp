@@ -1,6 +1,7 @@
 #include "App/Toolkit/Transition.h"
 
 #include <QPainter>
+#include <QStyle>
 #include <QVariantAnimation>
 
 namespace ventrik
@@ -14,6 +15,11 @@ constexpr int milliseconds = 220;
 constexpr qreal parallax = 0.3;
 
 } // namespace
+
+bool Transition::isWanted(const QWidget& widget)
+{
+    return widget.style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, &widget) > 0;
+}
 
 Transition::Transition(Kind kind, QWidget& covered, QPixmap before, QPixmap after)
     : QWidget(&covered), _kind(kind), _before(std::move(before)), _after(std::move(after))

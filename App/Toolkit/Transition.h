@@ -20,6 +20,9 @@ class Transition : public QWidget
         Sink, ///< the old look goes down off the new one
     };
 
+    /// False where the platform asks for less motion.
+    static bool isWanted(const QWidget& widget);
+
     /// Deletes itself at the end. `after` is not needed for a fade.
     Transition(Kind kind, QWidget& covered, QPixmap before, QPixmap after = {});
 

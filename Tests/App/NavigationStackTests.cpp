@@ -267,4 +267,46 @@ TEST_F(NavigationStackTest, AnimationsThatInterruptEachOtherLeaveTheRightScreen)
     EXPECT_TRUE(stack.topScreen().isVisible());
 }
 
+TEST_F(NavigationStackTest, ASwipeFromTheLeftEdgePopsOnce)
+{
+    showAt(stack, 400, 600);
+    push("A");
+    push("B");
+    dragFinger(stack, {5, 300}, {300, 310});
+    EXPECT_EQ(top(), "A");
+}
+
+TEST_F(NavigationStackTest, ADragOfTheMouseFromTheLeftEdgePopsToo)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    QTest::mousePress(&stack.topScreen(), Qt::LeftButton, {}, {23, 300});
+    QTest::mouseMove(&stack.topScreen(), {70, 300});
+    EXPECT_EQ(top(), "Child");
+    QTest::mouseMove(&stack.topScreen(), {71, 300});
+    EXPECT_EQ(top(), "Root");
+    QTest::mouseRelease(&stack.topScreen(), Qt::LeftButton, {}, {71, 300});
+}
+
+TEST_F(NavigationStackTest, OtherDragsDoNotPop)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    dragFinger(stack, {24, 300}, {300, 300}); // not from the edge
+    dragFinger(stack, {5, 100}, {100, 400});  // more down than right
+    dragFinger(stack, {5, 300}, {52, 300});   // too short
+    dragFinger(stack, {300, 300}, {5, 300});  // the other way
+    EXPECT_EQ(top(), "Child");
+}
+
+TEST_F(NavigationStackTest, ASwipeDoesNotReachBelowAPresentedScreen)
+{
+    showAt(stack, 400, 600);
+    push("Child");
+    const auto sheet = screen("Sheet");
+    stack.present(*sheet, true);
+    dragFinger(*sheet, {5, 300}, {300, 300});
+    EXPECT_EQ(top(), "Child");
+}
+
 } // namespace ventrik

@@ -1,9 +1,14 @@
 #include "App/Toolkit/TableView.h"
 #include "Tests/App/TestScreen.h"
 
+#include <QAccessible>
 #include <QApplication>
+#include <QClipboard>
+#include <QContextMenuEvent>
+#include <QMenu>
 #include <QScrollBar>
 #include <QTest>
+#include <QWheelEvent>
 
 #include <gmock/gmock.h>
 
@@ -21,7 +26,13 @@ class NumberedRow : public TableRow
 {
   public:
     explicit NumberedRow(const QString& identifier) : TableRow(Style::Default, identifier) {}
+    bool scrollSideways(int steps) override
+    {
+        sidewaysSteps += steps;
+        return true;
+    }
     int number = -1;
+    int sidewaysSteps = 0;
 };
 
 /// A table of 8 rows' height and any number of rows.
@@ -32,6 +43,7 @@ class TableViewTest : public testing::Test, public TableViewDataSource
     std::unique_ptr<TableRow> rowForIndexPath(TableView& asking, IndexPath indexPath) override
     {
         const QString identifier = indexPath.row % 2 == 1 && twoKinds ? "odd" : "plain";
+        ++asked;
         auto row = asking.dequeueReusableRow(identifier);
         if (!row) {
             row = std::make_unique<NumberedRow>(identifier);
@@ -39,6 +51,10 @@ class TableViewTest : public testing::Test, public TableViewDataSource
         }
         static_cast<NumberedRow&>(*row).number = indexPath.row;
         return row;
+    }
+    QString textForCopying(IndexPath indexPath) override
+    {
+        return QString("row %1").arg(indexPath.row);
     }
     void rowSelected(TableView&, std::optional<IndexPath> indexPath) override
     {
@@ -61,6 +77,20 @@ class TableViewTest : public testing::Test, public TableViewDataSource
         const TableRow* widget = table.rowAt({0, row});
         return widget ? static_cast<const NumberedRow*>(widget)->number : -1;
     }
+    // Reloads after a row was added above the others.
+    void reloadWithOneAbove()
+    {
+        ++count;
+        table.reloadData([](int row) { return row + 1; });
+    }
+    static QString clipboard() { return QGuiApplication::clipboard()->text(); }
+    void openContextMenu(QPoint position)
+    {
+        QContextMenuEvent event(QContextMenuEvent::Mouse, position,
+                                table.viewport()->mapToGlobal(position));
+        QCoreApplication::sendEvent(table.viewport(), &event);
+    }
+    QMenu* contextMenu() const { return table.findChild<QMenu*>(); }
     void click(int y) { QTest::mouseClick(table.viewport(), Qt::LeftButton, {}, {20, y}); }
     void key(Qt::Key pressed) { QTest::keyClick(&table, pressed); }
     std::optional<int> framedRow() const
@@ -73,6 +103,7 @@ class TableViewTest : public testing::Test, public TableViewDataSource
 
     int count = 0;
     int made = 0;
+    int asked = 0;
     bool twoKinds = false;
     std::vector<int> selections;
     TableView table{*this};
@@ -306,14 +337,7 @@ TEST_F(TableViewTest, EnterWithoutAPlaceSelectsNothing)
 TEST_F(TableViewTest, ATouchDragScrolls)
 {
     show(100);
-    auto* device = QTest::createTouchDevice();
-    QWidget* viewport = table.viewport();
-    QTest::touchEvent(viewport, device).press(0, {100, 300}, viewport);
-    for (int y = 290; y >= 100; y -= 10) {
-        QTest::qWait(5); // the scroller works with the speed
-        QTest::touchEvent(viewport, device).move(0, {100, y}, viewport);
-    }
-    QTest::touchEvent(viewport, device).release(0, {100, 100}, viewport);
+    dragFinger(*table.viewport(), {100, 300}, {100, 100});
     EXPECT_TRUE(QTest::qWaitFor([&] { return table.verticalScrollBar()->value() > 100; }));
     EXPECT_THAT(selections, IsEmpty());
 }
@@ -321,12 +345,195 @@ TEST_F(TableViewTest, ATouchDragScrolls)
 TEST_F(TableViewTest, ATapSelects)
 {
     show(100);
-    auto* device = QTest::createTouchDevice();
     QWidget* viewport = table.viewport();
-    QTest::touchEvent(viewport, device).press(0, {100, 60}, viewport);
-    QTest::touchEvent(viewport, device).release(0, {100, 60}, viewport);
+    QTest::touchEvent(viewport, touchScreen()).press(0, {100, 60}, viewport);
+    QTest::touchEvent(viewport, touchScreen()).release(0, {100, 60}, viewport);
     EXPECT_TRUE(QTest::qWaitFor([&] { return !selections.empty(); }));
     EXPECT_THAT(selections, ElementsAre(1));
+}
+
+TEST_F(TableViewTest, AReloadOfTenThousandRowsAsksForThoseInViewOnly)
+{
+    show(10'000);
+    asked = 0;
+    table.reloadData();
+    EXPECT_EQ(asked, 8);
+    EXPECT_EQ(made, 8);
+}
+
+TEST_F(TableViewTest, WithoutADataSourceItIsEmpty)
+{
+    TableView empty;
+    showAt(empty, 300, 100);
+    empty.reloadData();
+    EXPECT_EQ(empty.contentHeight(), 0);
+    EXPECT_THAT(empty.visibleRows(), IsEmpty());
+}
+
+TEST_F(TableViewTest, TheContentIsAsHighAsAllItsRows)
+{
+    show(20);
+    EXPECT_EQ(table.contentHeight(), 1'000);
+}
+
+TEST_F(TableViewTest, SelectionAndCurrentRowGoAlongWithARowThatMoves)
+{
+    show(5);
+    click(160);
+    reloadWithOneAbove();
+    EXPECT_EQ(table.indexPathForSelectedRow(), (IndexPath{0, 4}));
+    EXPECT_EQ(table.indexPathForCurrentRow(), (IndexPath{0, 4}));
+    EXPECT_TRUE(table.rowAt({0, 4})->isSelected());
+    EXPECT_FALSE(table.rowAt({0, 3})->isSelected());
+}
+
+TEST_F(TableViewTest, ASelectedRowThatIsGoneIsNoLongerSelected)
+{
+    show(5);
+    click(160);
+    table.reloadData([](int) { return std::nullopt; });
+    EXPECT_FALSE(table.indexPathForSelectedRow());
+    EXPECT_EQ(table.indexPathForCurrentRow(), (IndexPath{0, 3}));
+}
+
+TEST_F(TableViewTest, AScrolledTableFollowsItsTopmostRow)
+{
+    show(100);
+    table.verticalScrollBar()->setValue(1'234);
+    reloadWithOneAbove();
+    EXPECT_EQ(table.verticalScrollBar()->value(), 1'284);
+}
+
+TEST_F(TableViewTest, ATableAtItsTopShowsARowThatIsAddedThere)
+{
+    show(100);
+    reloadWithOneAbove();
+    EXPECT_EQ(table.verticalScrollBar()->value(), 0);
+}
+
+TEST_F(TableViewTest, AReloadUnderThePressedButtonLeavesTheRowToTheClick)
+{
+    show(5);
+    QTest::mousePress(table.viewport(), Qt::LeftButton, {}, {20, 60});
+    table.reloadData();
+    EXPECT_TRUE(table.rowAt({0, 1})->isSelected());
+    QTest::mouseRelease(table.viewport(), Qt::LeftButton, {}, {20, 60});
+    EXPECT_THAT(selections, ElementsAre(1));
+}
+
+TEST_F(TableViewTest, ARowThatMovesAwayFromUnderThePressedButtonIsNotSelected)
+{
+    show(5);
+    QTest::mousePress(table.viewport(), Qt::LeftButton, {}, {20, 60});
+    reloadWithOneAbove();
+    QTest::mouseRelease(table.viewport(), Qt::LeftButton, {}, {20, 60});
+    EXPECT_THAT(selections, IsEmpty());
+}
+
+TEST_F(TableViewTest, AReloadUnderTheFingerDoesNotEndTheTap)
+{
+    show(100);
+    QWidget* viewport = table.viewport();
+    QTest::touchEvent(viewport, touchScreen()).press(0, {100, 160}, viewport);
+    table.reloadData();
+    QTest::touchEvent(viewport, touchScreen()).release(0, {100, 160}, viewport);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return !selections.empty(); }));
+    EXPECT_THAT(selections, ElementsAre(3));
+}
+
+TEST_F(TableViewTest, TheWheelScrolls)
+{
+    show(100);
+    QWheelEvent event({20, 20}, table.mapToGlobal(QPointF(20, 20)), {}, {0, -120}, Qt::NoButton, {},
+                      Qt::NoScrollPhase, false);
+    QCoreApplication::sendEvent(table.viewport(), &event);
+    EXPECT_GT(table.verticalScrollBar()->value(), 0);
+}
+
+TEST_F(TableViewTest, LeftAndRightMoveTheCurrentRowSideways)
+{
+    show(5);
+    key(Qt::Key_Down);
+    for (const Qt::Key pressed : {Qt::Key_Right, Qt::Key_Right, Qt::Key_Right, Qt::Key_Left})
+        key(pressed);
+    EXPECT_EQ(static_cast<NumberedRow*>(table.rowAt({0, 0}))->sidewaysSteps, 2);
+    EXPECT_EQ(static_cast<NumberedRow*>(table.rowAt({0, 1}))->sidewaysSteps, 0);
+}
+
+TEST_F(TableViewTest, CopyTakesTheCurrentRow)
+{
+    show(5);
+    QGuiApplication::clipboard()->setText("before");
+    QTest::keySequence(&table, QKeySequence::Copy);
+    EXPECT_EQ(clipboard(), "before");
+    click(160);
+    QTest::keySequence(&table, QKeySequence::Copy);
+    EXPECT_EQ(clipboard(), "row 3");
+}
+
+TEST_F(TableViewTest, TheContextMenuCopiesTheRowUnderThePointerAndLeavesItsLook)
+{
+    show(5);
+    openContextMenu({20, 110});
+    ASSERT_NE(contextMenu(), nullptr);
+    EXPECT_FALSE(table.rowAt({0, 2})->isSelected());
+    EXPECT_FALSE(table.rowAt({0, 2})->hasKeyboardFrame());
+    ASSERT_EQ(contextMenu()->actions().size(), 1);
+    contextMenu()->actions().front()->trigger();
+    EXPECT_EQ(clipboard(), "row 2");
+    EXPECT_THAT(selections, IsEmpty());
+    contextMenu()->close();
+}
+
+TEST_F(TableViewTest, BelowTheLastRowThereIsNoContextMenu)
+{
+    show(2);
+    openContextMenu({20, 150});
+    EXPECT_EQ(contextMenu(), nullptr);
+}
+
+TEST_F(TableViewTest, IsAListOfItemsToAssistiveTechnology)
+{
+    show(3);
+    table.rowAt({0, 1})->setAccessibleName("Cell");
+    table.rowAt({0, 1})->setAccessory(TableRowAccessory::DisclosureIndicator);
+    QAccessibleInterface* list = QAccessible::queryAccessibleInterface(&table);
+    ASSERT_EQ(list->role(), QAccessible::List);
+    ASSERT_EQ(list->childCount(), 3);
+    EXPECT_EQ(list->child(3), nullptr);
+    QAccessibleInterface* item = list->child(1);
+    EXPECT_EQ(item->role(), QAccessible::ListItem);
+    EXPECT_EQ(item->text(QAccessible::Name), "Cell");
+    EXPECT_EQ(item->text(QAccessible::Description), "opens a list");
+    EXPECT_EQ(item->parent(), list);
+    EXPECT_EQ(list->indexOfChild(item), 1);
+    EXPECT_EQ(list->child(0)->text(QAccessible::Description), "");
+}
+
+TEST_F(TableViewTest, TellsAssistiveTechnologyWhichRowIsSelectedAndWhichHasTheKeyboard)
+{
+    show(3);
+    click(60);
+    key(Qt::Key_Down);
+    const auto state = [this](int row) {
+        return QAccessible::queryAccessibleInterface(table.rowAt({0, row}))->state();
+    };
+    EXPECT_TRUE(state(1).selected);
+    EXPECT_FALSE(state(1).focused);
+    EXPECT_FALSE(state(2).selected);
+    EXPECT_TRUE(state(2).focused);
+}
+
+TEST_F(TableViewTest, TwoQuickTapsAreTwoTaps)
+{
+    show(5);
+    QWidget* viewport = table.viewport();
+    for (int i = 0; i < 2; ++i) {
+        QTest::touchEvent(viewport, touchScreen()).press(0, {100, 210}, viewport);
+        QTest::touchEvent(viewport, touchScreen()).release(0, {100, 210}, viewport);
+    }
+    EXPECT_TRUE(QTest::qWaitFor([this] { return selections.size() == 2; }));
+    EXPECT_THAT(selections, ElementsAre(4, 4));
 }
 
 } // namespace ventrik

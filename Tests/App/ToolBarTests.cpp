@@ -90,4 +90,32 @@ TEST(ActivityIndicator, TurnsOnlyWhileItIsSeen)
     EXPECT_TRUE(indicator->isAnimating());
 }
 
+TEST(ToolBar, NewItemsWaitUntilAPressedButtonIsReleased)
+{
+    ToolBar bar;
+    int clicks = 0;
+    auto button = std::make_unique<QPushButton>("Go");
+    QPushButton* pressed = button.get();
+    QObject::connect(pressed, &QPushButton::clicked, [&clicks] { ++clicks; });
+    bar.setItems(buttonAtTheRight(std::move(button)), false);
+    showAt(bar, 500, ToolBar::barHeight);
+    QTest::mousePress(pressed, Qt::LeftButton);
+    bar.setItems(buttonAtTheRight(std::make_unique<QPushButton>("First")), false);
+    bar.setItems(buttonAtTheRight(std::make_unique<QPushButton>("Second")), false);
+    EXPECT_EQ(bar.items()[1], pressed);
+    QTest::mouseRelease(pressed, Qt::LeftButton);
+    EXPECT_EQ(clicks, 1);
+    EXPECT_EQ(dynamic_cast<QPushButton&>(*bar.items()[1]).text(), "Second");
+}
+
+TEST(ToolBar, TheKeyboardStaysAtItsPlace)
+{
+    ToolBar bar;
+    bar.setItems(buttonAtTheRight(std::make_unique<QPushButton>("Go")), false);
+    showAt(bar, 500, ToolBar::barHeight);
+    bar.items()[1]->setFocus();
+    bar.setItems(buttonAtTheRight(std::make_unique<QPushButton>("Go")), false);
+    EXPECT_TRUE(bar.items()[1]->hasFocus());
+}
+
 } // namespace ventrik

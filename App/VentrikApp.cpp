@@ -63,6 +63,8 @@ void VentrikApp::createWindow()
 {
     _window = std::make_unique<QWidget>();
     _window->setWindowTitle(QStringLiteral("Ventrik"));
+    // The texts and the names on the air are written that way, whatever the desktop's language is.
+    _window->setLayoutDirection(Qt::LeftToRight);
     if (_options.windowSize)
         _window->resize(*_options.windowSize);
     else

@@ -21,6 +21,7 @@ struct VentrikAppOptions {
     bool saveButton = false;       ///< offers Save also where the marker path is missing
     std::string snapshotDirectory; ///< where Save writes
     bool animation = true;
+    bool tintsChanges = true;        ///< tints values that have changed for a moment
     std::optional<QSize> windowSize; ///< none: as large as the main screen
 };
 
@@ -64,6 +65,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
         _updateMessage = std::move(message);
     }
     bool allowSaveButton() const override { return _allowSaveButton; }
+    bool tintsChanges() const override { return _options.tintsChanges; }
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
 
   private:

@@ -2,8 +2,11 @@
 
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/HorizontalScrollView.h"
+#include "App/Toolkit/Transition.h"
 
 #include <QLabel>
+#include <QPainter>
+#include <QTimerEvent>
 
 namespace ventrik
 {
@@ -17,6 +20,9 @@ constexpr int gapBesideKey = 50;
 // What the key and the value need beside their own widths.
 constexpr int roomAroundKey = leftMargin + gapBesideKey;
 constexpr int scrolledHeight = 50;
+constexpr int sidewaysStep = 40;
+constexpr int tintMilliseconds = 900;
+constexpr int tintMargin = 5;
 
 QFont boldFont()
 {
@@ -50,6 +56,8 @@ std::unique_ptr<VentrikCell> VentrikCell::initWithStyle(Style style, const QStri
 
 void VentrikCell::setKeyText(const QString& text)
 {
+    if (text != _key->text())
+        endTint(); // it was another node's value
     _key->setText(text);
     updateAccessibleName();
 }
@@ -60,6 +68,52 @@ void VentrikCell::setValueText(const QString& text)
         return;
     _value->setText(text);
     updateAccessibleName();
+}
+
+void VentrikCell::tintValue()
+{
+    if (!_value || !Transition::isWanted(*this))
+        return;
+    _tintTimer.start(tintMilliseconds, this);
+    update();
+}
+
+void VentrikCell::endTint()
+{
+    _tintTimer.stop();
+    update();
+}
+
+void VentrikCell::timerEvent(QTimerEvent* event)
+{
+    if (event->timerId() == _tintTimer.timerId())
+        endTint();
+    else
+        TableRow::timerEvent(event);
+}
+
+void VentrikCell::paintEvent(QPaintEvent* event)
+{
+    TableRow::paintEvent(event);
+    if (!isTinted() || isSelected())
+        return;
+    QColor tint = palette().color(QPalette::Highlight);
+    tint.setAlphaF(0.22F);
+    QPainter painter(this);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(tint);
+    painter.drawRoundedRect(QRect(_value->mapTo(this, QPoint()), _value->size())
+                                .adjusted(-tintMargin, -tintMargin, tintMargin, tintMargin),
+                            tintMargin, tintMargin);
+}
+
+bool VentrikCell::scrollSideways(int steps)
+{
+    if (!_view || _view->contentSize().width() <= _view->width())
+        return false;
+    _view->setContentOffset(_view->contentOffset() + steps * sidewaysStep);
+    return true;
 }
 
 void VentrikCell::updateAccessibleName()

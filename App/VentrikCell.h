@@ -2,6 +2,8 @@
 
 #include "App/Toolkit/TableRow.h"
 
+#include <QBasicTimer>
+
 #include <memory>
 
 class QLabel;
@@ -13,7 +15,7 @@ class HorizontalScrollView;
 
 /// A row of a pane: a bold name on the left and, for a leaf, its value beside it, to be moved
 /// sideways where it does not fit. A row keeps the structure it was made with, also when it is used
-/// again for a node of the other kind.
+/// again for a node of the other kind. A value that has just changed is tinted for a moment.
 class VentrikCell : public TableRow
 {
   public:
@@ -30,12 +32,20 @@ class VentrikCell : public TableRow
     void setKeyText(const QString& text);
     /// Does nothing in a row that has no value.
     void setValueText(const QString& text);
+    /// Tints the value for a moment, unless the platform asks for less motion.
+    void tintValue();
+    bool isTinted() const { return _tintTimer.isActive(); }
 
     /// Lays out the key alone, or both; the row keeps to it when its size changes.
     void setLayoutKey();
     void setLayout();
 
+    bool scrollSideways(int steps) override;
     void layoutSubviews() override;
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+    void timerEvent(QTimerEvent* event) override;
 
   private:
     enum class Layout { None, Key, KeyAndValue };
@@ -44,12 +54,14 @@ class VentrikCell : public TableRow
 
     void placeKey();
     void placeValue();
+    void endTint();
     void updateAccessibleName();
 
     QLabel* _key = nullptr;
     QLabel* _value = nullptr;
     HorizontalScrollView* _view = nullptr;
     Layout _layout = Layout::None;
+    QBasicTimer _tintTimer;
 };
 
 } // namespace ventrik

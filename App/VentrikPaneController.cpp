@@ -2,11 +2,14 @@
 
 #include "App/Toolkit/ActivityIndicator.h"
 #include "App/Toolkit/Fonts.h"
+#include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "App/VentrikCell.h"
 
 #include <QLabel>
 #include <QPushButton>
+
+#include <utility>
 
 namespace ventrik
 {
@@ -44,9 +47,46 @@ std::unique_ptr<QWidget> makeStatusLabel(const std::string& status)
 std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
 {
     auto button = std::make_unique<QPushButton>(QStringLiteral("Save"));
+    button->setShortcut(QKeySequence::Save);
+    button->setAutoDefault(true); // Enter presses it as Space does
     QObject::connect(button.get(), &QPushButton::clicked, button.get(),
                      [&host] { host.showSaveView(); });
     return button;
+}
+
+const VentrikModelNode::Children& childrenOf(const ModelNodePointer& node)
+{
+    static const VentrikModelNode::Children none;
+    const auto* childNodes = node ? node->childNodes() : nullptr;
+    return childNodes ? *childNodes : none;
+}
+
+// The child of that name nearest to a place. Rows seldom move: the first look finds it as a rule.
+std::optional<int> nearestNamed(const VentrikModelNode::Children& children, const std::string& name,
+                                int place)
+{
+    const int count = static_cast<int>(children.size());
+    const auto isIt = [&](int row) {
+        return row >= 0 && row < count &&
+               children[static_cast<std::size_t>(row)]->displayName() == name;
+    };
+    for (int away = 0; place - away >= 0 || place + away < count; ++away)
+        for (const int row : {place - away, place + away})
+            if (isIt(row))
+                return row;
+    return std::nullopt;
+}
+
+// Where the rows of one node are in another one.
+TableView::RowMapping mappingBetween(const ModelNodePointer& from, const ModelNodePointer& to)
+{
+    return [from, to](int row) -> std::optional<int> {
+        const auto& former = childrenOf(from);
+        const auto place = static_cast<std::size_t>(row);
+        if (place >= former.size())
+            return std::nullopt;
+        return nearestNamed(childrenOf(to), former[place]->displayName(), row);
+    };
 }
 
 // Rows of both kinds share one identifier, so that a row may come back with the other structure.
@@ -57,7 +97,7 @@ std::unique_ptr<VentrikCell> dequeueCell(TableView& table)
         static_cast<VentrikCell*>(table.dequeueReusableRow(identifier()).release()));
 }
 
-std::unique_ptr<TableRow> innerRow(TableView& table, const VentrikModelNode& node)
+std::unique_ptr<VentrikCell> innerRow(TableView& table, const VentrikModelNode& node)
 {
     auto cell = dequeueCell(table);
     if (!cell)
@@ -69,7 +109,7 @@ std::unique_ptr<TableRow> innerRow(TableView& table, const VentrikModelNode& nod
     return cell;
 }
 
-std::unique_ptr<TableRow> leafRow(TableView& table, const VentrikModelNode& node)
+std::unique_ptr<VentrikCell> leafRow(TableView& table, const VentrikModelNode& node)
 {
     auto cell = dequeueCell(table);
     if (!cell)
@@ -116,9 +156,10 @@ void VentrikPaneController::setStatus(const std::string& status, bool isLoading)
 
 void VentrikPaneController::reloadWithNode(ModelNodePointer node)
 {
-    _nodes = std::move(node);
+    _formerNodes = std::exchange(_nodes, std::move(node));
     updateTitle();
-    table().reloadData();
+    table().reloadData(mappingBetween(_formerNodes, _nodes));
+    _formerNodes = nullptr;
     createToolbarItems();
 }
 
@@ -144,9 +185,7 @@ void VentrikPaneController::viewWillDisappear(bool)
 
 const VentrikModelNode::Children& VentrikPaneController::children() const
 {
-    static const VentrikModelNode::Children none;
-    const auto* childNodes = _nodes ? _nodes->childNodes() : nullptr;
-    return childNodes ? *childNodes : none;
+    return childrenOf(_nodes);
 }
 
 const ModelNodePointer& VentrikPaneController::childAt(IndexPath indexPath) const
@@ -163,7 +202,42 @@ std::unique_ptr<TableRow> VentrikPaneController::rowForIndexPath(TableView& tabl
                                                                  IndexPath indexPath)
 {
     const VentrikModelNode& child = *childAt(indexPath);
-    return child.childNodes() ? innerRow(table, child) : leafRow(table, child);
+    auto cell = child.childNodes() ? innerRow(table, child) : leafRow(table, child);
+    if (HorizontalScrollView* view = cell->view()) {
+        const auto offset = _contentOffsets.find(cell->key().text());
+        view->setContentOffset(offset == _contentOffsets.end() ? 0 : offset->second);
+    }
+    if (_host.tintsChanges() && hasChanged(child, indexPath.row))
+        cell->tintValue();
+    return cell;
+}
+
+void VentrikPaneController::rowWillBeReused(TableRow& row)
+{
+    const auto& cell = static_cast<VentrikCell&>(row);
+    if (!cell.view())
+        return;
+    if (cell.view()->contentOffset() > 0)
+        _contentOffsets[cell.key().text()] = cell.view()->contentOffset();
+    else
+        _contentOffsets.erase(cell.key().text());
+}
+
+// Does the leaf show something else than before the reload?
+bool VentrikPaneController::hasChanged(const VentrikModelNode& leaf, int row) const
+{
+    const auto& former = childrenOf(_formerNodes);
+    const auto place = nearestNamed(former, leaf.displayName(), row);
+    const std::string* before = place ? former[static_cast<std::size_t>(*place)]->value() : nullptr;
+    return before && leaf.value() && *before != *leaf.value();
+}
+
+QString VentrikPaneController::textForCopying(IndexPath indexPath)
+{
+    const VentrikModelNode& child = *childAt(indexPath);
+    const std::string text =
+        child.value() ? child.displayName() + ": " + *child.value() : child.displayName();
+    return QString::fromStdString(text);
 }
 
 void VentrikPaneController::rowSelected(TableView& table, std::optional<IndexPath> indexPath)

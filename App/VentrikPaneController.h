@@ -3,6 +3,7 @@
 #include "App/Toolkit/TableScreen.h"
 #include "Model/VentrikModelNode.h"
 
+#include <map>
 #include <memory>
 #include <string>
 
@@ -16,6 +17,8 @@ class VentrikPaneHost
     virtual ~VentrikPaneHost() = default;
     virtual bool allowSaveButton() const = 0;
     virtual void showSaveView() = 0;
+    /// Whether values that have changed are tinted for a moment.
+    virtual bool tintsChanges() const = 0;
 };
 
 /// A screen that shows the children of one node of the display tree, with the status below. A touch
@@ -38,6 +41,9 @@ class VentrikPaneController : public TableScreen
     int rowsInSection(int section) override;
     std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) override;
     void rowSelected(TableView& table, std::optional<IndexPath> indexPath) override;
+    void rowWillBeReused(TableRow& row) override;
+    /// "name: value", or the name of an inner node.
+    QString textForCopying(IndexPath indexPath) override;
 
   private:
     VentrikPaneController(VentrikPaneHost& host, ModelNodePointer node, std::string path);
@@ -45,9 +51,13 @@ class VentrikPaneController : public TableScreen
     void updateTitle();
     const VentrikModelNode::Children& children() const;
     const ModelNodePointer& childAt(IndexPath indexPath) const;
+    bool hasChanged(const VentrikModelNode& leaf, int row) const;
 
     VentrikPaneHost& _host;
     ModelNodePointer _nodes;
+    ModelNodePointer _formerNodes; // while the table is reloaded
+    // How far long values are moved, by name: their rows come and go with the scrolling.
+    std::map<QString, int> _contentOffsets;
     std::string _keyPath;
     std::string _status;
     bool _isLoading = true;

@@ -27,7 +27,7 @@ namespace
 
 constexpr const char* usage =
     "usage: ventrik [--demo TECHNOLOGY] [--save-button] [--snapshot-directory DIR]\n"
-    "               [--size WIDTHxHEIGHT] [--no-animation] [--verbose]\n"
+    "               [--size WIDTHxHEIGHT] [--no-animation] [--plain] [--verbose]\n"
     "\n"
     "Shows what the baseband tells, as a tree of tables that is brought up to date every 2 s.\n"
     "\n"
@@ -36,6 +36,7 @@ constexpr const char* usage =
     "  --snapshot-directory DIR  saves snapshots in DIR\n"
     "  --size WIDTHxHEIGHT       the window's size (default: that of the main screen)\n"
     "  --no-animation            every change shows at once\n"
+    "  --plain                   no animation, and values that have changed are not tinted\n"
     "  --verbose                 copies the system log to standard error\n"
     "  --help, --version\n"
     "\n"
@@ -82,6 +83,7 @@ ViewerOptions parseArguments(int argc, char** argv)
                                      {"size", required_argument, nullptr, 'z'},
                                      {"save-button", no_argument, nullptr, 'b'},
                                      {"no-animation", no_argument, nullptr, 'n'},
+                                     {"plain", no_argument, nullptr, 'p'},
                                      {"verbose", no_argument, nullptr, 'V'},
                                      {"help", no_argument, nullptr, 'h'},
                                      {"version", no_argument, nullptr, 'v'},
@@ -100,6 +102,8 @@ ViewerOptions parseArguments(int argc, char** argv)
             result.app.saveButton = true;
         else if (letter == 'n')
             result.app.animation = false;
+        else if (letter == 'p')
+            result.app.animation = result.app.tintsChanges = false;
         else if (letter == 'V')
             result.verbose = true;
         else

@@ -380,4 +380,23 @@ TEST_F(VentrikAppTest, AnApplicationThatEndsBeforeItsFirstTurnStartsNoModel)
     EXPECT_EQ(fake.telephony.creationCount(), 0U);
 }
 
+TEST_F(VentrikAppTest, TheWindowIsLaidOutFromLeftToRightOnEveryDesktop)
+{
+    QGuiApplication::setLayoutDirection(Qt::RightToLeft);
+    launchAndConnect();
+    refreshWithData();
+    QCoreApplication::processEvents();
+    QGuiApplication::setLayoutDirection(Qt::LeftToRight);
+    EXPECT_EQ(app.window()->layoutDirection(), Qt::LeftToRight);
+    EXPECT_EQ(pane(0).toolbar().items().at(1)->x(), 12);
+}
+
+TEST_F(VentrikAppTest, PlainValuesAreNotTinted)
+{
+    EXPECT_TRUE(app.tintsChanges());
+    VentrikAppOptions options;
+    options.tintsChanges = false;
+    EXPECT_FALSE(VentrikApp(fake.platform(), options).tintsChanges());
+}
+
 } // namespace ventrik

@@ -5,6 +5,8 @@
 #include <QFontMetrics>
 #include <QGuiApplication>
 #include <QLabel>
+#include <QProxyStyle>
+#include <QTest>
 
 #include <gtest/gtest.h>
 
@@ -31,6 +33,19 @@ int boldHeight()
 {
     return QFontMetrics(font15(true)).height();
 }
+
+/// A platform that asks for less motion.
+class StillStyle : public QProxyStyle
+{
+  public:
+    int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                  QStyleHintReturn* result) const override
+    {
+        return hint == SH_Widget_Animation_Duration
+                   ? 0
+                   : QProxyStyle::styleHint(hint, option, widget, result);
+    }
+};
 
 class VentrikCellTest : public testing::Test
 {
@@ -172,6 +187,69 @@ TEST_F(VentrikCellTest, TextsAreNeverTakenForMarkup)
     leaf("<b>A&B</b>", "<img src=x>", 300);
     EXPECT_EQ(cell->key().textFormat(), Qt::PlainText);
     EXPECT_EQ(cell->value()->textFormat(), Qt::PlainText);
+}
+
+TEST_F(VentrikCellTest, StepsMoveALongValueSideways)
+{
+    leaf(name, longValue, 300);
+    EXPECT_TRUE(cell->scrollSideways(3));
+    EXPECT_EQ(cell->view()->contentOffset(), 120);
+    EXPECT_TRUE(cell->scrollSideways(-1));
+    EXPECT_EQ(cell->view()->contentOffset(), 80);
+}
+
+TEST_F(VentrikCellTest, WhatFitsDoesNotMoveSideways)
+{
+    leaf(name, shortValue, 500);
+    EXPECT_FALSE(cell->scrollSideways(1));
+    inner(name, 500);
+    EXPECT_FALSE(cell->scrollSideways(1));
+}
+
+TEST_F(VentrikCellTest, ATintGoesAwayByItself)
+{
+    leaf(name, shortValue, 300);
+    const QImage before = cell->grab().toImage();
+    cell->tintValue();
+    EXPECT_TRUE(cell->isTinted());
+    EXPECT_NE(cell->grab().toImage(), before);
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !cell->isTinted(); }));
+    EXPECT_EQ(cell->grab().toImage(), before);
+}
+
+TEST_F(VentrikCellTest, ATintDoesNotGoAlongToAnotherName)
+{
+    leaf(name, shortValue, 300);
+    cell->tintValue();
+    cell->setKeyText(name);
+    EXPECT_TRUE(cell->isTinted());
+    cell->setKeyText("Other");
+    EXPECT_FALSE(cell->isTinted());
+}
+
+TEST_F(VentrikCellTest, NothingIsTintedWhereThePlatformAsksForLessMotion)
+{
+    leaf(name, shortValue, 300);
+    StillStyle style;
+    cell->setStyle(&style);
+    cell->tintValue();
+    EXPECT_FALSE(cell->isTinted());
+}
+
+TEST_F(VentrikCellTest, ARowWithoutAValueIsNeverTinted)
+{
+    inner(name, 300);
+    cell->tintValue();
+    EXPECT_FALSE(cell->isTinted());
+}
+
+TEST_F(VentrikCellTest, TheLayoutIsTheSameFromRightToLeft)
+{
+    QGuiApplication::setLayoutDirection(Qt::RightToLeft);
+    leaf(name, shortValue, 500);
+    QGuiApplication::setLayoutDirection(Qt::LeftToRight);
+    EXPECT_EQ(cell->key().x(), 10);
+    EXPECT_EQ(cell->value()->x(), 500 - boldWidth(shortValue));
 }
 
 } // namespace ventrik

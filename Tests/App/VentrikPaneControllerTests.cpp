@@ -4,6 +4,8 @@
 #include "App/VentrikPaneController.h"
 #include "Tests/App/TestScreen.h"
 
+#include <QClipboard>
+#include <QGuiApplication>
 #include <QLabel>
 #include <QPushButton>
 #include <QScrollBar>
@@ -32,6 +34,7 @@ class PaneTest : public testing::Test, public VentrikPaneHost
   protected:
     bool allowSaveButton() const override { return savesAllowed; }
     void showSaveView() override { ++savePresses; }
+    bool tintsChanges() const override { return changesTinted; }
 
     void open(ModelNodePointer node, std::string path = "/")
     {
@@ -62,6 +65,7 @@ class PaneTest : public testing::Test, public VentrikPaneHost
     }
 
     bool savesAllowed = false;
+    bool changesTinted = true;
     int savePresses = 0;
     VentrikPaneController* root = nullptr;
     std::unique_ptr<NavigationStack> stack;
@@ -283,14 +287,7 @@ TEST_F(PaneTest, AnUprightTouchDragOverLongValuesScrollsTheTable)
     for (int i = 0; i < 40; ++i)
         leaves.push_back(leaf(std::to_string(i), std::string(200, 'x')));
     open(inner("Ventrik", std::move(leaves)));
-    auto* device = QTest::createTouchDevice();
-    QWidget* viewport = root->table().viewport();
-    QTest::touchEvent(viewport, device).press(0, {200, 400}, viewport);
-    for (int y = 390; y >= 100; y -= 10) {
-        QTest::qWait(5); // the scroller works with the speed
-        QTest::touchEvent(viewport, device).move(0, {200, y}, viewport);
-    }
-    QTest::touchEvent(viewport, device).release(0, {200, 100}, viewport);
+    dragFinger(*root->table().viewport(), {200, 400}, {200, 100});
     const QScrollBar& bar = *root->table().verticalScrollBar();
     EXPECT_TRUE(QTest::qWaitFor([&] { return bar.value() > 100; }));
 }
@@ -298,14 +295,8 @@ TEST_F(PaneTest, AnUprightTouchDragOverLongValuesScrollsTheTable)
 TEST_F(PaneTest, ASidewaysTouchDragScrollsTheLongValue)
 {
     open(inner("Ventrik", {leaf("Mode", std::string(200, 'x'))}));
-    auto* device = QTest::createTouchDevice();
     HorizontalScrollView* view = cell(0).view();
-    QTest::touchEvent(view, device).press(0, {400, 25}, view);
-    for (int x = 390; x >= 100; x -= 10) {
-        QTest::qWait(5);
-        QTest::touchEvent(view, device).move(0, {x, 25}, view);
-    }
-    QTest::touchEvent(view, device).release(0, {100, 25}, view);
+    dragFinger(*view, {400, 25}, {100, 25});
     EXPECT_TRUE(QTest::qWaitFor([&] { return view->contentOffset() > 100; }));
 }
 
@@ -322,6 +313,136 @@ TEST_F(PaneTest, AnOpenedPaneHasTheKeyboardFocus)
     open(inner("Ventrik", {inner("Cell")}));
     click(0);
     EXPECT_TRUE(top().table().hasFocus());
+}
+
+TEST_F(PaneTest, ControlSPressesSaveWhereItIsAllowed)
+{
+    open(nullptr);
+    QTest::keySequence(&root->table(), QKeySequence::Save);
+    savesAllowed = true;
+    root->createToolbarItems();
+    QCoreApplication::processEvents();
+    QTest::keySequence(&root->table(), QKeySequence::Save);
+    EXPECT_TRUE(QTest::qWaitFor([this] { return savePresses == 1; }));
+}
+
+TEST_F(PaneTest, AReloadDuringAPressOfSaveDoesNotLoseThePress)
+{
+    savesAllowed = true;
+    open(nullptr);
+    QWidget* save = root->toolbar().items().at(3);
+    QTest::mousePress(save, Qt::LeftButton);
+    root->reloadWithNode(inner("Ventrik"));
+    root->setStatus("Updated", false);
+    QTest::mouseRelease(save, Qt::LeftButton);
+    EXPECT_EQ(savePresses, 1);
+    EXPECT_EQ(status(*root).text(), "Updated");
+}
+
+TEST_F(PaneTest, AReloadLeavesTheKeyboardWhereItIs)
+{
+    savesAllowed = true;
+    open(inner("Ventrik", {leaf("A", "1")}));
+    ASSERT_TRUE(root->table().hasFocus());
+    root->reloadWithNode(inner("Ventrik", {leaf("A", "2")}));
+    EXPECT_TRUE(root->table().hasFocus());
+    QCoreApplication::processEvents();
+    root->toolbar().items().at(3)->setFocus();
+    ASSERT_TRUE(root->toolbar().items().at(3)->hasFocus());
+    root->reloadWithNode(inner("Ventrik", {leaf("A", "3")}));
+    EXPECT_TRUE(root->toolbar().items().at(3)->hasFocus());
+}
+
+TEST_F(PaneTest, CopyingARowGivesNameAndValue)
+{
+    open(inner("Ventrik", {leaf("Mode", "Idle [3]"), inner("Cell")}));
+    QTest::keyClick(&root->table(), Qt::Key_Down);
+    QTest::keySequence(&root->table(), QKeySequence::Copy);
+    EXPECT_EQ(QGuiApplication::clipboard()->text(), "Mode: Idle [3]");
+    QTest::keyClick(&root->table(), Qt::Key_Down);
+    QTest::keySequence(&root->table(), QKeySequence::Copy);
+    EXPECT_EQ(QGuiApplication::clipboard()->text(), "Cell");
+}
+
+TEST_F(PaneTest, TheCurrentRowKeepsItsNameWhenARowIsAddedAboveIt)
+{
+    open(inner("Ventrik", {leaf("A", "1"), leaf("B", "2")}));
+    QTest::keyClick(&root->table(), Qt::Key_End);
+    root->reloadWithNode(inner("Ventrik", {leaf("New", "0"), leaf("A", "1"), leaf("B", "2")}));
+    EXPECT_EQ(root->table().indexPathForCurrentRow(), (IndexPath{0, 2}));
+    EXPECT_TRUE(cell(2).hasKeyboardFrame());
+}
+
+TEST_F(PaneTest, AValueThatHasChangedIsTinted)
+{
+    open(inner("Ventrik", {leaf("A", "1"), leaf("B", "2")}));
+    EXPECT_FALSE(cell(0).isTinted());
+    root->reloadWithNode(inner("Ventrik", {leaf("A", "1"), leaf("B", "3")}));
+    EXPECT_FALSE(cell(0).isTinted());
+    EXPECT_TRUE(cell(1).isTinted());
+}
+
+TEST_F(PaneTest, AValueThatHasOnlyMovedIsNotTinted)
+{
+    open(inner("Ventrik", {leaf("A", "1"), leaf("B", "2")}));
+    root->reloadWithNode(inner("Ventrik", {leaf("New", "0"), leaf("A", "1"), leaf("B", "2")}));
+    for (const int row : {0, 1, 2})
+        EXPECT_FALSE(cell(row).isTinted()) << row;
+}
+
+TEST_F(PaneTest, NothingIsTintedWhereThatIsSwitchedOff)
+{
+    changesTinted = false;
+    open(inner("Ventrik", {leaf("A", "1")}));
+    root->reloadWithNode(inner("Ventrik", {leaf("A", "2")}));
+    EXPECT_FALSE(cell(0).isTinted());
+}
+
+TEST_F(PaneTest, AMovedLongValueKeepsItsPlaceWhileItsRowIsAwayAndLendsItToNone)
+{
+    VentrikModelNode::Children leaves;
+    for (int i = 0; i < 100; ++i)
+        leaves.push_back(leaf(std::to_string(i), std::string(200, 'x')));
+    open(inner("Ventrik", leaves));
+    cell(0).view()->setContentOffset(150);
+    QScrollBar& bar = *root->table().verticalScrollBar();
+    for (int value = 0; value < bar.maximum(); value += 300) {
+        bar.setValue(value);
+        for (int row = 1; row < 100; ++row) {
+            if (root->table().rowAt({0, row})) {
+                ASSERT_EQ(cell(row).view()->contentOffset(), 0) << row;
+            }
+        }
+    }
+    bar.setValue(0);
+    EXPECT_EQ(cell(0).view()->contentOffset(), 150);
+}
+
+TEST_F(PaneTest, AMovedLongValueGoesAlongWithItsRow)
+{
+    const auto mode = leaf("Mode", std::string(200, 'x'));
+    open(inner("Ventrik", {mode}));
+    cell(0).view()->setContentOffset(150);
+    root->reloadWithNode(inner("Ventrik", {leaf("New", std::string(200, 'y')), mode}));
+    EXPECT_EQ(cell(0).view()->contentOffset(), 0);
+    EXPECT_EQ(cell(1).view()->contentOffset(), 150);
+}
+
+TEST_F(PaneTest, TheArrowKeysMoveALongValueSideways)
+{
+    open(inner("Ventrik", {leaf("Mode", std::string(200, 'x'))}));
+    for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Right, Qt::Key_Right})
+        QTest::keyClick(&root->table(), key);
+    EXPECT_EQ(cell(0).view()->contentOffset(), 80);
+}
+
+TEST_F(PaneTest, ASwipeFromTheLeftEdgeOverRowsGoesBack)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("Mode", std::string(200, 'x'))})}));
+    click(0);
+    ASSERT_EQ(title(), "Cell");
+    dragFinger(*stack, {5, 75}, {300, 80});
+    EXPECT_EQ(title(), "Ventrik");
 }
 
 } // namespace ventrik

@@ -16,6 +16,17 @@ QString toQString(std::string_view text)
     return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
 }
 
+// Returns when the bus has everything that was sent before. The library writes from a thread of its
+// own, and a process that ends first takes along what is unwritten.
+void waitUntilSent(const QDBusConnection& bus)
+{
+    constexpr int longestWait = 1000; // milliseconds
+    bus.call(QDBusMessage::createMethodCall(
+                 QStringLiteral("org.freedesktop.DBus"), QStringLiteral("/org/freedesktop/DBus"),
+                 QStringLiteral("org.freedesktop.DBus.Peer"), QStringLiteral("Ping")),
+             QDBus::Block, longestWait);
+}
+
 // Without an address the bus library would start a bus of its own, slowly, wherever there is a
 // display.
 bool hasSessionBus()
@@ -56,6 +67,7 @@ void LinuxPreferences::postChanged(std::string_view domain, std::string_view key
                                              QStringLiteral("Changed"));
     signal << toQString(domain) << toQString(key);
     bus.send(signal);
+    waitUntilSent(bus);
 }
 
 QSettings& LinuxPreferences::settings(std::string_view domain)

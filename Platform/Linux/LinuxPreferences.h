@@ -21,7 +21,7 @@ class LinuxPreferences : public Preferences
 
     void set(std::string_view domain, std::string_view key, bool value) override;
     bool synchronize(std::string_view domain) override;
-    /// Does nothing where there is no session bus.
+    /// Returns when the bus has the notice; does nothing where there is no session bus.
     void postChanged(std::string_view domain, std::string_view key) override;
 
   private:

@@ -70,6 +70,25 @@ class WindowProcess : public ToolUsageFixture
         EXPECT_TRUE(waitUntil([&] { return window->says(timerStarted); })) << window->errors();
         return window;
     }
+    std::string homeScreenPreferences() const
+    {
+        return readFile(path("home/config/org.ventrik.HomeScreen.conf"));
+    }
+    /// A session bus of our own, watched, once it is there; the environment names it from then on.
+    ProgramPointer startBus()
+    {
+        auto bus = std::make_unique<Program>(
+            "/usr/bin/dbus-run-session",
+            Arguments{"--", "/bin/sh", "-c",
+                      "echo \"$DBUS_SESSION_BUS_ADDRESS\"; "
+                      "exec dbus-monitor \"interface='org.ventrik.Preferences'\""},
+            environment);
+        // The monitor is told its own name once it watches.
+        EXPECT_TRUE(waitUntil([&] { return bus->prints("NameLost"); })) << bus->errors();
+        environment.insert("DBUS_SESSION_BUS_ADDRESS",
+                           QString::fromStdString(linesOf(bus->output()).front()));
+        return bus;
+    }
     /// A window with a service of its own; whatever it makes, it makes in this directory.
     ProgramPointer startDemo()
     {
@@ -95,6 +114,34 @@ TEST_F(WindowProcess, ConnectsAndEndsOnSIGTERM)
     window->send(SIGTERM);
     EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
     EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
+}
+
+TEST_F(WindowProcess, ResetsTheHomeScreenOnlyWhenItEndsHoweverItIsAsked)
+{
+    const auto service = startScenario();
+    for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
+        const auto window = startWindow();
+        EXPECT_EQ(homeScreenPreferences(), "");
+        window->send(signal);
+        EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+        EXPECT_EQ(homeScreenPreferences(), "[General]\nHSShowGSMRSSI=false\n");
+        std::filesystem::remove(path("home/config/org.ventrik.HomeScreen.conf"));
+    }
+}
+
+TEST_F(WindowProcess, TellsTheSessionBusThatThePreferenceHasChanged)
+{
+    const auto bus = startBus();
+    const auto service = startScenario();
+    const auto window = startWindow();
+    EXPECT_FALSE(bus->prints("member=Changed"));
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+    EXPECT_TRUE(waitUntil([&] { return bus->prints("string \"HSShowGSMRSSI\""); }));
+    EXPECT_THAT(bus->output(),
+                HasSubstr("path=/org/ventrik/Preferences; interface=org.ventrik.Preferences; "
+                          "member=Changed\n   string \"org.ventrik.HomeScreen\"\n"
+                          "   string \"HSShowGSMRSSI\"\n"));
 }
 
 TEST_F(WindowProcess, ReconnectsAfterTheServiceWasKilled)

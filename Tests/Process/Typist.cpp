@@ -1,0 +1,83 @@
+#include <QApplication>
+#include <QGenericPlugin>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QTest>
+#include <QTimer>
+
+#include <array>
+
+namespace ventrik
+{
+
+namespace
+{
+
+/// Somebody who waits until values are shown and then saves a snapshot, by mouse and keys.
+class Typist : public QObject
+{
+  public:
+    Typist()
+    {
+        connect(&_timer, &QTimer::timeout, this, [this] { goOn(); });
+        _timer.start(50);
+    }
+
+  private:
+    // The visible widget of that kind whose text begins so.
+    template <typename Widget>
+    static Widget* find(const QString& text)
+    {
+        for (QWidget* widget : QApplication::allWidgets())
+            if (auto* found = qobject_cast<Widget*>(widget))
+                if (found->isVisible() && found->text().startsWith(text))
+                    return found;
+        return nullptr;
+    }
+
+    void goOn()
+    {
+        const std::array steps{&Typist::openSaveScreen, &Typist::describe, &Typist::save};
+        if (_step < steps.size() && (this->*steps[_step])())
+            ++_step;
+    }
+    bool openSaveScreen() { return find<QLabel>("Updated ") && clickSave(); }
+    bool describe()
+    {
+        auto* field = find<QLineEdit>("");
+        if (!field)
+            return false;
+        QTest::mouseClick(field, Qt::LeftButton);
+        QTest::keyClicks(field, "On the road");
+        QTest::keyClick(field, Qt::Key_Return);
+        return true;
+    }
+    bool save() { return clickSave(); }
+    static bool clickSave()
+    {
+        auto* button = find<QPushButton>("Save");
+        if (button)
+            QTest::mouseClick(button, Qt::LeftButton);
+        return button != nullptr;
+    }
+
+    QTimer _timer;
+    std::size_t _step = 0;
+};
+
+} // namespace
+
+/// The typist as an input device of the toolkit's, for a program that knows nothing of it.
+class TypistPlugin : public QGenericPlugin
+{
+    Q_OBJECT
+    Q_PLUGIN_METADATA(IID QGenericPluginFactoryInterface_iid FILE "typist.json")
+
+  public:
+    QObject* create(const QString&, const QString&) override { return new Typist; }
+};
+
+} // namespace ventrik
+
+#include "Typist.moc"

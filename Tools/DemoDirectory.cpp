@@ -1,10 +1,12 @@
 #include "Tools/DemoDirectory.h"
 
 #include <cerrno>
+#include <chrono>
 #include <csignal>
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
+#include <thread>
 
 #include <fcntl.h>
 #include <sys/wait.h>
@@ -16,10 +18,18 @@ namespace ventrik
 namespace
 {
 
+// Whoever is still ending may put or take a file in between, which makes a removal fail.
 void removeAll(const std::string& path)
 {
+    using namespace std::chrono_literals;
+    constexpr int attempts = 100;
     std::error_code ignored;
-    std::filesystem::remove_all(path, ignored);
+    for (int attempt = 0; attempt < attempts; ++attempt) {
+        std::filesystem::remove_all(path, ignored);
+        if (!std::filesystem::exists(path, ignored))
+            return;
+        std::this_thread::sleep_for(10ms);
+    }
 }
 
 void closeStandardStreams()

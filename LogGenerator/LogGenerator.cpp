@@ -1,6 +1,7 @@
 #include "LogGenerator/LogGenerator.h"
 
 #include "LogGenerator/DateText.h"
+#include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "LogGenerator/Orbel/GSM/Orbel_GSMLogGenerator.h"
 #include "LogGenerator/Orbel/LTE/LTELogGenerator.h"
 #include "LogGenerator/Orbel/UTRAN/UTRANLogGenerator.h"
@@ -42,6 +43,8 @@ std::unique_ptr<LogGenerator>
 LogGenerator::generatorFromTechnology(const PlistValue& technology,
                                       const GeneratorServices& services)
 {
+    if (technology == kQXLogChannelTechnology_IFX)
+        return GSMLogGenerator::generator(services);
     if (technology == kQXLogChannelTechnology_Orbel_GSM)
         return Orbel_GSMLogGenerator::generator(services);
     if (technology == kQXLogChannelTechnology_Orbel_LTE)

@@ -1,5 +1,6 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/DateText.h"
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "LogGenerator/Orbel/GSM/Orbel_GSMLogGenerator.h"
@@ -47,6 +48,8 @@ LogGenerator::generatorFromTechnology(const PlistValue& technology,
         return GSMLogGenerator::generator(services);
     if (technology == kQXLogChannelTechnology_Orbel_GSM)
         return Orbel_GSMLogGenerator::generator(services);
+    if (technology == kQXLogChannelTechnology_Orbel_CDMA)
+        return C2KLogGenerator::generator(services);
     if (technology == kQXLogChannelTechnology_Orbel_LTE)
         return LTELogGenerator::generator(services);
     if (technology == kQXLogChannelTechnology_Orbel_UTRAN2)

@@ -45,4 +45,19 @@ std::string dbm(double value)
     return fmt::format("{:>4.2f} dBm", value);
 }
 
+std::string signedWholeDbm(std::int32_t value)
+{
+    return fmt::format("{:+} dBm", value);
+}
+
+std::string signedDb(double value)
+{
+    return fmt::format("{:+.2f} dB", value);
+}
+
+std::string signedDbm(double value)
+{
+    return fmt::format("{:+.2f} dBm", value);
+}
+
 } // namespace ventrik

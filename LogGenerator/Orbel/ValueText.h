@@ -24,5 +24,11 @@ std::string wholeDbm(std::int32_t value);
 std::string db(double value);
 /// "%4.2f dBm"
 std::string dbm(double value);
+/// "%+d dBm"
+std::string signedWholeDbm(std::int32_t value);
+/// "%+.2f dB"
+std::string signedDb(double value);
+/// "%+.2f dBm"
+std::string signedDbm(double value);
 
 } // namespace ventrik

@@ -104,6 +104,7 @@ TEST_F(TechnologyTest, EachTechnologyHasItsGenerator)
 {
     EXPECT_TRUE(known(kQXLogChannelTechnology_IFX));
     EXPECT_TRUE(known(kQXLogChannelTechnology_Orbel_GSM));
+    EXPECT_TRUE(known(kQXLogChannelTechnology_Orbel_CDMA));
     EXPECT_TRUE(known(kQXLogChannelTechnology_Orbel_LTE));
     EXPECT_TRUE(known(kQXLogChannelTechnology_Orbel_UTRAN2));
 }

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+
 namespace ventrik
 {
 
@@ -17,6 +19,17 @@ TEST(ValueText, LevelsHaveTwoDecimals)
 {
     EXPECT_EQ(db(-10.75), "-10.75 dB");
     EXPECT_EQ(dbm(0), "0.00 dBm");
+}
+
+TEST(ValueText, SignedLevelsCarryTheirSignAlways)
+{
+    EXPECT_EQ(signedWholeDbm(5), "+5 dBm");
+    EXPECT_EQ(signedWholeDbm(0), "+0 dBm");
+    EXPECT_EQ(signedWholeDbm(-71), "-71 dBm");
+    EXPECT_EQ(signedDb(0), "+0.00 dB");
+    EXPECT_EQ(signedDb(-3.014), "-3.01 dB");
+    EXPECT_EQ(signedDb(-std::numeric_limits<double>::infinity()), "-inf dB");
+    EXPECT_EQ(signedDbm(12.5), "+12.50 dBm");
 }
 
 TEST(ValueText, SixDecimalsAreRoundedAndNeverCut)

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "LogGenerator/Orbel/OrbelLogGenerator.h"
+
+namespace ventrik
+{
+
+/// The generator of CDMA2000 basebands, 1x and EV-DO.
+///
+/// A template gives each label of the display the key of the value to show there; from it come the
+/// empty display and a lookup from each key to its labels. One decoder for each log code publishes
+/// its values through the lookup. Display and lookup live in the state dictionary and are updated
+/// in place.
+class C2KLogGenerator : public OrbelLogGenerator
+{
+  public:
+    static std::unique_ptr<C2KLogGenerator> generator(const GeneratorServices& services);
+
+    void updateState(PlistDictionary& state, ByteView data) override;
+    std::optional<PlistValue> generateLogUsingState(PlistDictionary& state) override;
+    PlistDictionary getStartCommand() const override;
+
+    /// Fills the display with the template's groups and empty values, and the lookup with an array
+    /// of entries for each lookup key: the label, and the group of the display that holds it.
+    static void processTemplate(const PlistDictionary& displayTemplate, PlistDictionary& display,
+                                PlistDictionary& lookup, SystemLog& log);
+    /// The display, built on first use; none when the template cannot be loaded.
+    std::optional<PlistValue> getDisplayFromState(PlistDictionary& state);
+    /// Decodes one packet as it arrived; without a lookup its values go nowhere.
+    void updateFromLog(ByteView data, const PlistDictionary* lookup, PlistDictionary& state);
+
+  private:
+    using OrbelLogGenerator::OrbelLogGenerator;
+
+    std::optional<PlistValue> loadTemplate(PlistDictionary& state);
+};
+
+} // namespace ventrik

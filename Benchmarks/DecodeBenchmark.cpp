@@ -1,8 +1,8 @@
-#include "LogGenerator/Orbel/LTE/LTELogGenerator.h"
+#include "LogGenerator/LogGenerator.h"
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/LinuxSystemLog.h"
-#include "TelephonyService/LTEScenario.h"
+#include "TelephonyService/Scenarios.h"
 
 #include <benchmark/benchmark.h>
 
@@ -22,22 +22,24 @@ class FilteredLog : public SystemLog
     void write(int, std::string_view) override {}
 };
 
-std::vector<Bytes> driveOf(std::size_t count)
+std::vector<Bytes> scenarioMessages(const CaptureTechnology& technology, std::size_t count)
 {
-    LTEScenario scenario(1);
+    const auto scenario = makeScenario(technology, 1);
     std::vector<Bytes> messages;
     for (std::size_t i = 0; i < count; ++i)
-        messages.push_back(scenario.next()->data);
+        messages.push_back(scenario->next()->data);
     return messages;
 }
 
-void decodeLteDrive(benchmark::State& benchmarkState)
+void decodeScenario(benchmark::State& benchmarkState, const char* technologyName)
 {
-    const std::vector<Bytes> messages = driveOf(2000);
+    const CaptureTechnology technology = *technologyNamed(technologyName);
+    const std::vector<Bytes> messages = scenarioMessages(technology, 2000);
     FilteredLog log;
     const LinuxResources resources(LinuxResources::defaultDirectories(), "1.0");
     const LinuxClock clock;
-    const auto generator = LTELogGenerator::generator({log, resources, clock});
+    const auto generator =
+        LogGenerator::generatorFromTechnology(technology.identifier, {log, resources, clock});
     PlistDictionary state;
     std::size_t bytes = 0;
     for (auto _ : benchmarkState) {
@@ -51,7 +53,9 @@ void decodeLteDrive(benchmark::State& benchmarkState)
                                      static_cast<std::int64_t>(messages.size()));
     benchmarkState.SetBytesProcessed(static_cast<std::int64_t>(bytes));
 }
-BENCHMARK(decodeLteDrive)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(decodeScenario, lte, "lte")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(decodeScenario, gsm, "gsm")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(decodeScenario, utran, "utran")->Unit(benchmark::kMillisecond);
 
 } // namespace
 

@@ -1,5 +1,6 @@
 #include "TelephonyService/Scenario.h"
 
+#include "PropertyList/PropertyListWriter.h"
 #include "TelephonyService/PacketBuilder.h"
 
 #include <algorithm>
@@ -70,6 +71,13 @@ void Scenario::reportPdpContexts(bool isConnected)
 void Scenario::reportPropertyList(std::uint32_t logCode, const PlistValue& root)
 {
     _messages.push_back({_step * stepDuration, propertyListPacket(logCode, root)});
+}
+
+void Scenario::reportBarePropertyList(const PlistValue& root)
+{
+    const auto writing = writeXmlPropertyList(root);
+    const std::string text = writing ? *writing.text : std::string();
+    _messages.push_back({_step * stepDuration, Bytes(text.begin(), text.end())});
 }
 
 std::uint16_t rawLevel(double level, double floor, double step, unsigned bits)

@@ -29,6 +29,8 @@ class Scenario : public MessageSource
     void report(PacketBuilder packet);
     /// Sends a packet that carries a property list.
     void reportPropertyList(std::uint32_t logCode, const PlistValue& root);
+    /// Sends a property list as it is, without a packet around it.
+    void reportBarePropertyList(const PlistValue& root);
     /// The access technology is the one that the SIM prefers.
     void reportSimFiles(std::string_view accessTechnology);
     /// One context that always stands, and one for data while the phone is connected.

@@ -1,6 +1,8 @@
 #include "TelephonyService/Scenarios.h"
 
 #include "Platform/TelephonyConstants.h"
+#include "TelephonyService/C2KScenario.h"
+#include "TelephonyService/CellMonitorScenario.h"
 #include "TelephonyService/GSMScenario.h"
 #include "TelephonyService/LTEScenario.h"
 #include "TelephonyService/UTRANScenario.h"
@@ -12,6 +14,10 @@ std::unique_ptr<MessageSource> makeScenario(const CaptureTechnology& technology,
 {
     if (technology.identifier == kQXLogChannelTechnology_Orbel_GSM)
         return std::make_unique<GSMScenario>(seed);
+    if (technology.identifier == kQXLogChannelTechnology_IFX)
+        return std::make_unique<CellMonitorScenario>(seed);
+    if (technology.identifier == kQXLogChannelTechnology_Orbel_CDMA)
+        return std::make_unique<C2KScenario>(seed);
     if (technology.identifier == kQXLogChannelTechnology_Orbel_LTE)
         return std::make_unique<LTEScenario>(seed);
     if (technology.identifier == kQXLogChannelTechnology_Orbel_UTRAN2)

@@ -22,6 +22,13 @@ TEST(Scenarios, EachTechnologyGetsItsOwn)
     EXPECT_TRUE(codesOfScenario("gsm").contains(0x417A));
     EXPECT_TRUE(codesOfScenario("lte").contains(0xB17F));
     EXPECT_TRUE(codesOfScenario("utran").contains(0xD00A));
+    EXPECT_TRUE(codesOfScenario("c2k").contains(0x108A));
+}
+
+TEST(Scenarios, TheCellMonitorGetsPropertyListsWithoutPackets)
+{
+    const Bytes message = makeScenario(*technologyNamed("ifx"), 1)->next()->data;
+    EXPECT_EQ(std::string(message.begin(), message.begin() + 5), "<?xml");
 }
 
 TEST(Scenarios, TheSeedReachesTheScenario)

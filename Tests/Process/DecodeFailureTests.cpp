@@ -1,4 +1,7 @@
+#include "Tests/Process/CellMonitorCaptures.h"
 #include "Tests/Process/DecodeFixture.h"
+
+#include <csignal>
 
 namespace ventrik
 {
@@ -96,15 +99,22 @@ TEST_F(DecodeFailure, OfAnUnknownLinkTypeIsWrongUsage)
     EXPECT_THAT(linesOf(result.errors), ElementsAre(HasSubstr("link type 1 names no technology")));
 }
 
-TEST_F(DecodeFailure, OfATechnologyWithoutADecoderNamesIt)
+// The cell monitor's service is trusted to send texts only.
+TEST_F(DecodeFailure, OfACellMonitorMessageEndsTheProcessBehindWhatWasDecoded)
 {
-    for (const char* name : {"c2k", "ifx"}) {
-        const Result result = decode(lteCapture(), {"--technology", name});
-        EXPECT_EQ(result.status, 1) << name;
-        EXPECT_THAT(result.output, IsEmpty());
-        EXPECT_THAT(linesOf(result.errors),
-                    ElementsAre(HasSubstr(std::string("no decoder for the technology ") + name)));
-    }
+    const PcapBytes capture = PcapBytes(cellMonitorLinkType)
+                                  .record(captureStart, 0, cellMonitorMessage("<string>a</string>"))
+                                  .record(captureStart, 1, cellMonitorMessage("<real>7</real>"));
+    const std::string log = path("system.log");
+    const Result result = decode(capture, {"--format", "jsonl", "--system-log", log});
+    EXPECT_EQ(result.status, 128 + SIGABRT);
+    EXPECT_EQ(result.output, R"({"packet": 0, "time": 1000000000.000000, "display": )"
+                             R"({"Cell": "a"}})"
+                             "\n");
+    const std::string line = "Assertion failure: Unknown object of type real encountered "
+                             "(LogGenerator/GSM/GSMLogGenerator, line 78)";
+    EXPECT_EQ(linesOf(result.errors).back(), line);
+    EXPECT_EQ(linesOf(readFile(log)).back(), "3\t" + line);
 }
 
 TEST_F(DecodeFailure, ToWriteTheSystemLogOrTheSnapshotIsTold)

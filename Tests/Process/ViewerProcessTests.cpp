@@ -68,6 +68,31 @@ TEST_F(ViewerProcess, ShowsValuesOfTheServiceWithinFourSeconds)
                                        " ***** Created ports (send=%p, recv=%p)"}));
 }
 
+TEST_F(ViewerProcess, ShowsAC2KService)
+{
+    service = startService({"--technology", "c2k"});
+    viewer.start();
+    EXPECT_TRUE(waitUntil([this] { return viewer.comesToShow("/1x/State", "Paging [6]"); }));
+    EXPECT_EQ(viewer.shown("/1x/System/System ID"), "4139");
+}
+
+TEST_F(ViewerProcess, ShowsACellMonitorService)
+{
+    service = startService({"--technology", "ifx"});
+    viewer.start();
+    EXPECT_TRUE(waitUntil([this] { return viewer.comesToShow("/Serving Cell/MCC", "262"); }));
+    EXPECT_EQ(viewer.shown("/Registration"), "Registered, home");
+}
+
+TEST_F(ViewerProcess, ShowsAnotherTechnologyFromItsStart)
+{
+    startAndShowFirstService();
+    service->kill();
+    service = startService({"--technology", "ifx"});
+    EXPECT_TRUE(waitUntil([this] { return viewer.comesToShow("/Serving Cell/MCC", "262"); }));
+    EXPECT_EQ(viewer.shown(cellPath), "");
+}
+
 TEST_F(ViewerProcess, ShowsValuesThatChange)
 {
     service = startScenario();

@@ -1,3 +1,5 @@
+#include "Tests/Process/CellMonitorCaptures.h"
+#include "Tests/Process/LTECaptures.h"
 #include "Tests/Process/ToolUsageFixture.h"
 
 #include <csignal>
@@ -12,6 +14,7 @@ namespace ventrik
 namespace
 {
 
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
@@ -102,6 +105,24 @@ class WindowProcess : public ToolUsageFixture
         return window;
     }
 
+    /// The window of a cell-monitor service whose second message is this.
+    void expectAbort(const Bytes& message, const std::string& line)
+    {
+        const auto service =
+            startReplay("cells.pcap", PcapBytes(cellMonitorLinkType)
+                                          .record(captureStart, 0, cellMonitorMessage(text))
+                                          .record(captureStart, 1, message)
+                                          .bytes());
+        const auto window = startWindow();
+        EXPECT_EQ(window->waitForEnd(), 128 + SIGABRT);
+        const auto lines = linesOf(window->errors());
+        ASSERT_GE(lines.size(), 2U);
+        EXPECT_EQ(lines.back(), line);
+        // Before that the system log's line, of error priority.
+        EXPECT_THAT(lines[lines.size() - 2], EndsWith("]: <3> " + line));
+    }
+
+    static constexpr const char* text = "<string>-70 dBm</string>";
     std::string temporary = path("temporary");
 };
 
@@ -178,6 +199,20 @@ TEST_F(WindowProcess, OfADemoTakesItsServiceAlongWhenItIsKilled)
     for (const pid_t child : children)
         EXPECT_TRUE(waitUntil([&] { return hasEnded(child); }));
     EXPECT_THAT(namesIn(temporary), IsEmpty());
+}
+
+TEST_F(WindowProcess, EndsOnACellMonitorMessageWithANumber)
+{
+    expectAbort(cellMonitorMessage("<integer>-70</integer>"),
+                "Assertion failure: Unknown object of type integer encountered "
+                "(LogGenerator/GSM/GSMLogGenerator, line 78)");
+}
+
+TEST_F(WindowProcess, EndsOnACellMonitorMessageThatIsNoPropertyList)
+{
+    for (const Bytes& message : {Bytes{}, Bytes{'c', 'e', 'l', 'l'}, Bytes(20, 0xFF)})
+        expectAbort(message, "Assertion failure: Could not deserialize the object "
+                             "(LogGenerator/GSM/GSMLogGenerator, line 90)");
 }
 
 TEST_F(WindowProcess, RefusesWhatIsWrong)

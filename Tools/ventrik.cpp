@@ -146,7 +146,7 @@ std::unique_ptr<QApplication> makeApplication(int& argc, char** argv)
 
 void setWindowIcon(const Resources& resources)
 {
-    if (const auto icon = resources.path("ventrik", "svg"))
+    if (const auto icon = resources.path("ventrik", "png"))
         QApplication::setWindowIcon(QIcon(QString::fromStdString(*icon)));
 }
 

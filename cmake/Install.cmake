@@ -23,10 +23,9 @@ set(CPACK_PACKAGE_CONTACT "Ventrik <dev@ventrik.example>")
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_SECTION net)
 set(CPACK_DEBIAN_PACKAGE_DESCRIPTION
-"Radio field-test viewer
- Shows what the cellular baseband tells as a tree of tables that refreshes every
- two seconds, in a window or in a terminal. With it come an offline decoder for
- captures and a telephony service for machines without a baseband.")
+"Shows what the cellular baseband tells as a tree of tables that refreshes every
+two seconds, in a window or in a terminal. With it come an offline decoder for
+captures and a telephony service for machines without a baseband.")
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_RECOMMENDS fonts-dejavu-core)
 include(CPack)

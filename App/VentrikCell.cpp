@@ -1,5 +1,6 @@
 #include "App/VentrikCell.h"
 
+#include "App/Toolkit/EdgeFade.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/Transition.h"
@@ -36,7 +37,10 @@ int centredTop(const QRect& bounds, const QSize& size)
 
 } // namespace
 
-VentrikCell::VentrikCell(Style style, const QString& identifier) : TableRow(style, identifier) {}
+VentrikCell::VentrikCell(Style style, const QString& identifier)
+    : TableRow(style, identifier), _fade(new EdgeFade(&contentArea()))
+{
+}
 
 std::unique_ptr<VentrikCell> VentrikCell::initWithStyleKey(Style style, const QString& identifier)
 {
@@ -49,6 +53,7 @@ std::unique_ptr<VentrikCell> VentrikCell::initWithStyle(Style style, const QStri
 {
     std::unique_ptr<VentrikCell> cell(new VentrikCell(style, identifier));
     cell->_view = new HorizontalScrollView(&cell->contentArea());
+    cell->_view->setScrolled([row = cell.get()] { row->updateFade(); });
     cell->_key = makeLabel(boldFont(), &cell->_view->content());
     cell->_value = makeLabel(systemFont(textPoints, FontWeight::Regular), &cell->_view->content());
     return cell;
@@ -143,6 +148,35 @@ void VentrikCell::layoutSubviews()
     placeKey();
     if (_layout == Layout::KeyAndValue && _value)
         placeValue();
+    _fade->layout();
+    updateFade();
+}
+
+int VentrikCell::placeInRow(const QLabel& label, int x) const
+{
+    return label.mapTo(&contentArea(), QPoint(x, 0)).x();
+}
+
+// Half a letter beyond the edge is nothing: values keep some air on their right.
+void VentrikCell::updateFade()
+{
+    const int edge = contentArea().width();
+    const bool hasValue = _value && !_value->text().isEmpty();
+    const QLabel& last = hasValue ? *_value : *_key;
+    _fade->setVisible(placeInRow(last, last.width()) > edge + textPoints / 2);
+    _fade->setDots(hasValue && placeInRow(last, textPoints) > edge);
+    if (!_view)
+        setToolTip(isFading() ? _key->text() : QString());
+}
+
+bool VentrikCell::isFading() const
+{
+    return !_fade->isHidden();
+}
+
+bool VentrikCell::showsDots() const
+{
+    return isFading() && _fade->hasDots();
 }
 
 void VentrikCell::placeKey()

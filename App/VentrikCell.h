@@ -11,6 +11,7 @@ class QLabel;
 namespace ventrik
 {
 
+class EdgeFade;
 class HorizontalScrollView;
 
 /// A row of a pane: a bold name on the left and, for a leaf, its value beside it, to be moved
@@ -34,6 +35,10 @@ class VentrikCell : public TableRow
     void setValueText(const QString& text);
     /// Tints the value for a moment, unless the platform asks for less motion.
     void tintValue();
+    /// Whether what goes on beyond the right edge fades there.
+    bool isFading() const;
+    /// Whether dots stand there for a value that is out of sight.
+    bool showsDots() const;
     bool isTinted() const { return _tintTimer.isActive(); }
 
     /// Lays out the key alone, or both; the row keeps to it when its size changes.
@@ -54,12 +59,15 @@ class VentrikCell : public TableRow
 
     void placeKey();
     void placeValue();
+    int placeInRow(const QLabel& label, int x) const;
+    void updateFade();
     void endTint();
     void updateAccessibleName();
 
     QLabel* _key = nullptr;
     QLabel* _value = nullptr;
     HorizontalScrollView* _view = nullptr;
+    EdgeFade* _fade;
     Layout _layout = Layout::None;
     QBasicTimer _tintTimer;
 };

@@ -18,6 +18,7 @@ namespace
 {
 
 constexpr int statusPoints = 14;
+constexpr int buttonHeight = 32; // for a finger
 constexpr auto rowStyle = TableRow::Style::Value;
 
 QString identifier()
@@ -49,6 +50,7 @@ std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
     auto button = std::make_unique<QPushButton>(QStringLiteral("Save"));
     button->setShortcut(QKeySequence::Save);
     button->setAutoDefault(true); // Enter presses it as Space does
+    button->setMinimumHeight(buttonHeight);
     QObject::connect(button.get(), &QPushButton::clicked, button.get(),
                      [&host] { host.showSaveView(); });
     return button;

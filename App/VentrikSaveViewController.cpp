@@ -23,6 +23,7 @@ constexpr int titlePoints = 17;
 constexpr int labelPoints = 13;
 constexpr int fieldPoints = 15;
 constexpr int rowPoints = 13;
+constexpr int fieldMargin = 4;
 
 QString identifier()
 {
@@ -92,6 +93,7 @@ void VentrikSaveViewController::viewDidLoad()
     for (QLabel* label : {_layout->descriptionLabel, _layout->contentLabel})
         label->setFont(systemFont(labelPoints, FontWeight::Regular));
     saveDescription().setFont(systemFont(fieldPoints, FontWeight::Regular));
+    saveDescription().setTextMargins(fieldMargin, 0, fieldMargin, 0);
     connect(&saveDescription(), &QLineEdit::returnPressed, this,
             [this] { textFieldShouldReturn(saveDescription()); });
     connect(&saveButton(), &QPushButton::clicked, this, [this] { savePressed(); });

@@ -32,7 +32,12 @@ int HorizontalScrollView::largestOffset() const
 
 void HorizontalScrollView::setContentOffset(int offset)
 {
-    _content->move(-std::clamp(offset, 0, largestOffset()), 0);
+    const int kept = std::clamp(offset, 0, largestOffset());
+    if (kept == contentOffset())
+        return;
+    _content->move(-kept, 0);
+    if (_scrolled)
+        _scrolled();
 }
 
 void HorizontalScrollView::resizeEvent(QResizeEvent*)

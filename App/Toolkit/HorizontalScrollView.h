@@ -4,6 +4,8 @@
 #include <QSize>
 #include <QWidget>
 
+#include <functional>
+
 namespace ventrik
 {
 
@@ -22,6 +24,8 @@ class HorizontalScrollView : public QWidget
     /// How far the content is moved to the left, kept within what there is to see.
     int contentOffset() const { return -_content->x(); }
     void setContentOffset(int offset);
+    /// Called after each change of the offset.
+    void setScrolled(std::function<void()> scrolled) { _scrolled = std::move(scrolled); }
 
   protected:
     bool event(QEvent* event) override;
@@ -34,6 +38,7 @@ class HorizontalScrollView : public QWidget
     int largestOffset() const;
 
     QWidget* _content;
+    std::function<void()> _scrolled;
     QPoint _pressPosition;
     int _pressOffset = 0;
 };

@@ -100,12 +100,22 @@ void TableRow::paintEvent(QPaintEvent*)
     }
 }
 
+// A check mark says something; an indicator only hints.
+QColor TableRow::accessoryColor() const
+{
+    if (_isSelected)
+        return palette().color(QPalette::HighlightedText);
+    if (_accessory == TableRowAccessory::CheckMark)
+        return palette().color(QPalette::Link);
+    QColor grey = palette().color(QPalette::Text);
+    grey.setAlphaF(0.35F);
+    return grey;
+}
+
 void TableRow::paintAccessory(QPainter& painter) const
 {
     const QPointF middle(width() - accessoryWidth / 2.0, height() / 2.0);
-    QColor grey = palette().color(_isSelected ? QPalette::HighlightedText : QPalette::Text);
-    grey.setAlphaF(_isSelected ? 0.8F : 0.35F);
-    painter.setPen(QPen(grey, 2, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+    painter.setPen(QPen(accessoryColor(), 2, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
     switch (_accessory) {
     case TableRowAccessory::None:
         return;

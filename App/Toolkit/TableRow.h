@@ -51,6 +51,7 @@ class TableRow : public QWidget
     void paintEvent(QPaintEvent* event) override;
 
   private:
+    QColor accessoryColor() const;
     void paintAccessory(QPainter& painter) const;
 
     Style _style;

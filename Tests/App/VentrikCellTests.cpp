@@ -252,4 +252,38 @@ TEST_F(VentrikCellTest, TheLayoutIsTheSameFromRightToLeft)
     EXPECT_EQ(cell->value()->x(), 500 - boldWidth(shortValue));
 }
 
+TEST_F(VentrikCellTest, ALongValueFadesAtTheEdgeUntilItsEndIsSeen)
+{
+    leaf(name, longValue, 300);
+    EXPECT_TRUE(cell->isFading());
+    cell->view()->setContentOffset(10 + boldWidth(name) + 50 + boldWidth(longValue) - 300);
+    EXPECT_FALSE(cell->isFading());
+}
+
+TEST_F(VentrikCellTest, WhatFitsDoesNotFade)
+{
+    leaf(name, shortValue, 300);
+    EXPECT_FALSE(cell->isFading());
+    inner(name, 300);
+    EXPECT_FALSE(cell->isFading());
+    EXPECT_EQ(cell->toolTip(), "");
+}
+
+TEST_F(VentrikCellTest, ALongNameFadesAndIsToldWholeByItsToolTip)
+{
+    inner(longValue, 300);
+    EXPECT_TRUE(cell->isFading());
+    EXPECT_EQ(cell->toolTip(), longValue);
+}
+
+TEST_F(VentrikCellTest, AValueOutOfSightIsHintedAtByDots)
+{
+    leaf(longValue, shortValue, 300);
+    EXPECT_TRUE(cell->showsDots());
+    cell->view()->setContentOffset(10 + boldWidth(longValue) + 50 - 100);
+    EXPECT_FALSE(cell->showsDots());
+    leaf(name, longValue, 300);
+    EXPECT_FALSE(cell->showsDots());
+}
+
 } // namespace ventrik

@@ -39,14 +39,15 @@ std::vector<std::string> readLines(const std::filesystem::path& file)
     return lines;
 }
 
-// "path: value" for each text below the value that a section has written.
+// "path: value" for each text below the value that the template has not put there.
 void collectTexts(const PlistValue& value, const std::string& path, std::vector<std::string>& texts)
 {
     const auto below = [&](std::string_view name) {
         return path.empty() ? std::string(name) : fmt::format("{}/{}", path, name);
     };
-    if (value.string() && *value.string() != "-") {
-        texts.push_back(fmt::format("{}: {}", path, *value.string()));
+    if (value.string()) {
+        if (!value.string()->empty() && *value.string() != "-")
+            texts.push_back(fmt::format("{}: {}", path, *value.string()));
     } else if (value.dictionary()) {
         for (const auto& [key, entry] : *value.dictionary()) {
             if (key != "_sorted")

@@ -54,7 +54,8 @@ TEST_P(ScenarioProcess, EndsInTheTreeThatItsLastRecordsTell)
 
 INSTANTIATE_TEST_SUITE_P(Technologies, ScenarioProcess,
                          testing::Values(Journey{"lte", 1000}, Journey{"gsm", 1300},
-                                         Journey{"utran", 1700}),
+                                         Journey{"utran", 1700}, Journey{"c2k", 1500},
+                                         Journey{"ifx", 60}),
                          testing::PrintToStringParamName());
 
 } // namespace ventrik

@@ -77,7 +77,7 @@ double pilotLevel(const LogPacket& activeSet, std::uint16_t energy)
 
 // Active set
 //   4 u16 N, 6 u8 M and 7 u8 E scale the energies | 8 u8 number of pilots | 9 u8 fields F
-//   10 u16 PN offset of the reference pilot | 12 pilots of 4 to 1544 bytes, as F tells:
+//   10 u16 PN offset of the reference pilot | 12 pilots of 12 to 1544 bytes, as F tells:
 //   0 u16 PN offset, 4F + 12 u16 energy
 PlistDictionary activeSetGroup(const LogPacket& activeSet)
 {

@@ -56,6 +56,8 @@ void decodeScenario(benchmark::State& benchmarkState, const char* technologyName
 BENCHMARK_CAPTURE(decodeScenario, lte, "lte")->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(decodeScenario, gsm, "gsm")->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(decodeScenario, utran, "utran")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(decodeScenario, c2k, "c2k")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(decodeScenario, ifx, "ifx")->Unit(benchmark::kMillisecond);
 
 } // namespace
 

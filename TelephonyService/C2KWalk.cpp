@@ -93,12 +93,6 @@ double decibels(double ratio)
     return 10.0 * std::log10(ratio);
 }
 
-double pathLoss(double distance)
-{
-    const double withHeight = std::hypot(distance, 30.0);
-    return 38.0 * std::log10(withHeight / 30.0);
-}
-
 bool isIdle(const Phase& phase)
 {
     return phase.evdo == EVDOState::idle && phase.oneX != OneXState::traffic;
@@ -175,10 +169,8 @@ std::vector<const C2KCell*> C2KWalk::joinedCells(bool isBusy) const
 
 void C2KWalk::fade()
 {
-    for (double& shadowing : _shadowing)
-        shadowing = 0.99 * shadowing + _random.uniform(-0.4, 0.4);
-    for (double& noise : _chainNoise)
-        noise = 0.8 * noise + _random.uniform(-1.0, 1.0);
+    _shadowing.step(_random);
+    _chainNoise.step(_random);
 
     double strength = 0;
     for (const C2KCell* cell : heardCells())
@@ -246,7 +238,7 @@ const C2KCell& C2KWalk::strongestCell() const
 double C2KWalk::power(const C2KCell& cell) const
 {
     const auto index = static_cast<std::size_t>(&cell - streetCells.data());
-    const double level = -58.0 - pathLoss(_position - cell.position) + _shadowing.at(index);
+    const double level = -58.0 - pathLoss(_position - cell.position) + _shadowing.level(index);
     return std::pow(10.0, level / 10.0);
 }
 
@@ -271,7 +263,7 @@ double C2KWalk::evdoStrength(const C2KCell& cell) const
 
 double C2KWalk::receivedLevel(unsigned chain) const
 {
-    return decibels(totalPower()) + _chainNoise.at(chain);
+    return decibels(totalPower()) + _chainNoise.level(chain);
 }
 
 // Open loop: the weaker the network is heard, the louder the phone.

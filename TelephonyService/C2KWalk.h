@@ -1,5 +1,6 @@
 #pragma once
 
+#include "TelephonyService/Propagation.h"
 #include "TelephonyService/ScenarioRandom.h"
 
 #include <array>
@@ -109,8 +110,8 @@ class C2KWalk
     std::size_t _serving = 0;
     std::uint32_t _address = 0x0A1B00;
     bool _isFrameErased = false;
-    std::array<double, cellCount> _shadowing{}; ///< dB
-    std::array<double, 2> _chainNoise{};        ///< dB
+    Fading _shadowing{cellCount, 0.99, 0.4};
+    Fading _chainNoise{2, 0.8, 1.0};
     C2KTransfer _transfer;
 };
 

@@ -1,6 +1,7 @@
 #include "TelephonyService/CellMonitorScenario.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <functional>
 #include <vector>
@@ -49,12 +50,6 @@ constexpr std::array<UMTSStreetCell, 3> umtsCells{{
     {10787, 87, 1050},
 }};
 
-double pathLoss(double distance)
-{
-    const double withHeight = std::hypot(distance, 30.0);
-    return 38.0 * std::log10(withHeight / 30.0);
-}
-
 std::string levelText(double level)
 {
     return fmt::format("{} dBm", static_cast<int>(std::round(level)));
@@ -90,10 +85,8 @@ void CellMonitorScenario::move()
     _position += _direction * metresPerStep;
     if (_position > streetLength || _position < 0)
         _direction = -_direction;
-    for (double& shadowing : _gsmShadowing)
-        shadowing = 0.99 * shadowing + _random.uniform(-0.4, 0.4);
-    for (double& shadowing : _umtsShadowing)
-        shadowing = 0.99 * shadowing + _random.uniform(-0.4, 0.4);
+    _gsmShadowing.step(_random);
+    _umtsShadowing.step(_random);
     for (std::size_t cell = 0; cell < gsmCellCount; ++cell)
         if (gsmLevel(cell) > gsmLevel(_serving) + reselectionMargin)
             _serving = cell;
@@ -106,12 +99,12 @@ bool CellMonitorScenario::isInCall() const
 
 double CellMonitorScenario::gsmLevel(std::size_t cell) const
 {
-    return -55.0 - pathLoss(_position - gsmCells.at(cell).position) + _gsmShadowing.at(cell);
+    return -55.0 - pathLoss(_position - gsmCells.at(cell).position) + _gsmShadowing.level(cell);
 }
 
 double CellMonitorScenario::umtsLevel(std::size_t cell) const
 {
-    return -65.0 - pathLoss(_position - umtsCells.at(cell).position) + _umtsShadowing.at(cell);
+    return -65.0 - pathLoss(_position - umtsCells.at(cell).position) + _umtsShadowing.level(cell);
 }
 
 double CellMonitorScenario::bitErrors() const

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "TelephonyService/Propagation.h"
 #include "TelephonyService/Scenario.h"
 #include "TelephonyService/ScenarioRandom.h"
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 
@@ -38,8 +38,8 @@ class CellMonitorScenario : public Scenario
     double _position = 0;  ///< metres
     double _direction = 1; ///< 1 or -1
     std::size_t _serving = 0;
-    std::array<double, gsmCellCount> _gsmShadowing{};   ///< dB
-    std::array<double, umtsCellCount> _umtsShadowing{}; ///< dB
+    Fading _gsmShadowing{gsmCellCount, 0.99, 0.4};
+    Fading _umtsShadowing{umtsCellCount, 0.99, 0.4};
 };
 
 } // namespace ventrik

@@ -26,7 +26,7 @@ constexpr const char* usage =
     "A telephony service for machines without a baseband: answers the log-channel protocol and\n"
     "streams a built-in scenario, or a capture, to every viewer that connects.\n"
     "\n"
-    "  --technology NAME  the scenario of that technology: lte, gsm or utran\n"
+    "  --technology NAME  the scenario of that technology: lte, gsm, utran, c2k or ifx\n"
     "  --seed N           another drive through the same scenario (default 1)\n"
     "  --write CAPTURE    writes the scenario's messages to a capture instead, and ends\n"
     "  --count N          so many of them (default 10000)\n"

@@ -31,7 +31,7 @@ constexpr const char* usage =
     "\n"
     "Shows what the baseband tells, as a tree of tables that is brought up to date every 2 s.\n"
     "\n"
-    "  --demo TECHNOLOGY         brings its own telephony service (lte, gsm or utran)\n"
+    "  --demo TECHNOLOGY         brings its own telephony service (lte, gsm, utran, c2k or ifx)\n"
     "  --save-button             offers Save also where it is switched off\n"
     "  --snapshot-directory DIR  saves snapshots in DIR\n"
     "  --size WIDTHxHEIGHT       the window's size (default: that of the main screen)\n"

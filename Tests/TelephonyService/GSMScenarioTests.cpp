@@ -69,6 +69,7 @@ TEST(GSMScenario, SomeMessagesCarryTheTransportPrefix)
 
 TEST_F(GSMRideTest, FillsEveryKeyOfEverySection)
 {
+    shown.erase("/_sorted"); // marks the groups as sorted
     for (const auto& [key, texts] : shown)
         EXPECT_GT(texts.size(), texts.count("-")) << key;
     for (const char* key :

@@ -69,17 +69,15 @@ void ScenarioFixture::decode(const std::vector<TimedMessage>& messages, std::str
     }
 }
 
-// The elements of an array stand under the array's name; the mark of a sorted group is no value.
+// The elements of an array stand under the array's name.
 void ScenarioFixture::collect(const PlistValue& value, const std::string& parent,
                               const std::string& name)
 {
     if (value.string())
         shown[parent + "/" + name].insert(*value.string());
     else if (value.dictionary())
-        for (const auto& [key, entry] : *value.dictionary()) {
-            if (key != "_sorted")
-                collect(entry, name, key);
-        }
+        for (const auto& [key, entry] : *value.dictionary())
+            collect(entry, name, key);
     else if (value.array())
         for (const PlistValue& element : *value.array())
             collect(element, parent, name);

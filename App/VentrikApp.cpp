@@ -61,7 +61,7 @@ void VentrikApp::applicationDidFinishLaunching()
 
 void VentrikApp::createWindow()
 {
-    _window = std::make_unique<QWidget>();
+    setWindow(std::make_unique<QWidget>());
     _window->setWindowTitle(QStringLiteral("Ventrik"));
     // The texts and the names on the air are written that way, whatever the desktop's language is.
     _window->setLayoutDirection(Qt::LeftToRight);
@@ -112,7 +112,7 @@ void VentrikApp::applicationWillTerminate()
     setSaveViewController(nullptr);
     _window->hide();
     _navController = nullptr;
-    _window.reset();
+    setWindow(nullptr);
     _model.reset();
 }
 

@@ -51,6 +51,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
 
     /// Null before launch and after termination, as is the stack, which belongs to the window.
     QWidget* window() const { return _window.get(); }
+    void setWindow(std::unique_ptr<QWidget> window) { _window = std::move(window); }
     NavigationStack* navController() const { return _navController; }
 
     /// The save screen while it is open, else null.

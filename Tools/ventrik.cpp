@@ -150,6 +150,16 @@ void setWindowIcon(const Resources& resources)
         QApplication::setWindowIcon(QIcon(QString::fromStdString(*icon)));
 }
 
+VentrikApp* running = nullptr;
+
+// The toolkit ends the process when the display goes away, as it may at the session's end. There is
+// nothing left to take down in order then, but the setting is undone all the same.
+void undoSettingAtExit()
+{
+    if (running)
+        running->_setGSMRSSI(false);
+}
+
 int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
 {
     LinuxPlatformOptions platformOptions;
@@ -160,7 +170,10 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     setWindowIcon(platform.platform().resources);
     VentrikApp app(platform.platform(), options.app);
     app.applicationDidFinishLaunching();
+    running = &app;
+    std::atexit(undoSettingAtExit);
     const int status = QApplication::exec();
+    running = nullptr;
     app.applicationWillTerminate();
     return status;
 }

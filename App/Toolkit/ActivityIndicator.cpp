@@ -24,6 +24,7 @@ int currentSpoke()
 ActivityIndicator::ActivityIndicator(QWidget* parent) : QWidget(parent)
 {
     setFixedSize(ActivityIndicator::sizeHint());
+    setAccessibleName(QStringLiteral("In progress"));
 }
 
 void ActivityIndicator::startAnimating()

@@ -150,6 +150,16 @@ TEST_F(WindowProcess, ResetsTheHomeScreenOnlyWhenItEndsHoweverItIsAsked)
     }
 }
 
+TEST_F(WindowProcess, ResetsTheHomeScreenAlsoWhenTheDisplayGoesAway)
+{
+    const auto service = startScenario();
+    environment.insert("QT_PLUGIN_PATH", VENTRIK_TEST_PLUGINS);
+    environment.insert("QT_QPA_GENERIC_PLUGINS", "typist:loses-display");
+    const auto window = start("ventrik", {});
+    EXPECT_EQ(window->waitForEnd(), 1) << window->errors();
+    EXPECT_EQ(homeScreenPreferences(), "[General]\nHSShowGSMRSSI=false\n");
+}
+
 TEST_F(WindowProcess, TellsTheSessionBusThatThePreferenceHasChanged)
 {
     const auto bus = startBus();

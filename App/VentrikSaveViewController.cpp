@@ -9,6 +9,7 @@
 
 #include <QKeyEvent>
 #include <QMessageBox>
+#include <QValidator>
 
 #include <algorithm>
 #include <filesystem>
@@ -36,6 +37,22 @@ QFont rowFont()
     font.setPixelSize(rowPoints);
     return font;
 }
+
+/// Turns what is pasted and cannot stand in a file of text into spaces.
+class TextOnly : public QValidator
+{
+  public:
+    using QValidator::QValidator;
+
+    State validate(QString& input, int&) const override
+    {
+        for (QChar& character : input)
+            if (character.category() == QChar::Other_Control ||
+                character.category() == QChar::Other_NotAssigned)
+                character = u' ';
+        return Acceptable;
+    }
+};
 
 PlistValue deepCopy(const PlistValue& value)
 {
@@ -94,6 +111,7 @@ void VentrikSaveViewController::viewDidLoad()
         label->setFont(systemFont(labelPoints, FontWeight::Regular));
     saveDescription().setFont(systemFont(fieldPoints, FontWeight::Regular));
     saveDescription().setTextMargins(fieldMargin, 0, fieldMargin, 0);
+    saveDescription().setValidator(new TextOnly(this));
     connect(&saveDescription(), &QLineEdit::returnPressed, this,
             [this] { textFieldShouldReturn(saveDescription()); });
     connect(&saveButton(), &QPushButton::clicked, this, [this] { savePressed(); });

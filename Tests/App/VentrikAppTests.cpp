@@ -234,6 +234,13 @@ TEST_F(VentrikAppTest, TheSaveButtonOpensTheSaveScreenWithWhatThereIsToSave)
     EXPECT_EQ(savedRows(), 3); // two displays and the DLF
 }
 
+TEST_F(VentrikAppTest, BeforeTheServiceAnswersThereIsNothingToSave)
+{
+    app.applicationDidFinishLaunching();
+    app.showSaveView();
+    EXPECT_EQ(savedRows(), 0);
+}
+
 TEST_F(VentrikAppTest, ASecondPressOfSaveDoesNothing)
 {
     launchAndConnect();

@@ -445,4 +445,22 @@ TEST_F(PaneTest, ASwipeFromTheLeftEdgeOverRowsGoesBack)
     EXPECT_EQ(title(), "Ventrik");
 }
 
+TEST_F(PaneTest, OfTenThousandRowsOnlyThoseInViewExistBeforeAndAfterAReload)
+{
+    const auto numbered = [](const std::string& value) {
+        VentrikModelNode::Children leaves;
+        for (int i = 0; i < 10'000; ++i)
+            leaves.push_back(leaf(std::to_string(i), value));
+        return inner("Ventrik", std::move(leaves));
+    };
+    open(numbered("before"));
+    QTest::keyClick(&root->table(), Qt::Key_End);
+    const auto rows = root->table().visibleRows();
+    EXPECT_LT(rows.size(), 15U);
+    EXPECT_EQ(cell(9'999).key().text(), "9999");
+    root->reloadWithNode(numbered("after"));
+    EXPECT_EQ(root->table().visibleRows(), rows);
+    EXPECT_EQ(cell(9'999).value()->text(), "after");
+}
+
 } // namespace ventrik

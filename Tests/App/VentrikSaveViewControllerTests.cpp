@@ -4,6 +4,7 @@
 #include "Tests/Support/FakePlatform.h"
 
 #include <QApplication>
+#include <QClipboard>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMessageBox>
@@ -61,6 +62,11 @@ class SaveScreenTest : public testing::Test, public VentrikSaveHost
     {
         screen->saveDescription().setFocus();
         QTest::keyClicks(&screen->saveDescription(), text);
+    }
+    void saveDescriptionByPaste(const QString& text)
+    {
+        QGuiApplication::clipboard()->setText(text);
+        screen->saveDescription().paste();
     }
     void press(QPushButton& button) { QTest::mouseClick(&button, Qt::LeftButton); }
 
@@ -321,6 +327,16 @@ TEST_F(SaveScreenTest, TheTabKeyStaysOnTheScreen)
         ASSERT_TRUE(screen->isAncestorOf(QApplication::focusWidget()) ||
                     QApplication::focusWidget() == screen.get());
     }
+}
+
+TEST_F(SaveScreenTest, WhatIsPastedAndCannotBeWrittenBecomesSpaces)
+{
+    open(history());
+    saveDescriptionByPaste(QString("a\tb\nc") + QChar(1) + QChar(0xFFFF) +
+                           QString::fromUtf8("\xF0\x9F\x93\xA1"));
+    press(screen->saveButton());
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_EQ(*saved().find("Description"), PlistValue("a b c  \xF0\x9F\x93\xA1"));
 }
 
 } // namespace ventrik

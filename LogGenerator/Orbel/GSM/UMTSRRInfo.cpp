@@ -82,7 +82,8 @@ void UMTSRRInfo::updateFromTransmitPower(const LogPacket& packet)
         const int raw = samples.element(packet, i).i16(4);
         if (raw == 0)
             continue;
-        sum += (raw + 512) / 10 - 70;
+        const int power = (raw + 512) / 10 - 70;
+        sum += power;
         ++count;
     }
     show("Transmit Power", dbm(sum / count));

@@ -1,6 +1,7 @@
 #include "App/Toolkit/TableView.h"
 
 #include "App/Toolkit/TableAccessibility.h"
+#include "App/Toolkit/ThinScrollBar.h"
 
 #include <QAccessible>
 #include <QApplication>
@@ -31,6 +32,7 @@ TableView::TableView(QWidget* parent) : QAbstractScrollArea(parent)
     installTableAccessibility();
     setFrameShape(QFrame::NoFrame);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    setVerticalScrollBar(new ThinScrollBar(this));
     setFocusPolicy(Qt::StrongFocus);
     verticalScrollBar()->setSingleStep(wheelStep);
     viewport()->setBackgroundRole(QPalette::Base);

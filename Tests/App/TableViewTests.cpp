@@ -1,4 +1,5 @@
 #include "App/Toolkit/TableView.h"
+#include "App/Toolkit/ThinScrollBar.h"
 #include "Tests/App/TestScreen.h"
 
 #include <QAccessible>
@@ -211,6 +212,30 @@ TEST_F(TableViewTest, AReloadKeepsTheScrollPosition)
     table.verticalScrollBar()->setValue(1'234);
     table.reloadData();
     EXPECT_EQ(table.verticalScrollBar()->value(), 1'234);
+}
+
+TEST_F(TableViewTest, TheScrollBarTakesLittleOfTheWidth)
+{
+    show(8);
+    EXPECT_EQ(table.viewport()->width(), 300);
+    show(9);
+    QCoreApplication::processEvents(); // the bar comes with the next layout
+    EXPECT_EQ(table.viewport()->width(), 300 - ThinScrollBar::width);
+}
+
+TEST_F(TableViewTest, TheScrollBarFollowsThePalette)
+{
+    show(100);
+    const auto colorAtTheEnd = [this] {
+        const QImage picture = table.grab().toImage();
+        return picture.pixelColor(picture.width() - 4, picture.height() - 4);
+    };
+    QPalette palette = table.palette();
+    for (const QColor& base : {QColor(255, 255, 255), QColor(30, 30, 30)}) {
+        palette.setColor(QPalette::Base, base);
+        table.setPalette(palette);
+        EXPECT_EQ(colorAtTheEnd(), base);
+    }
 }
 
 TEST_F(TableViewTest, AShrunkenTableScrollsBackToItsEnd)

@@ -151,12 +151,14 @@ bool VentrikSaveViewController::writeFile(const std::string& fileName) const
     return writeSnapshot(snapshot, fileName, error);
 }
 
-// The window's, since the screen closes below it.
+// The window's, since the screen closes below it. The title stands inside as well: where windows
+// have no frames it would not be seen.
 void VentrikSaveViewController::showFileError()
 {
-    auto* alert = new QMessageBox(QMessageBox::Warning, QStringLiteral("File Error"),
-                                  QStringLiteral("Unable to write file to disk"),
-                                  QMessageBox::NoButton, window());
+    auto* alert =
+        new QMessageBox(QMessageBox::Warning, QStringLiteral("File Error"),
+                        QStringLiteral("<b>File Error</b>"), QMessageBox::NoButton, window());
+    alert->setInformativeText(QStringLiteral("Unable to write file to disk"));
     alert->addButton(QStringLiteral("Close"), QMessageBox::RejectRole);
     alert->setAttribute(Qt::WA_DeleteOnClose);
     alert->open();

@@ -260,7 +260,8 @@ TEST_F(SaveScreenTest, AFailedWriteIsLoggedAndShownAndTheScreenClosesAllTheSame)
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(alert()->isVisible());
     EXPECT_EQ(alert()->windowTitle(), "File Error");
-    EXPECT_EQ(alert()->text(), "Unable to write file to disk");
+    EXPECT_EQ(alert()->text(), "<b>File Error</b>");
+    EXPECT_EQ(alert()->informativeText(), "Unable to write file to disk");
     ASSERT_EQ(alert()->buttons().size(), 1);
     EXPECT_EQ(alert()->buttons().front()->text(), "Close");
     fake.mainQueue.run();

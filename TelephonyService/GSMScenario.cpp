@@ -112,11 +112,6 @@ GMMState gmmStateIn(Phase phase)
     }
 }
 
-std::uint8_t byteOf(double value)
-{
-    return static_cast<std::uint8_t>(rawLevel(value, 0, 1, 8));
-}
-
 // The records carry levels in dBm without their sign.
 std::uint8_t withoutSign(double dBm)
 {
@@ -137,15 +132,6 @@ std::uint8_t signedByte(double value)
 std::uint32_t rawEnergy(double ecno)
 {
     return static_cast<std::uint32_t>(524288.0 * std::pow(10.0, ecno / 10.0));
-}
-
-PlistDictionary cellEntry(std::string_view technology, bool isServing)
-{
-    return {{kQXCellMonitorCellRadioAccessTechnology, technology},
-            {kQXCellMonitorCellType,
-             isServing ? kQXCellMonitorCellTypeServing : kQXCellMonitorCellTypeNeighbor},
-            {kQXCellMonitorMCC, 262},
-            {kQXCellMonitorMNC, 7}};
 }
 
 } // namespace

@@ -208,17 +208,13 @@ void LTEScenario::reportCellMonitor()
         const bool isServing = &cell == &_drive.servingCell();
         if (!isServing && _drive.averageRsrp(cell) < detectableRsrp)
             continue;
-        cells.append(PlistDictionary{
-            {kQXCellMonitorCellRadioAccessTechnology, kQXCellMonitorRadioAccessTechnologyLTE},
-            {kQXCellMonitorCellType,
-             isServing ? kQXCellMonitorCellTypeServing : kQXCellMonitorCellTypeNeighbor},
-            {kQXCellMonitorMCC, 262},
-            {kQXCellMonitorMNC, 7},
-            {kQXCellMonitorTAC, cell.trackingAreaCode},
-            {kQXCellMonitorCellId, cell.cellIdentity},
-            {kQXCellMonitorPID, cell.physicalCellId},
-            {kQXCellMonitorBandInfo, cell.band},
-            {kQXCellMonitorUARFCN, cell.downlinkEarfcn}});
+        PlistDictionary entry = cellEntry(kQXCellMonitorRadioAccessTechnologyLTE, isServing);
+        entry.set(kQXCellMonitorTAC, cell.trackingAreaCode);
+        entry.set(kQXCellMonitorCellId, cell.cellIdentity);
+        entry.set(kQXCellMonitorPID, cell.physicalCellId);
+        entry.set(kQXCellMonitorBandInfo, cell.band);
+        entry.set(kQXCellMonitorUARFCN, cell.downlinkEarfcn);
+        cells.append(entry);
     }
     reportPropertyList(0xFF0001, cells);
 }

@@ -1,5 +1,6 @@
 #include "TelephonyService/Scenario.h"
 
+#include "Platform/TelephonyConstants.h"
 #include "PropertyList/PropertyListWriter.h"
 #include "TelephonyService/PacketBuilder.h"
 
@@ -84,6 +85,20 @@ std::uint16_t rawLevel(double level, double floor, double step, unsigned bits)
 {
     const double top = static_cast<double>((1U << bits) - 1);
     return static_cast<std::uint16_t>(std::clamp(std::round((level - floor) / step), 0.0, top));
+}
+
+std::uint8_t byteOf(double value)
+{
+    return static_cast<std::uint8_t>(rawLevel(value, 0, 1, 8));
+}
+
+PlistDictionary cellEntry(std::string_view technology, bool isServing)
+{
+    return {{kQXCellMonitorCellRadioAccessTechnology, technology},
+            {kQXCellMonitorCellType,
+             isServing ? kQXCellMonitorCellTypeServing : kQXCellMonitorCellTypeNeighbor},
+            {kQXCellMonitorMCC, 262},
+            {kQXCellMonitorMNC, 7}};
 }
 
 } // namespace ventrik

@@ -48,4 +48,10 @@ class Scenario : public MessageSource
 /// A level as a record carries it: steps above a floor, cut to what so many bits hold.
 std::uint16_t rawLevel(double level, double floor, double step, unsigned bits);
 
+/// A whole number as a byte carries it, cut to what that holds.
+std::uint8_t byteOf(double value);
+
+/// A cell of the phone's own network as the cell monitor tells it, still without numbers.
+PlistDictionary cellEntry(std::string_view technology, bool isServing);
+
 } // namespace ventrik

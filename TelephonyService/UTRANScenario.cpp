@@ -46,20 +46,6 @@ ChannelCounts channelsIn(RRCState state)
     }
 }
 
-std::uint8_t wholeNumber(double value)
-{
-    return static_cast<std::uint8_t>(rawLevel(value, 0, 1, 8));
-}
-
-PlistDictionary cellEntry(std::string_view technology, bool isServing)
-{
-    return {{kQXCellMonitorCellRadioAccessTechnology, technology},
-            {kQXCellMonitorCellType,
-             isServing ? kQXCellMonitorCellTypeServing : kQXCellMonitorCellTypeNeighbor},
-            {kQXCellMonitorMCC, 262},
-            {kQXCellMonitorMNC, 7}};
-}
-
 } // namespace
 
 void UTRANScenario::reportStep()
@@ -194,7 +180,7 @@ void UTRANScenario::reportTransportChannels()
     packet.size(17).bits(14, 6, 6, transport).bits(15, 4, 4, composite);
     for (unsigned i = 0; i < transport; ++i)
         packet.u8(17 + 2 * i, static_cast<std::uint8_t>(i + 1))
-            .u8(18 + 2 * i, wholeNumber(_walk.blockErrorRate(i)));
+            .u8(18 + 2 * i, byteOf(_walk.blockErrorRate(i)));
 
     constexpr unsigned firstDownlinkSlot = 4;
     std::size_t offset = 289 + 34 * std::size_t{transport};
@@ -202,7 +188,7 @@ void UTRANScenario::reportTransportChannels()
         packet.u8(offset, static_cast<std::uint8_t>(i + 1))
             .u8(offset + 1, static_cast<std::uint8_t>(firstDownlinkSlot + i));
         for (unsigned slot = 0; slot < UTRANWalk::slotCount; ++slot)
-            packet.u8(offset + 2 + slot, wholeNumber(_walk.signalToInterference(slot + i)));
+            packet.u8(offset + 2 + slot, byteOf(_walk.signalToInterference(slot + i)));
     }
     report(std::move(packet));
 }

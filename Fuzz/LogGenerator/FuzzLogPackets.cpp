@@ -33,6 +33,8 @@ MemoryResources shippedTemplates()
 {
     MemoryResources resources;
     for (const auto& entry : std::filesystem::directory_iterator(VENTRIK_RESOURCES)) {
+        if (entry.path().extension() != ".plist")
+            continue;
         std::ifstream file(entry.path(), std::ios::binary);
         resources.add("/" + entry.path().filename().string(),
                       Bytes{std::istreambuf_iterator<char>(file), {}});

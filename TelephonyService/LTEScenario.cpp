@@ -17,7 +17,7 @@ constexpr std::uint64_t idleNeighborSteps = 10; // every 0.5 s while idle
 constexpr std::uint64_t reselectionSteps = 40;  // every 2 s while idle
 constexpr int qrxlevmin = -124;                 // dBm
 constexpr double detectableRsrp = -118;         // dBm
-constexpr std::size_t measuredNeighbours = 2;
+constexpr double measurableMargin = 26;         // dB below the serving cell
 
 } // namespace
 
@@ -122,9 +122,13 @@ void LTEScenario::reportConnectedMeasurement()
         .u16(23, rawLevel(rsrp, -140, 0.25, 16))
         .u16(25, rawLevel(_drive.rsrq(serving, rsrp), -20, 0.125, 16));
 
-    const auto neighbours = neighborsOfServingCell();
-    const std::size_t measured = std::min(neighbours.size(), measuredNeighbours);
-    const std::size_t detected = neighbours.size() - measured;
+    // What is much weaker than the serving cell is noticed, but not measured.
+    auto neighbours = neighborsOfServingCell();
+    const auto weak = std::ranges::stable_partition(neighbours, [&](const LTECell* cell) {
+        return _drive.averageRsrp(*cell) > rsrp - measurableMargin;
+    });
+    const std::size_t detected = weak.size();
+    const std::size_t measured = neighbours.size() - detected;
     packet.u8(27, static_cast<std::uint8_t>(measured)).u8(28, static_cast<std::uint8_t>(detected));
     std::size_t offset = 29;
     for (std::size_t i = 0; i < measured; ++i, offset += 6) {

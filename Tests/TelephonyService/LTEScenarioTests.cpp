@@ -104,8 +104,9 @@ TEST_F(DriveTest, FillsEveryKeyOfEverySection)
     for (const auto& [key, texts] : shown)
         EXPECT_GT(texts.size(), texts.count("-")) << key;
     for (const char* key :
-         {"Measured Neighbor Cells/Filtered RSRP", "Neighbor Cells List/Srxlev",
-          "Reselection Candidates List/Cell ID", "PDP Context Info/APN", "SIM Info/EF-OPLMNAcT"})
+         {"Measured Neighbor Cells/Filtered RSRP", "Detected Cells/Physical Cell ID",
+          "Neighbor Cells List/Srxlev", "Reselection Candidates List/Cell ID",
+          "PDP Context Info/APN", "SIM Info/EF-OPLMNAcT"})
         EXPECT_TRUE(shown.contains(key)) << key;
 }
 

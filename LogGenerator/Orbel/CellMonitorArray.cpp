@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/CellMonitorArray.h"
 
 #include "Platform/TelephonyConstants.h"
-#include "PropertyList/PropertyListReader.h"
 
 #include <algorithm>
 #include <cmath>
@@ -31,7 +30,7 @@ bool entryIs(const PlistDictionary& cell, std::string_view key, std::string_view
 
 std::optional<PlistArray> parseCellMonitorArray(const LogPacket& packet, SystemLog& log)
 {
-    const PropertyListReading reading = readPropertyList(packet.payload());
+    const PropertyListReading& reading = packet.propertyList();
     if (reading && reading.value->array())
         return *reading.value->array();
     log.error("Cell Info Array data could not be constructed");

@@ -12,6 +12,13 @@ ByteView LogPacket::payload() const
     return _bytes.subspan(std::min(logPacketHeaderSize, _bytes.size()));
 }
 
+const PropertyListReading& LogPacket::propertyList() const
+{
+    if (!_propertyList)
+        _propertyList = std::make_shared<const PropertyListReading>(readPropertyList(payload()));
+    return *_propertyList;
+}
+
 LogPacket LogPacket::from(std::size_t offset) const
 {
     return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));

@@ -1,9 +1,11 @@
 #pragma once
 
 #include "PropertyList/PlistValue.h"
+#include "PropertyList/PropertyListReader.h"
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 
 namespace ventrik
 {
@@ -28,6 +30,9 @@ class LogPacket
     ByteView bytes() const { return _bytes; }
     /// What follows the header; empty when there is none.
     ByteView payload() const;
+    /// What follows the header, read as a property list: once, at the first asking, however many
+    /// sections want the packet. They must leave its containers as they are.
+    const PropertyListReading& propertyList() const;
     /// The packet from an offset on, as the place from which a repeated element counts.
     LogPacket from(std::size_t offset) const;
 
@@ -53,6 +58,7 @@ class LogPacket
 
   private:
     ByteView _bytes;
+    mutable std::shared_ptr<const PropertyListReading> _propertyList;
 };
 
 /// The elements of a repeated record: `count` of them, one every `stride` bytes from `offset`. An

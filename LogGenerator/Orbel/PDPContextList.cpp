@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/PDPContextList.h"
 
 #include "LogGenerator/Orbel/UnparsableDataException.h"
-#include "PropertyList/PropertyListReader.h"
 
 namespace ventrik
 {
@@ -28,7 +27,7 @@ std::vector<std::uint32_t> PDPContextList::getLogCodeArray() const
 void PDPContextList::updateWithData(const LogPacket& packet, std::uint32_t)
 {
     log().warning("PDPContextList");
-    const PropertyListReading reading = readPropertyList(packet.payload());
+    const PropertyListReading& reading = packet.propertyList();
     if (!reading) {
         log().error("PDP context data could not be constructed");
         throw UnparsableDataException();

@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/SimInfo.h"
 
 #include "LogGenerator/Orbel/UnparsableDataException.h"
-#include "PropertyList/PropertyListReader.h"
 
 #include <array>
 
@@ -54,7 +53,7 @@ void SimInfo::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     log().warning("SimInfo");
     if (logCode != simFilesLogCode)
         return;
-    const PropertyListReading reading = readPropertyList(packet.payload());
+    const PropertyListReading& reading = packet.propertyList();
     const PlistDictionary* files = reading ? reading.value->dictionary() : nullptr;
     if (!files) {
         log().error("SIM File dictionary data could not be constructed");

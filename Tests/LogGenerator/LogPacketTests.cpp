@@ -28,6 +28,24 @@ TEST(LogPacket, ReadsBigEndianWords)
     EXPECT_EQ(LogPacket(bytes).u16BigEndian(0), 0x1234);
 }
 
+TEST(LogPacket, ReadsThePropertyListBehindTheHeaderOnce)
+{
+    const Bytes bytes = propertyListPacket(0xFF0001, PlistArray{"cell"});
+    const LogPacket packet(bytes);
+    const PropertyListReading& reading = packet.propertyList();
+    ASSERT_TRUE(reading);
+    EXPECT_EQ(*reading.value, PlistArray{"cell"});
+    EXPECT_EQ(&packet.propertyList(), &reading);
+}
+
+TEST(LogPacket, TellsWhyThereIsNoPropertyList)
+{
+    const Bytes bytes = PacketBuilder(0xFF0001).u8(13, 'x').build();
+    const LogPacket packet(bytes);
+    EXPECT_FALSE(packet.propertyList());
+    EXPECT_FALSE(packet.propertyList().error.empty());
+}
+
 TEST(LogPacket, ReadsZeroPastTheEnd)
 {
     const Bytes bytes{0x11, 0x22};

@@ -124,11 +124,12 @@ void LTEScenario::reportConnectedMeasurement()
 
     // What is much weaker than the serving cell is noticed, but not measured.
     auto neighbours = neighborsOfServingCell();
-    const auto weak = std::ranges::stable_partition(neighbours, [&](const LTECell* cell) {
-        return _drive.averageRsrp(*cell) > rsrp - measurableMargin;
-    });
-    const std::size_t detected = weak.size();
-    const std::size_t measured = neighbours.size() - detected;
+    const auto firstWeak =
+        std::stable_partition(neighbours.begin(), neighbours.end(), [&](const LTECell* cell) {
+            return _drive.averageRsrp(*cell) > rsrp - measurableMargin;
+        });
+    const auto measured = static_cast<std::size_t>(firstWeak - neighbours.begin());
+    const std::size_t detected = neighbours.size() - measured;
     packet.u8(27, static_cast<std::uint8_t>(measured)).u8(28, static_cast<std::uint8_t>(detected));
     std::size_t offset = 29;
     for (std::size_t i = 0; i < measured; ++i, offset += 6) {

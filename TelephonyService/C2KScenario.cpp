@@ -16,11 +16,6 @@ constexpr std::uint64_t pilotSteps = 4;    // every 0.2 s
 constexpr std::uint64_t dataSteps = 20;    // every 1 s
 constexpr std::uint64_t systemSteps = 100; // every 5 s
 
-std::uint8_t signedByte(double value)
-{
-    return static_cast<std::uint8_t>(static_cast<int>(std::clamp(value, -128.0, 127.0)));
-}
-
 // A strength in dB as a ratio in steps of 1/512.
 std::uint16_t rawStrength(double strength)
 {
@@ -50,7 +45,7 @@ std::size_t addSubpacket(PacketBuilder& packet, std::size_t start, std::uint8_t 
 
 std::uint8_t rawReceiveLevel(double level)
 {
-    return signedByte(std::round((level + 63.248) / 0.334));
+    return signedByteOf((level + 63.248) / 0.334);
 }
 
 } // namespace
@@ -183,9 +178,9 @@ void C2KScenario::reportEVDOStatus()
     report(PacketBuilder(0x1183)
                .bits(13, 0, 11, system.evdoChannel)
                .bits(14, 3, 5, system.evdoBandClass)
-               .u8(15, signedByte(_walk.receivedLevel(0)))
-               .u8(16, signedByte(_walk.receivedLevel(1)))
-               .u8(17, signedByte(_walk.transmittedLevel()))
+               .u8(15, signedByteOf(_walk.receivedLevel(0)))
+               .u8(16, signedByteOf(_walk.receivedLevel(1)))
+               .u8(17, signedByteOf(_walk.transmittedLevel()))
                .u16(18, hasPilot ? _walk.servingCell().pnOffset : std::uint16_t{0xFFFF})
                .u8(36, static_cast<std::uint8_t>(_walk.evdoState()))
                .u8(37, static_cast<std::uint8_t>(_walk.session()))

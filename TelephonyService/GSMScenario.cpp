@@ -123,11 +123,6 @@ std::uint16_t signedWord(double value)
     return static_cast<std::uint16_t>(std::lround(value));
 }
 
-std::uint8_t signedByte(double value)
-{
-    return static_cast<std::uint8_t>(std::clamp(std::lround(value), -128L, 127L));
-}
-
 // Energies stand in steps of a 524288th of the carrier's.
 std::uint32_t rawEnergy(double ecno)
 {
@@ -411,7 +406,7 @@ void GSMScenario::reportRankedCells()
             const double level = _ride.rssi(*cell);
             packet.u16(offset, cell->arfcn)
                 .u16(offset + 2, cell->bsic)
-                .u8(offset + 4, signedByte(level))
+                .u8(offset + 4, signedByteOf(level))
                 .u16(offset + 5, signedWord(level));
             offset += 7;
         }
@@ -423,9 +418,9 @@ void GSMScenario::reportRankedCells()
             const double level = _ride.rscp(*cell);
             packet.u16(offset, cell->uarfcn)
                 .u16(offset + 2, cell->scramblingCode)
-                .u8(offset + 4, signedByte(level + 21))
+                .u8(offset + 4, signedByteOf(level + 21))
                 .u16(offset + 5, signedWord(level))
-                .u8(offset + 7, signedByte(2.0 * _ride.ecno(*cell)))
+                .u8(offset + 7, signedByteOf(2.0 * _ride.ecno(*cell)))
                 .u16(offset + 8, signedWord(level));
             offset += 10;
         }

@@ -92,6 +92,11 @@ std::uint8_t byteOf(double value)
     return static_cast<std::uint8_t>(rawLevel(value, 0, 1, 8));
 }
 
+std::uint8_t signedByteOf(double value)
+{
+    return static_cast<std::uint8_t>(std::clamp(std::lround(value), -128L, 127L));
+}
+
 PlistDictionary cellEntry(std::string_view technology, bool isServing)
 {
     return {{kQXCellMonitorCellRadioAccessTechnology, technology},

@@ -50,6 +50,8 @@ std::uint16_t rawLevel(double level, double floor, double step, unsigned bits);
 
 /// A whole number as a byte carries it, cut to what that holds.
 std::uint8_t byteOf(double value);
+/// The same for a signed one.
+std::uint8_t signedByteOf(double value);
 
 /// A cell of the phone's own network as the cell monitor tells it, still without numbers.
 PlistDictionary cellEntry(std::string_view technology, bool isServing);

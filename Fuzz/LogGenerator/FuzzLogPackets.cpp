@@ -2,13 +2,11 @@
 #include "LogGenerator/LogGenerator.h"
 #include "Tests/Support/FixedClock.h"
 #include "Tests/Support/MemoryResources.h"
+#include "Tests/Support/ResourceFiles.h"
 
 #include <algorithm>
 #include <array>
 #include <cstdio>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
 
 namespace ventrik
 {
@@ -32,13 +30,7 @@ constexpr std::array technologies{"lte", "gsm", "utran", "c2k"};
 MemoryResources shippedTemplates()
 {
     MemoryResources resources;
-    for (const auto& entry : std::filesystem::directory_iterator(VENTRIK_RESOURCES)) {
-        if (entry.path().extension() != ".plist")
-            continue;
-        std::ifstream file(entry.path(), std::ios::binary);
-        resources.add("/" + entry.path().filename().string(),
-                      Bytes{std::istreambuf_iterator<char>(file), {}});
-    }
+    addTemplates(resources, VENTRIK_RESOURCES);
     return resources;
 }
 

@@ -1,5 +1,6 @@
 #include "Capture/CaptureTechnology.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
+#include "Tests/Support/ResourceFiles.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -13,7 +14,6 @@ namespace
 {
 
 const std::filesystem::path goldenDirectory = VENTRIK_GOLDEN;
-const std::filesystem::path resourceDirectory = VENTRIK_RESOURCES;
 
 // Packets in hexadecimal, with an empty line between one and the next.
 std::vector<Bytes> readPackets(const std::filesystem::path& file)
@@ -82,13 +82,7 @@ class GoldenPacketTest : public GeneratorFixture, public testing::WithParamInter
   protected:
     void SetUp() override
     {
-        for (const auto& entry : std::filesystem::directory_iterator(resourceDirectory)) {
-            if (entry.path().extension() != ".plist")
-                continue;
-            std::ifstream file(entry.path(), std::ios::binary);
-            platform.resources.add(fmt::format("/{}", entry.path().filename().string()),
-                                   Bytes{std::istreambuf_iterator<char>(file), {}});
-        }
+        addTemplates(platform.resources, VENTRIK_RESOURCES);
         packets = readPackets(goldenDirectory / (GetParam() + ".hex"));
     }
     std::unique_ptr<LogGenerator> makeGenerator()

@@ -1,8 +1,7 @@
 #include "Tests/Model/ModelFixture.h"
 
 #include "PropertyList/PropertyListWriter.h"
-
-#include <fstream>
+#include "Tests/Support/ResourceFiles.h"
 
 namespace ventrik
 {
@@ -23,8 +22,7 @@ std::string withoutAddresses(std::string text)
 
 ModelFixture::ModelFixture()
 {
-    std::ifstream file(VENTRIK_RESOURCES "/LTE.plist", std::ios::binary);
-    fake.resources.add("/res/LTE.plist", Bytes{std::istreambuf_iterator<char>(file), {}});
+    addFile(fake.resources, VENTRIK_RESOURCES "/LTE.plist");
     fake.ports.listen(remoteName);
     answerTechnology(kQXLogChannelTechnology_Orbel_LTE);
 }

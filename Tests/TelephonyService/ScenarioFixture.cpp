@@ -1,9 +1,9 @@
 #include "Tests/TelephonyService/ScenarioFixture.h"
 
 #include "LogGenerator/Orbel/LogPacket.h"
+#include "Tests/Support/ResourceFiles.h"
 
 #include <algorithm>
-#include <fstream>
 
 #include <fmt/format.h>
 
@@ -56,10 +56,7 @@ std::size_t prefixedCount(const std::vector<TimedMessage>& messages)
 void ScenarioFixture::decode(const std::vector<TimedMessage>& messages, std::string_view technology,
                              const std::string& templateName)
 {
-    std::ifstream file(fmt::format("{}/{}.plist", VENTRIK_RESOURCES, templateName),
-                       std::ios::binary);
-    fake.resources.add(fmt::format("/res/{}.plist", templateName),
-                       Bytes{std::istreambuf_iterator<char>(file), {}});
+    addFile(fake.resources, fmt::format("{}/{}.plist", VENTRIK_RESOURCES, templateName));
     const auto generator =
         LogGenerator::generatorFromTechnology(technology, {fake.log, fake.resources, fake.clock});
     PlistDictionary state;

@@ -3,6 +3,7 @@
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "Capture/SnapshotFile.h"
+#include "Files/PrivateFile.h"
 #include "LogGenerator/DateText.h"
 
 #include <ui_VentrikSaveViewController.h>
@@ -12,7 +13,6 @@
 #include <QValidator>
 
 #include <algorithm>
-#include <filesystem>
 
 namespace ventrik
 {
@@ -145,10 +145,14 @@ bool VentrikSaveViewController::writeFile(const std::string& fileName) const
 {
     const PlistDictionary snapshot =
         makeSnapshot(dateText(_timeStamp), _saveHistory, saveDescription().text().toStdString());
-    std::error_code ignored; // where there is no directory, the file cannot be written either
-    std::filesystem::create_directories(_directory, ignored);
-    std::string error;
-    return writeSnapshot(snapshot, fileName, error);
+    makePrivateDirectories(_directory); // where there is none, the file cannot be written either
+    const auto writing = writeSnapshot(snapshot, fileName);
+    if (!writing)
+        _platform.log.error("Snapshot not written: {}", writing.error);
+    else if (writing.replaced > 0)
+        _platform.log.error("Snapshot {}: {} characters that XML cannot carry are U+FFFD", fileName,
+                            writing.replaced);
+    return static_cast<bool>(writing);
 }
 
 // The window's, since the screen closes below it. The title stands inside as well: where windows

@@ -1,9 +1,12 @@
 #include "Capture/CaptureWriter.h"
 
+#include <cerrno>
 #include <cstdio>
+#include <cstring>
 
 #include <fmt/format.h>
 #include <pcap/pcap.h>
+#include <unistd.h>
 
 namespace ventrik
 {
@@ -18,9 +21,9 @@ void CaptureWriter::Closer::operator()(pcap_dumper* dumper) const
     pcap_dump_close(dumper);
 }
 
-CaptureWriter::CaptureWriter(std::unique_ptr<pcap, Closer> handle,
+CaptureWriter::CaptureWriter(PrivateFile file, std::unique_ptr<pcap, Closer> handle,
                              std::unique_ptr<pcap_dumper, Closer> dumper)
-    : _handle(std::move(handle)), _dumper(std::move(dumper))
+    : _file(std::move(file)), _handle(std::move(handle)), _dumper(std::move(dumper))
 {
 }
 
@@ -28,14 +31,21 @@ std::optional<CaptureWriter> CaptureWriter::create(const std::string& path,
                                                    const CaptureTechnology& technology,
                                                    std::string& error)
 {
+    auto file = PrivateFile::create(path, error);
+    if (!file)
+        return std::nullopt;
     std::unique_ptr<pcap, Closer> handle(
         pcap_open_dead(technology.linkType, static_cast<int>(maximumMessageSize)));
-    std::unique_ptr<pcap_dumper, Closer> dumper(pcap_dump_open(handle.get(), path.c_str()));
+    // The library closes the stream that it writes to, hence one of its own.
+    std::FILE* stream = ::fdopen(::dup(::fileno(file->stream())), "w");
+    std::unique_ptr<pcap_dumper, Closer> dumper(stream ? pcap_dump_fopen(handle.get(), stream)
+                                                       : nullptr);
     if (!dumper) {
-        error = pcap_geterr(handle.get());
+        error =
+            fmt::format("{}: {}", path, stream ? pcap_geterr(handle.get()) : std::strerror(errno));
         return std::nullopt;
     }
-    return CaptureWriter(std::move(handle), std::move(dumper));
+    return CaptureWriter(std::move(*file), std::move(handle), std::move(dumper));
 }
 
 bool CaptureWriter::write(Clock::TimePoint time, ByteView message)
@@ -54,9 +64,15 @@ bool CaptureWriter::write(Clock::TimePoint time, ByteView message)
     return true;
 }
 
-bool CaptureWriter::flush()
+bool CaptureWriter::commit(std::string& error)
 {
-    return pcap_dump_flush(_dumper.get()) == 0 && std::ferror(pcap_dump_file(_dumper.get())) == 0;
+    errno = 0;
+    const bool isFlushed =
+        pcap_dump_flush(_dumper.get()) == 0 && std::ferror(pcap_dump_file(_dumper.get())) == 0;
+    if (isFlushed)
+        return _file.commit(error);
+    error = fmt::format("{}: {}", _file.path(), std::strerror(errno == 0 ? EIO : errno));
+    return false;
 }
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "Capture/CaptureTechnology.h"
+#include "Files/PrivateFile.h"
 #include "Platform/Clock.h"
 #include "PropertyList/PlistValue.h"
 
@@ -22,23 +23,26 @@ class CaptureWriter
     /// The most that readers of the format take in one record.
     static constexpr std::size_t maximumMessageSize = 262144;
 
-    /// Creates or overwrites a file. On failure `error` says why in one line.
+    /// Begins a file that takes its name, and the place of what has it, at `commit`. On failure
+    /// `error` says why in one line.
     static std::optional<CaptureWriter>
     create(const std::string& path, const CaptureTechnology& technology, std::string& error);
 
     /// False, with nothing written, for a message above `maximumMessageSize`.
     bool write(Clock::TimePoint time, ByteView message);
-    /// False when something did not reach the file.
-    bool flush();
+    /// After the last message. False, and the error, when something did not reach the file; there
+    /// is none then.
+    bool commit(std::string& error);
 
   private:
     struct Closer {
         void operator()(pcap* handle) const;
         void operator()(pcap_dumper* dumper) const;
     };
-    CaptureWriter(std::unique_ptr<pcap, Closer> handle,
+    CaptureWriter(PrivateFile file, std::unique_ptr<pcap, Closer> handle,
                   std::unique_ptr<pcap_dumper, Closer> dumper);
 
+    PrivateFile _file;
     std::unique_ptr<pcap, Closer> _handle;
     std::unique_ptr<pcap_dumper, Closer> _dumper;
 };

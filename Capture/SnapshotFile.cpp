@@ -1,10 +1,7 @@
 #include "Capture/SnapshotFile.h"
 
+#include "Files/PrivateFile.h"
 #include "PropertyList/PropertyListWriter.h"
-
-#include <cerrno>
-#include <cstring>
-#include <fstream>
 
 #include <fmt/format.h>
 
@@ -29,21 +26,16 @@ std::string snapshotFileName(const std::string& directory, Clock::TimePoint now)
     return fmt::format("{}/VentrikSnapshot-{}.ventrik", directory, seconds);
 }
 
-bool writeSnapshot(const PlistDictionary& snapshot, const std::string& fileName, std::string& error)
+SnapshotWriting writeSnapshot(const PlistDictionary& snapshot, const std::string& fileName)
 {
-    const auto writing = writeXmlPropertyList(snapshot);
-    if (!writing) {
-        error = fmt::format("{}: {}", fileName, writing.error);
-        return false;
-    }
-    std::ofstream file(fileName, std::ios::binary | std::ios::trunc);
-    file << *writing.text;
-    file.close();
-    if (!file) {
-        error = fmt::format("{}: {}", fileName, std::strerror(errno));
-        return false;
-    }
-    return true;
+    const auto writing = writeXmlPropertyListReplacing(snapshot);
+    SnapshotWriting result{{}, writing.replaced};
+    auto file = PrivateFile::create(fileName, result.error);
+    if (!file)
+        return result;
+    file->write(*writing.text);
+    file->commit(result.error);
+    return result;
 }
 
 } // namespace ventrik

@@ -3,6 +3,7 @@
 #include "Platform/Clock.h"
 #include "PropertyList/PlistValue.h"
 
+#include <cstddef>
 #include <optional>
 #include <string>
 
@@ -18,8 +19,13 @@ PlistDictionary makeSnapshot(const std::string& timestamp,
 /// DIRECTORY/VentrikSnapshot-SECONDS.ventrik, so that two saves within a second write one file.
 std::string snapshotFileName(const std::string& directory, Clock::TimePoint now);
 
-/// Writes an XML property list straight to its final name. On failure `error` says why.
-bool writeSnapshot(const PlistDictionary& snapshot, const std::string& fileName,
-                   std::string& error);
+struct SnapshotWriting {
+    std::string error;        ///< one line; empty when the file was written
+    std::size_t replaced = 0; ///< characters and values that XML cannot carry: U+FFFD stands there
+
+    explicit operator bool() const { return error.empty(); }
+};
+/// Writes an XML property list as a private file, which is there when it is whole.
+SnapshotWriting writeSnapshot(const PlistDictionary& snapshot, const std::string& fileName);
 
 } // namespace ventrik

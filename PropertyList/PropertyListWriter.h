@@ -2,6 +2,7 @@
 
 #include "PropertyList/PlistValue.h"
 
+#include <cstddef>
 #include <optional>
 #include <string>
 
@@ -12,6 +13,8 @@ namespace ventrik
 struct PropertyListWriting {
     std::optional<std::string> text;
     std::string error;
+    /// How many characters and values were replaced by U+FFFD.
+    std::size_t replaced = 0;
 
     explicit operator bool() const { return text.has_value(); }
 };
@@ -20,5 +23,9 @@ struct PropertyListWriting {
 /// levels. Refused: strings that are not UTF-8 or hold a character that XML cannot carry, dates
 /// outside the years 1 to 9999, nesting beyond `propertyListMaximumDepth`.
 PropertyListWriting writeXmlPropertyList(const PlistValue& value);
+
+/// The same, and nothing is refused: in the place of each such character stands U+FFFD, and of each
+/// such date and container a string of that character.
+PropertyListWriting writeXmlPropertyListReplacing(const PlistValue& value);
 
 } // namespace ventrik

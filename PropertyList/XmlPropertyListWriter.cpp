@@ -16,11 +16,17 @@ namespace
 {
 
 constexpr std::size_t dataLineLength = 76;
+constexpr std::string_view replacement = "\uFFFD";
+
+enum class Unfit { Refused, Replaced };
 
 // Writes one document, knowing the way to the value at hand for indentation and errors.
 class XmlWriter
 {
   public:
+    explicit XmlWriter(Unfit unfit) : _unfit(unfit) {}
+
+    std::size_t replaced() const { return _replaced; }
     std::string write(const PlistValue& value)
     {
         _text = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">\n";
@@ -69,19 +75,30 @@ class XmlWriter
 
     void writeText(std::string_view name, std::string_view text)
     {
-        if (const auto problem = xmlTextProblem(text))
+        const auto problem = xmlTextProblem(text);
+        if (problem && _unfit == Unfit::Refused)
             fail(fmt::format("in the {}, {}", name, *problem));
         std::string escaped;
-        appendEscaped(escaped, text);
+        appendEscaped(escaped, problem ? replaceUnfit(text, _replaced) : text);
         writeElement(name, escaped);
+    }
+
+    // Writes U+FFFD for a value that cannot be written, where that is wanted.
+    void replaceOrFail(std::string_view problem)
+    {
+        if (_unfit == Unfit::Refused)
+            fail(problem);
+        ++_replaced;
+        writeElement("string", replacement);
     }
 
     void writeDate(PlistDate date)
     {
         const auto text = formatIsoDate(date);
-        if (!text)
-            fail("the date is outside the years 1 to 9999");
-        writeElement("date", *text);
+        if (text)
+            writeElement("date", *text);
+        else
+            replaceOrFail("the date is outside the years 1 to 9999");
     }
 
     void writeData(const Bytes& data)
@@ -95,8 +112,10 @@ class XmlWriter
 
     void writeArray(const PlistArray& array)
     {
+        if (isTooDeep())
+            return replaceOrFail(tooDeep());
         if (array.empty())
-            return writeEmpty("<array/>");
+            return writeLine("<array/>");
         writeLine("<array>");
         for (std::size_t i = 0; i < array.size(); ++i) {
             enter(i);
@@ -108,8 +127,10 @@ class XmlWriter
 
     void writeDictionary(const PlistDictionary& dictionary)
     {
+        if (isTooDeep())
+            return replaceOrFail(tooDeep());
         if (dictionary.empty())
-            return writeEmpty("<dict/>");
+            return writeLine("<dict/>");
         writeLine("<dict>");
         for (const PlistDictionary::Entry& entry : dictionary) {
             enter(std::string_view(entry.key));
@@ -120,23 +141,13 @@ class XmlWriter
         writeLine("</dict>");
     }
 
-    void writeEmpty(std::string_view line)
-    {
-        checkDepth();
-        writeLine(line);
-    }
-
-    void enter(Step step)
-    {
-        checkDepth();
-        _path.push_back(step);
-    }
+    void enter(Step step) { _path.push_back(step); }
 
     // A container at the path needs a level of its own.
-    void checkDepth() const
+    bool isTooDeep() const { return _path.size() == propertyListMaximumDepth; }
+    static std::string tooDeep()
     {
-        if (_path.size() == propertyListMaximumDepth)
-            fail(fmt::format("nesting deeper than {}", propertyListMaximumDepth));
+        return fmt::format("nesting deeper than {}", propertyListMaximumDepth);
     }
 
     [[noreturn]] void fail(std::string_view problem) const
@@ -157,19 +168,33 @@ class XmlWriter
         return path.empty() ? "/" : path;
     }
 
+    Unfit _unfit;
+    std::size_t _replaced = 0;
     std::string _text;
     std::vector<Step> _path;
 };
+
+PropertyListWriting writeXml(const PlistValue& value, Unfit unfit)
+{
+    try {
+        XmlWriter writer(unfit);
+        std::string text = writer.write(value);
+        return {std::move(text), {}, writer.replaced()};
+    } catch (const PropertyListError& error) {
+        return {std::nullopt, fmt::format("property list not written: {}", error.what())};
+    }
+}
 
 } // namespace
 
 PropertyListWriting writeXmlPropertyList(const PlistValue& value)
 {
-    try {
-        return {XmlWriter().write(value), {}};
-    } catch (const PropertyListError& error) {
-        return {std::nullopt, fmt::format("property list not written: {}", error.what())};
-    }
+    return writeXml(value, Unfit::Refused);
+}
+
+PropertyListWriting writeXmlPropertyListReplacing(const PlistValue& value)
+{
+    return writeXml(value, Unfit::Replaced);
 }
 
 } // namespace ventrik

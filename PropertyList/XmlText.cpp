@@ -102,6 +102,20 @@ std::optional<std::string> xmlTextProblem(std::string_view text)
     return std::nullopt;
 }
 
+std::string replaceUnfit(std::string_view text, std::size_t& count)
+{
+    constexpr char32_t replacement = 0xfffd;
+    std::string result;
+    for (std::size_t place = 0; place < text.size();) {
+        const Utf8Character character = decodeUtf8(text.substr(place));
+        const bool isFit = character.length != 0 && isXmlCharacter(character.code);
+        appendUtf8(result, isFit ? character.code : replacement);
+        count += isFit ? 0 : 1;
+        place += std::max<std::size_t>(character.length, 1);
+    }
+    return result;
+}
+
 void appendEscaped(std::string& written, std::string_view text)
 {
     while (!text.empty()) {

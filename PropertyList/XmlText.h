@@ -22,6 +22,10 @@ std::string_view trimXmlSpace(std::string_view text);
 /// cannot carry and where it is. Nothing when all is well.
 std::optional<std::string> xmlTextProblem(std::string_view text);
 
+/// The text with U+FFFD in the place of each byte that is not UTF-8 and of each character that XML
+/// cannot carry; they are added to the count.
+std::string replaceUnfit(std::string_view text, std::size_t& count);
+
 /// Adds the text so that a reader gets it back exactly, carriage returns included.
 void appendEscaped(std::string& written, std::string_view text);
 

@@ -31,9 +31,9 @@ bool writeScenarioCapture(MessageSource& source, std::uint64_t messageCount,
             break;
         isWritten = writer->write(captureStart + message->due, message->data);
     }
-    if (isWritten && writer->flush())
-        return true;
-    error = fmt::format("{}: the capture could not be written", path);
+    if (isWritten)
+        return writer->commit(error);
+    error = fmt::format("{}: a message is too large for a capture", path);
     return false;
 }
 

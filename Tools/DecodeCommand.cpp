@@ -155,11 +155,13 @@ class Decoding
             return true;
         const auto snapshot =
             makeSnapshot(dateText(_clock.now()), _decoder.saveContents(), _options.description);
-        std::string error;
-        if (writeSnapshot(snapshot, *_options.snapshotFile, error))
-            return true;
-        complain(error);
-        return false;
+        const auto writing = writeSnapshot(snapshot, *_options.snapshotFile);
+        if (!writing)
+            complain(writing.error);
+        else if (writing.replaced > 0)
+            complain(fmt::format("{}: {} characters that XML cannot carry are written as U+FFFD",
+                                 *_options.snapshotFile, writing.replaced));
+        return static_cast<bool>(writing);
     }
 
     const DecodeOptions& _options;
@@ -227,9 +229,9 @@ int decodeCapture(const DecodeOptions& options, std::FILE* output)
         return DecodeStatus::badInput;
     }
     const int status = decodeWithLog(options, *log, output);
-    if (log->flush())
+    if (log->commit(error))
         return status;
-    complain(fmt::format("{}: {}", *options.systemLogFile, std::strerror(errno)));
+    complain(error);
     return DecodeStatus::badInput;
 }
 

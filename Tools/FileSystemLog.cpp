@@ -1,7 +1,5 @@
 #include "Tools/FileSystemLog.h"
 
-#include <cerrno>
-#include <cstring>
 #include <iterator>
 
 namespace ventrik
@@ -9,17 +7,10 @@ namespace ventrik
 
 std::unique_ptr<FileSystemLog> FileSystemLog::create(const std::string& path, std::string& error)
 {
-    std::FILE* file = std::fopen(path.c_str(), "wbe");
-    if (!file) {
-        error = fmt::format("{}: {}", path, std::strerror(errno));
+    auto file = PrivateFile::create(path, error);
+    if (!file)
         return nullptr;
-    }
-    return std::unique_ptr<FileSystemLog>(new FileSystemLog(file));
-}
-
-bool FileSystemLog::flush()
-{
-    return std::fflush(_file.get()) == 0 && std::ferror(_file.get()) == 0;
+    return std::unique_ptr<FileSystemLog>(new FileSystemLog(std::move(*file)));
 }
 
 void FileSystemLog::write(int priority, std::string_view text)
@@ -37,7 +28,7 @@ void FileSystemLog::write(int priority, std::string_view text)
             _line += character;
     }
     _line += '\n';
-    std::fwrite(_line.data(), 1, _line.size(), _file.get());
+    _file.write(_line);
 }
 
 } // namespace ventrik

@@ -254,9 +254,10 @@ TEST_F(SaveScreenTest, AFailedWriteIsLoggedAndShownAndTheScreenClosesAllTheSame)
     open(history());
     fake.log.clear();
     press(screen->saveButton());
+    const std::string file = directory + "/VentrikSnapshot-1794809428.ventrik";
     EXPECT_THAT(fake.log.texts(LogPriority::error),
-                ElementsAre("Unable to write snapshot to " + directory +
-                            "/VentrikSnapshot-1794809428.ventrik"));
+                ElementsAre("Snapshot not written: " + file + ": Not a directory",
+                            "Unable to write snapshot to " + file));
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(alert()->isVisible());
     EXPECT_EQ(alert()->windowTitle(), "File Error");

@@ -34,7 +34,7 @@ TEST_F(CaptureWriterTest, WritesTheFormatByteByByte)
     ASSERT_TRUE(writer) << error;
     EXPECT_TRUE(writer->write(Clock::TimePoint(100s + 7us + 999ns), Bytes{1, 2}));
     EXPECT_TRUE(writer->write(Clock::TimePoint(101s), Bytes{}));
-    EXPECT_TRUE(writer->flush());
+    EXPECT_TRUE(writer->commit(error)) << error;
     EXPECT_EQ(written(), PcapBytes(150).record(100, 7, {1, 2}).record(101, 0, {}).bytes());
 }
 

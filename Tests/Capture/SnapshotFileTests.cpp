@@ -5,6 +5,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <filesystem>
 #include <fstream>
 
 namespace ventrik
@@ -65,8 +66,9 @@ TEST(SnapshotFile, IsWrittenAsAPropertyListThatReadsBackUnchanged)
                      "a < b");
     const TemporaryFile file("written.ventrik");
     const std::string& path = file.path();
-    std::string error;
-    ASSERT_TRUE(writeSnapshot(snapshot, path, error)) << error;
+    const auto writing = writeSnapshot(snapshot, path);
+    ASSERT_TRUE(writing) << writing.error;
+    EXPECT_EQ(writing.replaced, 0U);
     const auto reading = readPropertyList(contentsOf(path));
     ASSERT_TRUE(reading) << reading.error;
     EXPECT_EQ(*reading.value, PlistValue(snapshot));
@@ -76,21 +78,37 @@ TEST(SnapshotFile, OverwritesAnEarlierFileOfItsName)
 {
     const TemporaryFile file("twice.ventrik");
     const std::string& path = file.path();
-    std::string error;
-    ASSERT_TRUE(
-        writeSnapshot(makeSnapshot("a", PlistArray(), std::string(1000, 'x')), path, error));
-    ASSERT_TRUE(writeSnapshot(makeSnapshot("b", PlistArray(), ""), path, error));
+    ASSERT_TRUE(writeSnapshot(makeSnapshot("a", PlistArray(), std::string(1000, 'x')), path));
+    ASSERT_TRUE(writeSnapshot(makeSnapshot("b", PlistArray(), ""), path));
     EXPECT_EQ(*readPropertyList(contentsOf(path)).value->dictionary()->find("Timestamp"),
               PlistValue("b"));
 }
 
 TEST(SnapshotFile, TellsWhyAFileCannotBeWritten)
 {
-    std::string error;
-    EXPECT_FALSE(writeSnapshot(makeSnapshot("t", PlistArray(), ""), "/nowhere/x.ventrik", error));
-    EXPECT_EQ(error, "/nowhere/x.ventrik: No such file or directory");
-    EXPECT_FALSE(writeSnapshot(makeSnapshot("t", PlistArray(), "\x01"), "/nowhere/x", error));
-    EXPECT_THAT(error, testing::StartsWith("/nowhere/x: property list not written"));
+    const auto writing = writeSnapshot(makeSnapshot("t", PlistArray(), ""), "/nowhere/x.ventrik");
+    EXPECT_FALSE(writing);
+    EXPECT_EQ(writing.error, "/nowhere/x.ventrik: No such file or directory");
+}
+
+TEST(SnapshotFile, HoldsAReplacementForEachCharacterThatXmlCannotCarry)
+{
+    const TemporaryFile file("replaced.ventrik");
+    const PlistArray data{PlistDictionary{{"EF-PNN", "a\x01\x02z"}, {"b\xFF", "\uFFFE"}}};
+    const auto writing = writeSnapshot(makeSnapshot("t", data, "drive"), file.path());
+    ASSERT_TRUE(writing) << writing.error;
+    EXPECT_EQ(writing.replaced, 4U);
+    const PlistArray expected{PlistDictionary{{"EF-PNN", "a\uFFFD\uFFFDz"}, {"b\uFFFD", "\uFFFD"}}};
+    EXPECT_EQ(*readPropertyList(contentsOf(file.path())).value->dictionary()->find("Data"),
+              PlistValue(expected));
+}
+
+TEST(SnapshotFile, IsItsOwnersAlone)
+{
+    const TemporaryFile file("private.ventrik");
+    ASSERT_TRUE(writeSnapshot(makeSnapshot("t", PlistArray(), ""), file.path()));
+    EXPECT_EQ(std::filesystem::status(file.path()).permissions(),
+              std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
 }
 
 } // namespace ventrik

@@ -23,7 +23,7 @@ class DecodeMemory : public DecodeFixture
             const Clock::TimePoint time{std::chrono::seconds(captureStart) + message->due};
             EXPECT_TRUE(writer->write(time, message->data));
         }
-        EXPECT_TRUE(writer->flush());
+        EXPECT_TRUE(writer->commit(error)) << error;
         return readFile(file);
     }
     /// The decoder's peak in KiB after it took all of the capture, in KiB.

@@ -25,7 +25,7 @@ class ReplayProcess : public ProcessFixture
         Clock::TimePoint time{std::chrono::seconds(captureStart)};
         for (std::uint32_t i = 0; i < count; ++i, time += apart)
             writer->write(time, message(i, size));
-        EXPECT_TRUE(writer->flush());
+        EXPECT_TRUE(writer->commit(error)) << error;
         return file;
     }
     static Bytes message(std::uint32_t number, std::size_t size)

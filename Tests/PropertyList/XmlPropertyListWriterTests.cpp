@@ -151,4 +151,32 @@ TEST(XmlWriter, RefusesAContainerThatHoldsItself)
     array.clear(); // breaks the loop, which would keep itself alive
 }
 
+// What is replaced is counted.
+TEST(ReplacingXmlWriter, PutsAReplacementInThePlaceOfWhatXmlCannotCarry)
+{
+    const auto writing = writeXmlPropertyListReplacing(
+        PlistDictionary{{"a\x01", "b\xff\xff"}, {"date", PlistDate{1e15}}, {"good", "c"}});
+    ASSERT_TRUE(writing) << writing.error;
+    EXPECT_EQ(writing.replaced, 4U);
+    EXPECT_EQ(*readPropertyList(Bytes(writing.text->begin(), writing.text->end())).value,
+              PlistValue(PlistDictionary{
+                  {"a\uFFFD", "b\uFFFD\uFFFD"}, {"date", "\uFFFD"}, {"good", "c"}}));
+}
+
+TEST(ReplacingXmlWriter, EndsNestingThatIsTooDeep)
+{
+    const auto writing = writeXmlPropertyListReplacing(nestedArrays(513));
+    ASSERT_TRUE(writing) << writing.error;
+    EXPECT_EQ(writing.replaced, 1U);
+    EXPECT_TRUE(readPropertyList(Bytes(writing.text->begin(), writing.text->end())));
+}
+
+TEST(ReplacingXmlWriter, WritesTheRestAsTheOtherOneDoes)
+{
+    const PlistDictionary value{{"a", PlistArray{1, "b"}}, {"c", PlistDate{0}}};
+    const auto writing = writeXmlPropertyListReplacing(value);
+    EXPECT_EQ(writing.text, writeXmlPropertyList(value).text);
+    EXPECT_EQ(writing.replaced, 0U);
+}
+
 } // namespace ventrik

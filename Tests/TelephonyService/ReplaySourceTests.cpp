@@ -24,7 +24,7 @@ class ReplaySourceTest : public testing::Test
         writer->write(Clock::TimePoint(103s), Bytes{2});
         writer->write(Clock::TimePoint(102s), Bytes{3});
         writer->write(Clock::TimePoint(104s), Bytes{4});
-        EXPECT_TRUE(writer->flush());
+        EXPECT_TRUE(writer->commit(error)) << error;
     }
 
     std::unique_ptr<ReplaySource> open(const ReplayOptions& options)
@@ -89,7 +89,7 @@ TEST_F(ReplaySourceTest, BeginsAgainInALoop)
 TEST_F(ReplaySourceTest, AnEmptyCaptureDoesNotLoopForEver)
 {
     std::string error;
-    CaptureWriter::create(path, *technologyNamed("lte"), error)->flush();
+    CaptureWriter::create(path, *technologyNamed("lte"), error)->commit(error);
     EXPECT_FALSE(open({.capture = path, .loop = true})->next());
 }
 

@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
 #include <fstream>
 
 namespace ventrik
@@ -18,7 +19,8 @@ TEST(FileSystemLog, WritesPriorityTabAndEscapedText)
     log->error("Failed to get Cell Array\n");
     log->warning("a\tb\\c");
     log->log(16, "DLF");
-    EXPECT_TRUE(log->flush());
+    EXPECT_FALSE(std::filesystem::exists(path));
+    EXPECT_TRUE(log->commit(error)) << error;
     std::ifstream file(path);
     EXPECT_EQ(std::string(std::istreambuf_iterator<char>(file), {}),
               "3\tFailed to get Cell Array\\n\n4\ta\\tb\\\\c\n16\tDLF\n");

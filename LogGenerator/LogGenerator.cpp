@@ -8,6 +8,9 @@
 #include "LogGenerator/Orbel/UTRAN/UTRANLogGenerator.h"
 #include "Platform/TelephonyConstants.h"
 
+#include <algorithm>
+#include <array>
+
 #include <fmt/format.h>
 
 namespace ventrik
@@ -17,6 +20,34 @@ namespace
 {
 
 constexpr std::int32_t historyLimit = 5;
+
+template <typename Generator>
+std::unique_ptr<LogGenerator> make(const GeneratorServices& services)
+{
+    return Generator::generator(services);
+}
+
+struct Technology {
+    std::string_view identifier;
+    std::string_view name;
+    std::unique_ptr<LogGenerator> (*makeGenerator)(const GeneratorServices& services);
+};
+
+constexpr std::array<Technology, 5> technologies{{
+    {kQXLogChannelTechnology_IFX, "Cell monitor", make<GSMLogGenerator>},
+    {kQXLogChannelTechnology_Orbel_GSM, "GSM/UMTS", make<Orbel_GSMLogGenerator>},
+    {kQXLogChannelTechnology_Orbel_CDMA, "CDMA2000", make<C2KLogGenerator>},
+    {kQXLogChannelTechnology_Orbel_LTE, "LTE", make<LTELogGenerator>},
+    {kQXLogChannelTechnology_Orbel_UTRAN2, "UTRAN", make<UTRANLogGenerator>},
+}};
+
+const Technology* findTechnology(const PlistValue& identifier)
+{
+    const auto* found = std::ranges::find_if(technologies, [&](const Technology& technology) {
+        return identifier == technology.identifier;
+    });
+    return found == technologies.end() ? nullptr : found;
+}
 
 // The first value that is missing ends the entry.
 PlistDictionary makeHistoryEntry(const PlistDictionary& state, const std::string& date)
@@ -44,17 +75,14 @@ std::unique_ptr<LogGenerator>
 LogGenerator::generatorFromTechnology(const PlistValue& technology,
                                       const GeneratorServices& services)
 {
-    if (technology == kQXLogChannelTechnology_IFX)
-        return GSMLogGenerator::generator(services);
-    if (technology == kQXLogChannelTechnology_Orbel_GSM)
-        return Orbel_GSMLogGenerator::generator(services);
-    if (technology == kQXLogChannelTechnology_Orbel_CDMA)
-        return C2KLogGenerator::generator(services);
-    if (technology == kQXLogChannelTechnology_Orbel_LTE)
-        return LTELogGenerator::generator(services);
-    if (technology == kQXLogChannelTechnology_Orbel_UTRAN2)
-        return UTRANLogGenerator::generator(services);
-    return nullptr;
+    const Technology* found = findTechnology(technology);
+    return found ? found->makeGenerator(services) : nullptr;
+}
+
+std::string_view LogGenerator::technologyName(const PlistValue& technology)
+{
+    const Technology* found = findTechnology(technology);
+    return found ? found->name : std::string_view();
 }
 
 void LogGenerator::updateHistoryInState(PlistDictionary& state, const Clock& clock)

@@ -5,6 +5,7 @@
 
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 
 namespace ventrik
@@ -34,10 +35,15 @@ class LogGenerator
     virtual PlistDictionary getStartCommand() const = 0;
     /// The "Data" of a snapshot file.
     virtual PlistValue getSaveContentsFromState(const PlistDictionary& state) const = 0;
+    /// One line that says why there is no display; empty when nothing is in the way of one.
+    virtual std::string displayFault() const { return {}; }
 
     /// A new generator for the service's technology identifier, or none if it is unknown.
     static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,
                                                                  const GeneratorServices& services);
+
+    /// The technology of that identifier as people call it; empty if it is unknown.
+    static std::string_view technologyName(const PlistValue& technology);
 
     /// Records the state's display in its history, which never holds more than 5 entries.
     static void updateHistoryInState(PlistDictionary& state, const Clock& clock);

@@ -1,6 +1,7 @@
 #include "Model/VentrikModel.h"
 
 #include "Platform/TelephonyConstants.h"
+#include "Platform/TelephonyProtocol.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 
@@ -27,7 +28,45 @@ std::optional<Bytes> serialized(const PlistValue& command)
     return Bytes(writing.text->begin(), writing.text->end());
 }
 
+ChannelFault faultOfSend(int error)
+{
+    return error == PortError::invalidPort ? ChannelFault::NoService : ChannelFault::NoAnswer;
+}
+
+// What kept the service from opening a channel, or us from understanding that it did.
+ChannelFault faultOfRequest(const TelephonyError& error)
+{
+    using namespace TelephonyProtocol;
+    if (error.domain != clientErrorDomain)
+        return ChannelFault::Refused;
+    return error.code == ClientError::answerNotUnderstood ? ChannelFault::BadAnswer
+                                                          : ChannelFault::NoAnswer;
+}
+
 } // namespace
+
+std::string_view channelFaultText(ChannelFault fault)
+{
+    switch (fault) {
+    case ChannelFault::None:
+        return "";
+    case ChannelFault::NoPort:
+        return "the viewer's port cannot be made";
+    case ChannelFault::PortTaken:
+        return "another viewer holds the port";
+    case ChannelFault::NoService:
+        return "no service";
+    case ChannelFault::NoAnswer:
+        return "the service does not answer";
+    case ChannelFault::BadAnswer:
+        return "the service's answer is not understood";
+    case ChannelFault::Refused:
+        return "the service refuses a channel";
+    case ChannelFault::NoTechnology:
+        return "the service speaks no known technology";
+    }
+    return "";
+}
 
 VentrikModel::VentrikModel(const Platform& platform, UpdateCallback updateScreens)
     : _platform(platform), _updateScreens(std::move(updateScreens))
@@ -60,10 +99,12 @@ bool VentrikModel::createLocalPort()
                                         });
     _recvPort = std::move(creation.port);
     if (!_recvPort) {
+        setFault(creation.nameIsTaken ? ChannelFault::PortTaken : ChannelFault::NoPort);
         _platform.log.error("Could not create local message port");
         return false;
     }
     if (creation.alreadyExists) {
+        setFault(ChannelFault::PortTaken);
         _platform.log.error("Local messsage port already exists");
         return false;
     }
@@ -76,6 +117,7 @@ bool VentrikModel::createRemotePort()
 {
     auto connection = _platform.telephony.createServerConnection([this] { refresh(); });
     if (!connection) {
+        setFault(ChannelFault::NoService);
         _platform.log.error("Could not create QXServerConnection");
         return false;
     }
@@ -83,19 +125,23 @@ bool VentrikModel::createRemotePort()
         connection->networkMonitorCreateLogChannel(logChannelLocalPortName);
     connection.reset();
     if (channel.error.code != 0) {
+        setFault(faultOfRequest(channel.error));
         _platform.log.error("_QXServerConnectionNetworkMonitorCreateLogChannel returns error: {}!",
                             channel.error.code);
         return false;
     }
     if (!channel.remotePortName || channel.remotePortName->empty()) {
+        setFault(ChannelFault::BadAnswer);
         _platform.log.error("Could not create a log channel (QX returned null port)!");
         return false;
     }
     _sendPort = _platform.ports.createRemotePort(*channel.remotePortName);
     if (!_sendPort) {
+        setFault(ChannelFault::NoAnswer);
         _platform.log.error("Could not create the remote port!");
         return false;
     }
+    _recvPort->expectStreamOf(_sendPort->process());
     _platform.log.error(" ***** Created ports (send={}, recv={})", fmt::ptr(_sendPort.get()),
                         fmt::ptr(_recvPort.get()));
     return true;
@@ -109,6 +155,7 @@ void VentrikModel::localPortInvalidated()
 
 void VentrikModel::destroyPorts()
 {
+    _connectedSince.reset();
     if (_displayUpdateTimer) {
         _displayUpdateTimer->stop();
         _displayUpdateTimer.reset();
@@ -128,14 +175,15 @@ void VentrikModel::destroyPorts()
 
 void VentrikModel::configureGenerator()
 {
+    setFault(ChannelFault::NoAnswer);
     const auto command = serialized(PlistDictionary{{"GetTechnology", "GetTechnology"}});
     if (!command) {
         _platform.log.error(" Could not generate GetTechnology command; cannot configure");
         return;
     }
-    const auto result = _sendPort->send(messageId, *command, sendTimeout, receiveTimeout,
-                                        RemotePort::Reply::Wanted);
+    const auto result = sendCommand(*command, receiveTimeout, RemotePort::Reply::Wanted);
     if (result.error != PortError::success) {
+        setFault(faultOfSend(result.error));
         _platform.log.error(" ***** Could not send the GetTechnology command (got error={})",
                             result.error);
         return;
@@ -144,6 +192,7 @@ void VentrikModel::configureGenerator()
         _platform.log.error(" ***** No response to GetTechnology; cannot configure");
         return;
     }
+    setFault(ChannelFault::BadAnswer);
     const auto answer = readPropertyList(*result.reply);
     if (!answer) {
         _platform.log.error(" ***** Could not parse reply to GetTechnology; cannot configure");
@@ -155,8 +204,11 @@ void VentrikModel::configureGenerator()
         _platform.log.error(" ***** Reply to GetTechnology had no answer; cannot configure");
         return;
     }
+    setFault(ChannelFault::NoTechnology);
     _logGenerator = LogGenerator::generatorFromTechnology(
         *technology, {_platform.log, _platform.resources, _platform.clock});
+    if (_logGenerator)
+        _technologyName = LogGenerator::technologyName(*technology);
     _platform.log.error("Got log generated: {}", fmt::ptr(_logGenerator.get()));
 }
 
@@ -178,6 +230,17 @@ void VentrikModel::startMonitor()
         return retryLater();
     _platform.log.error("Starting the display update timer");
     _displayUpdateTimer = _platform.mainQueue.repeatEvery(refreshInterval, [this] { refresh(); });
+    setFault(ChannelFault::None);
+    publishChannelState();
+}
+
+RemotePort::SendResult VentrikModel::sendCommand(const Bytes& command,
+                                                 RemotePort::Seconds replyTimeout,
+                                                 RemotePort::Reply reply)
+{
+    if (!_sendPort)
+        return {PortError::invalidPort, std::nullopt};
+    return _sendPort->send(messageId, command, sendTimeout, replyTimeout, reply);
 }
 
 bool VentrikModel::sendStartCommand()
@@ -187,8 +250,8 @@ bool VentrikModel::sendStartCommand()
         _platform.log.error(" Could not generate PLIST");
         return false;
     }
-    const auto result = _sendPort->send(messageId, *command, sendTimeout, noReceiveTimeout,
-                                        RemotePort::Reply::NotWanted);
+    const auto result = sendCommand(*command, noReceiveTimeout, RemotePort::Reply::NotWanted);
+    setFault(faultOfSend(result.error));
     if (result.error != PortError::success)
         _platform.log.error(" ***** Could not send the START command (got error={})", result.error);
     return result.error == PortError::success;
@@ -197,7 +260,33 @@ bool VentrikModel::sendStartCommand()
 void VentrikModel::retryLater()
 {
     destroyPorts();
+    publishChannelState();
     _platform.mainQueue.after(retryDelay, guarded(&VentrikModel::startMonitor));
+}
+
+void VentrikModel::publishChannelState()
+{
+    const bool isOpen = isConnected();
+    if (isOpen && !_connectedSince)
+        _connectedSince = _platform.clock.now();
+    if (isOpen == _wasConnected && _attemptFault == _channelFault)
+        return;
+    _wasConnected = isOpen;
+    _channelFault = _attemptFault;
+    _platform.mainQueue.async([alive = std::weak_ptr(_alive), this] {
+        if (alive.lock() && _channelCallback)
+            _channelCallback();
+    });
+}
+
+void VentrikModel::setChannelCallback(std::function<void()> callback)
+{
+    _channelCallback = std::move(callback);
+}
+
+std::string VentrikModel::displayFault() const
+{
+    return _logGenerator ? _logGenerator->displayFault() : std::string();
 }
 
 void VentrikModel::restartMonitor()
@@ -208,7 +297,8 @@ void VentrikModel::restartMonitor()
 
 void VentrikModel::refresh()
 {
-    if (_recvPort && _sendPort && !_sendPort->isValid()) {
+    // The stream is as much a part of the channel as the port that takes its commands.
+    if (_recvPort && _sendPort && (!_sendPort->isValid() || _recvPort->hasLostStream())) {
         // Restarts the monitor there and then, which lets go of the port while it still runs.
         const auto port = _recvPort;
         port->invalidate();
@@ -250,6 +340,7 @@ void VentrikModel::updateWithData(ByteView data)
     if (_logGenerator)
         _logGenerator->updateState(_state, data);
     _updated = true;
+    _lastMessageTime = _platform.clock.now();
 }
 
 std::optional<PlistValue> VentrikModel::getSaveContents() const

@@ -13,6 +13,20 @@
 namespace ventrik
 {
 
+/// Why the last attempt to open the log channel failed; None while the channel stands.
+enum class ChannelFault {
+    None,
+    NoPort,       ///< our own port cannot be made
+    PortTaken,    ///< another process has a port of our name
+    NoService,    ///< nobody serves
+    NoAnswer,     ///< the service does not answer in time, or goes in the middle
+    BadAnswer,    ///< its answer is not understood
+    Refused,      ///< it refuses a channel
+    NoTechnology, ///< it speaks no technology that we know
+};
+/// The fault in a few words, for the screens; empty for None.
+std::string_view channelFaultText(ChannelFault fault);
+
 /// The one object that talks to the telephony service: owns the log channel, chooses the log
 /// generator, feeds it every message and, every 2 seconds when something new arrived, asks for a
 /// redraw. Any failure tears the channel down and tries again after 5 seconds, without limit.
@@ -32,6 +46,19 @@ class VentrikModel
 
     /// Both ports are there; whether they are still valid is not asked.
     bool isConnected() const;
+    ChannelFault channelFault() const { return _channelFault; }
+    /// Since when the channel has been open; none while it is not.
+    std::optional<Clock::TimePoint> connectedSince() const { return _connectedSince; }
+    /// When the last log message came; none before the first.
+    std::optional<Clock::TimePoint> lastMessageTime() const { return _lastMessageTime; }
+    /// The technology in a word or two, as people call it; empty before it is known.
+    std::string_view technologyName() const { return _technologyName; }
+    /// One line that says why there is no display: which template cannot be used, and why. Empty
+    /// when all is well.
+    std::string displayFault() const;
+    /// Called on the main queue after the channel was opened or lost, or failed for another reason
+    /// than before; also while nothing new has arrived.
+    void setChannelCallback(std::function<void()> callback);
 
     bool createPorts();
     void destroyPorts();
@@ -54,7 +81,13 @@ class VentrikModel
     bool createLocalPort();
     bool createRemotePort();
     bool sendStartCommand();
+    /// Without a port the result is `PortError::invalidPort`.
+    RemotePort::SendResult sendCommand(const Bytes& command, RemotePort::Seconds replyTimeout,
+                                       RemotePort::Reply reply);
     void retryLater();
+    void setFault(ChannelFault fault) { _attemptFault = fault; }
+    /// Tells the screens where the channel's state is not what they were told last.
+    void publishChannelState();
     void localPortInvalidated();
     /// A task that does nothing once the model is gone.
     MainQueue::Task guarded(void (VentrikModel::*operation)());
@@ -67,9 +100,17 @@ class VentrikModel
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;
     bool _updated = false;
     std::unique_ptr<LogGenerator> _logGenerator;
+    std::string_view _technologyName;
     PlistDictionary _state;
     ModelNodePointer _nodes;
     std::optional<PathIndex> _nodesByPath;
+
+    std::function<void()> _channelCallback;
+    ChannelFault _attemptFault = ChannelFault::None; // of the attempt that is being made
+    ChannelFault _channelFault = ChannelFault::None;
+    bool _wasConnected = false;
+    std::optional<Clock::TimePoint> _connectedSince;
+    std::optional<Clock::TimePoint> _lastMessageTime;
 
     std::shared_ptr<bool> _alive = std::make_shared<bool>(true);
 };

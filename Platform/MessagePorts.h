@@ -23,6 +23,9 @@ inline constexpr int invalidPort = -3;
 inline constexpr int transportFault = -4;
 } // namespace PortError
 
+/// The number of a process of this machine; 0 when it is not known.
+using ProcessNumber = std::int64_t;
+
 /// One message as a local port hands it out; the data lives as long as the callback runs.
 struct PortMessage {
     std::int32_t id = 0;
@@ -50,6 +53,13 @@ class LocalPort
     /// The callback may drop the caller's reference. A second call does nothing.
     virtual void invalidate() = 0;
     virtual bool isValid() const = 0;
+
+    /// Names the process whose connection carries a channel's stream to this port. Where that
+    /// process never connects, every connection on which something came carries it.
+    virtual void expectStreamOf(ProcessNumber process) = 0;
+    /// The connection that carries the stream was there and is not any more: its peer has closed
+    /// or half-closed it, has broken the framing, or has stalled for 5 s within a message.
+    virtual bool hasLostStream() const = 0;
 };
 
 /// The sending end of a named port.
@@ -82,6 +92,8 @@ class RemotePort
     virtual void invalidate() = 0;
     /// Turns false when the peer has gone, without anybody asking.
     virtual bool isValid() const = 0;
+    /// The process behind the port.
+    virtual ProcessNumber process() const = 0;
 };
 
 /// Whose messages a local port takes.
@@ -96,6 +108,8 @@ struct LocalPortCreation {
     /// The name was taken in this process; `port` is the existing one.
     bool alreadyExists = false;
     std::string error;
+    /// There is none because another process has a port of that name.
+    bool nameIsTaken = false;
 };
 
 /// Makes and finds message ports by name.

@@ -2,7 +2,9 @@
 
 #include <QTimer>
 
+#include <algorithm>
 #include <cerrno>
+#include <cstring>
 #include <utility>
 
 #include <sys/socket.h>
@@ -68,19 +70,22 @@ void LinuxLocalPort::acceptWaiting()
     for (int i = 0; i < acceptsPerTurn; ++i) {
         FileDescriptor socket(
             ::accept4(_parts.listener.get(), nullptr, nullptr, SOCK_NONBLOCK | SOCK_CLOEXEC));
-        if (socket.isOpen())
+        if (socket.isOpen()) {
+            _cannotAccept = false;
             addConnection(std::move(socket));
-        else if (errno == EAGAIN || errno == EWOULDBLOCK)
+        } else if (errno == EAGAIN || errno == EWOULDBLOCK) {
             return;
-        else if (errno != EINTR && errno != ECONNABORTED)
+        } else if (errno != EINTR && errno != ECONNABORTED) {
             return pauseAccepting();
+        }
     }
 }
 
 // Out of descriptors or memory: the waiting connection would wake us all the time.
 void LinuxLocalPort::pauseAccepting()
 {
-    _log.warning("port {} cannot take connections for now", name());
+    if (!std::exchange(_cannotAccept, true))
+        _log.error("port {} cannot take connections for now: {}", name(), std::strerror(errno));
     _acceptNotifier->setEnabled(false);
     QTimer::singleShot(100, &_context, [this] {
         if (_acceptNotifier != nullptr)
@@ -90,19 +95,68 @@ void LinuxLocalPort::pauseAccepting()
 
 void LinuxLocalPort::addConnection(FileDescriptor socket)
 {
-    const auto user = peerUser(socket.get());
-    const bool isTrusted = user == _parts.trustedUser;
+    const auto peer = peerOf(socket.get());
+    const bool isTrusted = peer && peer->user == _parts.trustedUser;
     if (!isTrusted && _parts.senders == PortSenders::SameUser)
         return _log.warning("port {} refused a connection of user {}", name(),
-                            user ? std::to_string(*user) : "unknown");
-    if (_connections.size() >= maximumConnections)
+                            peer ? std::to_string(peer->user) : "unknown");
+    if (_connections.size() >= maximumConnections && !makeRoom())
         return _log.warning("port {} refused a connection: it has {} already", name(),
                             maximumConnections);
-    auto connection =
-        std::make_shared<PortConnection>(std::move(socket), isTrusted, connectionHandlers());
+    auto connection = std::make_shared<PortConnection>(std::move(socket), peer.value_or(Peer{}),
+                                                       isTrusted, connectionHandlers());
     _connections.push_back(connection);
+    noteStreamConnection(*connection);
     if (_isDelivering)
         connection->startReading();
+}
+
+// Ends the connection that has been idle longest: one that never sent a message before all that
+// did, and never the one that carries the stream, which may be silent for good reasons.
+bool LinuxLocalPort::makeRoom()
+{
+    const auto limit = std::chrono::steady_clock::now() - _parts.idleLimit;
+    const auto rank = [](const auto& connection) {
+        return std::pair(connection->hasSentMessage(), connection->lastMessageTime());
+    };
+    std::shared_ptr<PortConnection> idle;
+    for (const auto& connection : _connections)
+        if (connection->lastMessageTime() <= limit && !carriesStream(*connection) &&
+            (!idle || rank(connection) < rank(idle)))
+            idle = connection;
+    if (!idle)
+        return false;
+    idle->close();
+    removeConnection(*idle, "it was idle, and room was needed");
+    return true;
+}
+
+void LinuxLocalPort::expectStreamOf(ProcessNumber process)
+{
+    _streamProcess = process;
+    for (const auto& connection : _connections)
+        noteStreamConnection(*connection);
+}
+
+void LinuxLocalPort::noteStreamConnection(const PortConnection& connection)
+{
+    if (_streamProcess && connection.peerProcess() == *_streamProcess)
+        _streamProcessConnected = true;
+}
+
+bool LinuxLocalPort::carriesStream(const PortConnection& connection) const
+{
+    if (!_streamProcess)
+        return false;
+    return _streamProcessConnected ? connection.peerProcess() == *_streamProcess
+                                   : connection.hasSent();
+}
+
+bool LinuxLocalPort::hasLostStream() const
+{
+    return _streamEnded && std::ranges::none_of(_connections, [this](const auto& connection) {
+               return carriesStream(*connection);
+           });
 }
 
 PortConnection::Handlers LinuxLocalPort::connectionHandlers()
@@ -125,6 +179,7 @@ void LinuxLocalPort::removeConnection(PortConnection& connection, std::string_vi
 {
     if (!reason.empty())
         _log.warning("port {} dropped a connection: {}", name(), reason);
+    _streamEnded |= carriesStream(connection);
     std::erase_if(_connections, [&](const auto& other) { return other.get() == &connection; });
 }
 

@@ -7,7 +7,9 @@
 
 #include <QObject>
 
+#include <chrono>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -26,6 +28,8 @@ class LinuxLocalPort : public LocalPort, public std::enable_shared_from_this<Lin
         PortSenders senders = PortSenders::SameUser;
         uid_t trustedUser = 0;
         DataCallback callback;
+        /// A connection that has been without a whole message for so long makes room for another.
+        std::chrono::steady_clock::duration idleLimit = std::chrono::seconds(30);
     };
 
     /// The log must outlive the port.
@@ -37,11 +41,16 @@ class LinuxLocalPort : public LocalPort, public std::enable_shared_from_this<Lin
     void setInvalidationCallback(InvalidationCallback callback) override;
     void invalidate() override;
     bool isValid() const override { return _parts.listener.isOpen(); }
+    void expectStreamOf(ProcessNumber process) override;
+    bool hasLostStream() const override;
 
   private:
     void acceptWaiting();
     void pauseAccepting();
     void addConnection(FileDescriptor socket);
+    bool makeRoom();
+    bool carriesStream(const PortConnection& connection) const;
+    void noteStreamConnection(const PortConnection& connection);
     PortConnection::Handlers connectionHandlers();
     void removeConnection(PortConnection& connection, std::string_view reason);
     void close();
@@ -52,7 +61,11 @@ class LinuxLocalPort : public LocalPort, public std::enable_shared_from_this<Lin
     SocketNotifier _acceptNotifier;
     std::vector<std::shared_ptr<PortConnection>> _connections;
     bool _isDelivering = false;
-    QObject _context; // queued turns die with it
+    bool _cannotAccept = false;
+    std::optional<ProcessNumber> _streamProcess;
+    bool _streamProcessConnected = false; // it did at least once
+    bool _streamEnded = false;            // a connection that carried it has ended
+    QObject _context;                     // queued turns die with it
 };
 
 } // namespace ventrik

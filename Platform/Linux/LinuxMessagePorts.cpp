@@ -13,7 +13,7 @@
 namespace ventrik
 {
 
-LinuxMessagePorts::LinuxMessagePorts(std::string runtimeDirectory, SystemLog& log,
+LinuxMessagePorts::LinuxMessagePorts(PortDirectory runtimeDirectory, SystemLog& log,
                                      std::optional<uid_t> trustedUser)
     : _directory(std::move(runtimeDirectory)),
       _log(log),
@@ -35,8 +35,8 @@ LocalPortCreation LinuxMessagePorts::createLocalPort(std::string_view name, Port
     const FileDescriptor lock = _directory.lock();
     if (!lock.isOpen())
         return refuse(fmt::format("runtime directory {} cannot be locked", _directory.path()));
-    if (auto fault = claimPath(name); !fault.empty())
-        return refuse(std::move(fault));
+    if (auto fault = claimPath(name); !fault.reason.empty())
+        return refuse(std::move(fault.reason), fault.nameIsTaken);
     const std::string path = _directory.socketPath(name);
     FileDescriptor listener = listenSocket(path);
     if (!listener.isOpen())
@@ -50,14 +50,14 @@ LocalPortCreation LinuxMessagePorts::createLocalPort(std::string_view name, Port
 }
 
 // The viewer's own line says only that there is no port; this one says why.
-LocalPortCreation LinuxMessagePorts::refuse(std::string reason) const
+LocalPortCreation LinuxMessagePorts::refuse(std::string reason, bool nameIsTaken) const
 {
-    _log.warning("{}", reason);
-    return {nullptr, false, std::move(reason)};
+    _log.error("{}", reason);
+    return {nullptr, false, std::move(reason), nameIsTaken};
 }
 
 // Frees the path of a file that a crash left; one line that says why, when that cannot be done.
-std::string LinuxMessagePorts::claimPath(std::string_view name) const
+LinuxMessagePorts::PathFault LinuxMessagePorts::claimPath(std::string_view name) const
 {
     namespace fs = std::filesystem;
     const std::string path = _directory.socketPath(name);
@@ -66,14 +66,14 @@ std::string LinuxMessagePorts::claimPath(std::string_view name) const
     if (!fs::exists(status))
         return {};
     if (!fs::is_socket(status))
-        return fmt::format("port {} cannot be made: something else than a socket is there", path);
+        return {fmt::format("port {} cannot be made: something else than a socket is there", path)};
     const Connecting probe = connectSocket(path);
     if (probe.status == ConnectStatus::Connected || probe.status == ConnectStatus::Busy)
-        return fmt::format("port {} is in use by another process", name);
+        return {fmt::format("port {} is in use by another process", name), true};
     if (probe.status == ConnectStatus::Failed)
-        return fmt::format("port {} cannot be checked: {}", path, std::strerror(probe.error));
+        return {fmt::format("port {} cannot be checked: {}", path, std::strerror(probe.error))};
     if (!fs::remove(path, error))
-        return fmt::format("stale port {} cannot be removed: {}", path, error.message());
+        return {fmt::format("stale port {} cannot be removed: {}", path, error.message())};
     return {};
 }
 
@@ -88,6 +88,12 @@ std::shared_ptr<RemotePort> LinuxMessagePorts::createRemotePort(std::string_view
     Connecting connecting = connectSocket(_directory.socketPath(name));
     if (connecting.status != ConnectStatus::Connected)
         return nullptr;
+    const auto peer = peerOf(connecting.socket.get());
+    if (!peer || peer->user != _trustedUser) {
+        _log.error("port {} is not used: it belongs to user {}, not to user {}", name,
+                   peer ? std::to_string(peer->user) : "unknown", _trustedUser);
+        return nullptr;
+    }
     return std::make_shared<LinuxRemotePort>(std::string(name), std::move(connecting.socket));
 }
 

@@ -21,12 +21,13 @@ namespace ventrik
 class LinuxMessagePorts : public MessagePorts
 {
   public:
-    /// Peers of the trusted user, this process's own by default, are the trusted senders.
-    LinuxMessagePorts(std::string runtimeDirectory, SystemLog& log,
+    /// Peers of the trusted user, this process's own by default, are the trusted senders, and only
+    /// what that user serves is connected to.
+    LinuxMessagePorts(PortDirectory runtimeDirectory, SystemLog& log,
                       std::optional<uid_t> trustedUser = std::nullopt);
 
     /// $VENTRIK_RUNTIME_DIR, else $XDG_RUNTIME_DIR/ventrik, else /tmp/ventrik-UID.
-    static std::string defaultDirectory() { return PortDirectory::defaultPath(); }
+    static PortDirectory defaultDirectory() { return PortDirectory::fromEnvironment(); }
 
     /// Makes the runtime directory where it is missing.
     LocalPortCreation createLocalPort(std::string_view name, PortSenders senders,
@@ -34,8 +35,13 @@ class LinuxMessagePorts : public MessagePorts
     std::shared_ptr<RemotePort> createRemotePort(std::string_view name) override;
 
   private:
-    LocalPortCreation refuse(std::string reason) const;
-    std::string claimPath(std::string_view name) const;
+    struct PathFault {
+        std::string reason; // empty: there is none
+        bool nameIsTaken = false;
+    };
+
+    LocalPortCreation refuse(std::string reason, bool nameIsTaken = false) const;
+    PathFault claimPath(std::string_view name) const;
 
     PortDirectory _directory;
     SystemLog& _log;

@@ -8,7 +8,7 @@ LinuxPlatform::LinuxPlatform(const LinuxPlatformOptions& options)
            options.verbose ? LinuxSystemLog::Copy::StandardError : LinuxSystemLog::Copy::None,
            options.logThreshold),
       _ports(options.runtimeDirectory.empty() ? LinuxMessagePorts::defaultDirectory()
-                                              : options.runtimeDirectory,
+                                              : PortDirectory(options.runtimeDirectory),
              _log),
       _telephony(_ports, _mainQueue),
       _resources(options.resourceDirectories.empty() ? LinuxResources::defaultDirectories()

@@ -17,8 +17,13 @@ constexpr std::size_t chunkSize = 64 * 1024;
 } // namespace
 
 LinuxRemotePort::LinuxRemotePort(std::string name, FileDescriptor socket)
-    : _name(std::move(name)), _socket(std::move(socket)), _chunk(chunkSize)
+    : _name(std::move(name)),
+      _socket(std::move(socket)),
+      _reader(frameMaximumReply),
+      _chunk(chunkSize)
 {
+    if (const auto peer = peerOf(_socket.get()))
+        _process = peer->process;
     _readNotifier = makeNotifier(_socket.get(), QSocketNotifier::Read, [this] { readUnasked(); });
     _writeNotifier = makeNotifier(_socket.get(), QSocketNotifier::Write, [this] { writeRest(); });
     _writeNotifier->setEnabled(false);
@@ -54,7 +59,7 @@ int LinuxRemotePort::sendFrame(const FrameHeader& header, ByteView data, const D
     const int error = sendOutgoing(deadline);
     if (error != PortError::sendTimeout)
         return error;
-    if (_outgoing.taken() > 0)
+    if (_outgoing.hasBegun())
         return PortError::success;
     _outgoing.clear();
     watchForRest();
@@ -67,7 +72,7 @@ int LinuxRemotePort::sendOutgoing(const Deadline& deadline)
     while (!_outgoing.empty()) {
         const IoStatus status = _outgoing.sendOnce(_socket.get());
         if (status == IoStatus::Closed) {
-            const bool wasTaken = _outgoing.taken() > 0;
+            const bool wasTaken = _outgoing.hasBegun();
             peerHasGone();
             return wasTaken ? PortError::transportFault : PortError::invalidPort;
         }

@@ -23,13 +23,14 @@ class LinuxRemotePort : public RemotePort, public std::enable_shared_from_this<L
 
     const std::string& name() const override { return _name; }
     /// Data above 64 MiB is not sent: `PortError::transportFault`, and the port stays. A reply that
-    /// is malformed or too large, or a peer that goes before it replies, gives the same and ends
+    /// is malformed or above 64 KiB, or a peer that goes before it replies, gives the same and ends
     /// the port.
     SendResult send(std::int32_t id, ByteView data, Seconds sendTimeout, Seconds receiveTimeout,
                     Reply reply) override;
     void setInvalidationCallback(InvalidationCallback callback) override;
     void invalidate() override;
     bool isValid() const override;
+    ProcessNumber process() const override { return _process; }
 
   private:
     enum class ReplySearch { Found, NotYet, Malformed };
@@ -48,6 +49,7 @@ class LinuxRemotePort : public RemotePort, public std::enable_shared_from_this<L
 
     std::string _name;
     FileDescriptor _socket;
+    ProcessNumber _process = 0;
     InvalidationCallback _invalidationCallback;
     SocketNotifier _readNotifier;
     SocketNotifier _writeNotifier;

@@ -23,14 +23,14 @@ std::uint32_t u32(std::span<const std::uint8_t, frameHeaderSize> bytes, std::siz
     return value;
 }
 
-bool makesSense(const FrameHeader& header)
+bool makesSense(const FrameHeader& header, std::size_t maximumPayload)
 {
     using namespace FrameFlag;
     switch (header.flags) {
     case 0:
     case wantsReply:
     case isReply:
-        return header.length <= frameMaximumPayload;
+        return header.length <= maximumPayload;
     case isReply | replyHasNoData:
         return header.length == 0;
     default:
@@ -50,11 +50,12 @@ FrameHeaderBytes encodeFrameHeader(const FrameHeader& header)
     return bytes;
 }
 
-std::optional<FrameHeader> decodeFrameHeader(std::span<const std::uint8_t, frameHeaderSize> bytes)
+std::optional<FrameHeader> decodeFrameHeader(std::span<const std::uint8_t, frameHeaderSize> bytes,
+                                             std::size_t maximumPayload)
 {
     const FrameHeader header{u32(bytes, 0), static_cast<std::int32_t>(u32(bytes, 4)), u32(bytes, 8),
                              u32(bytes, 12)};
-    return makesSense(header) ? std::optional(header) : std::nullopt;
+    return makesSense(header, maximumPayload) ? std::optional(header) : std::nullopt;
 }
 
 FrameReader::Status FrameReader::consume(ByteView& input)
@@ -62,7 +63,7 @@ FrameReader::Status FrameReader::consume(ByteView& input)
     if (_headerCount < frameHeaderSize) {
         if (!consumeHeader(input))
             return Status::NeedsMore;
-        const auto header = decodeFrameHeader(_headerBytes);
+        const auto header = decodeFrameHeader(_headerBytes, _maximumPayload);
         if (!header)
             return Status::Malformed;
         _header = *header;

@@ -2,6 +2,8 @@
 
 #include <utility>
 
+#include <poll.h>
+
 namespace ventrik
 {
 
@@ -12,12 +14,15 @@ constexpr std::size_t chunkSize = 64 * 1024;
 constexpr int readsPerTurn = 16;
 constexpr int messagesPerTurn = 64;
 // A peer that lets more replies than this pile up does not read them.
-constexpr std::size_t maximumOutgoing = frameMaximumPayload + frameHeaderSize;
+constexpr std::size_t maximumOutgoing = 16 * frameMaximumReply;
+constexpr std::chrono::seconds longestStall{5};
 
 } // namespace
 
-PortConnection::PortConnection(FileDescriptor socket, bool peerIsTrusted, Handlers handlers)
+PortConnection::PortConnection(FileDescriptor socket, Peer peer, bool peerIsTrusted,
+                               Handlers handlers)
     : _socket(std::move(socket)),
+      _peer(peer),
       _peerIsTrusted(peerIsTrusted),
       _handlers(std::move(handlers)),
       _chunk(chunkSize)
@@ -25,6 +30,8 @@ PortConnection::PortConnection(FileDescriptor socket, bool peerIsTrusted, Handle
     // A timer, not a posted event: posted events that post the next one keep everything else out.
     _nextTurn.setSingleShot(true);
     QObject::connect(&_nextTurn, &QTimer::timeout, [this] { readTurn(); });
+    _stall.setSingleShot(true);
+    QObject::connect(&_stall, &QTimer::timeout, [this] { checkStall(); });
 }
 
 PortConnection::~PortConnection()
@@ -44,6 +51,7 @@ void PortConnection::startReading()
 void PortConnection::close()
 {
     _nextTurn.stop();
+    _stall.stop();
     _readNotifier.reset();
     _writeNotifier.reset();
     _socket.reset();
@@ -63,6 +71,25 @@ void PortConnection::readTurn()
         _nextTurn.start(0);
     else
         _readNotifier->setEnabled(true);
+    watchForStall();
+}
+
+// Called when something was read.
+void PortConnection::watchForStall()
+{
+    if (_reader.isWithinFrame())
+        _stall.start(longestStall);
+    else
+        _stall.stop();
+}
+
+// Where we were held up ourselves, the rest may be waiting to be read.
+void PortConnection::checkStall()
+{
+    if (waitForSocket(_socket.get(), POLLIN, Deadline(std::chrono::seconds(0))))
+        _stall.start(longestStall);
+    else
+        end("it stalled within a message");
 }
 
 // True when the turn's share of messages is used up while more of them wait.
@@ -94,6 +121,7 @@ bool PortConnection::receive()
     if (result.status == IoStatus::Closed)
         end({});
     _unread = ByteView(_chunk).first(result.count);
+    _hasSent |= result.count > 0;
     return result.status == IoStatus::Done;
 }
 
@@ -101,6 +129,8 @@ void PortConnection::handleFrame()
 {
     const FrameHeader header = _reader.header();
     const Bytes data = _reader.takePayload();
+    _hasSentMessage = true;
+    _lastMessageTime = std::chrono::steady_clock::now();
     if ((header.flags & FrameFlag::isReply) != 0)
         return end("it sent a reply that nobody asked for");
     auto answer = _handlers.onMessage({header.id, data, _peerIsTrusted});
@@ -110,7 +140,7 @@ void PortConnection::handleFrame()
 
 void PortConnection::reply(std::uint32_t serial, std::optional<Bytes> data)
 {
-    if (data && data->size() > frameMaximumPayload)
+    if (data && data->size() > frameMaximumReply)
         data.reset(); // the sender would take it for a fault of the line
     FrameHeader header{0, 0, FrameFlag::isReply, serial};
     if (data)

@@ -6,6 +6,7 @@
 
 #include <QTimer>
 
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -26,13 +27,23 @@ class PortConnection : public std::enable_shared_from_this<PortConnection>
         std::function<void(PortConnection&, std::string_view reason)> onEnd;
     };
 
-    PortConnection(FileDescriptor socket, bool peerIsTrusted, Handlers handlers);
+    using Time = std::chrono::steady_clock::time_point;
+
+    PortConnection(FileDescriptor socket, Peer peer, bool peerIsTrusted, Handlers handlers);
     ~PortConnection();
 
     void startReading();
     /// Ends the connection without a call of `onEnd`.
     void close();
     bool isOpen() const { return _socket.isOpen(); }
+
+    pid_t peerProcess() const { return _peer.process; }
+    /// Whether any byte came.
+    bool hasSent() const { return _hasSent; }
+    /// Whether a whole message came, and when the last one did; at first, when the connection was
+    /// made.
+    bool hasSentMessage() const { return _hasSentMessage; }
+    Time lastMessageTime() const { return _lastMessageTime; }
 
   private:
     void readTurn();
@@ -42,9 +53,15 @@ class PortConnection : public std::enable_shared_from_this<PortConnection>
     void reply(std::uint32_t serial, std::optional<Bytes> data);
     void flush();
     void end(std::string_view reason);
+    void watchForStall();
+    void checkStall();
 
     FileDescriptor _socket;
+    Peer _peer;
     bool _peerIsTrusted;
+    bool _hasSent = false;
+    bool _hasSentMessage = false;
+    Time _lastMessageTime = std::chrono::steady_clock::now();
     Handlers _handlers;
     SocketNotifier _readNotifier;
     SocketNotifier _writeNotifier;
@@ -53,6 +70,7 @@ class PortConnection : public std::enable_shared_from_this<PortConnection>
     ByteView _unread; // what of them is not consumed yet
     SendBuffer _outgoing;
     QTimer _nextTurn;
+    QTimer _stall; // runs while the rest of a message is awaited
 };
 
 } // namespace ventrik

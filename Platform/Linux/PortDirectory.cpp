@@ -1,5 +1,7 @@
 #include "Platform/Linux/PortDirectory.h"
 
+#include "Files/PrivateFile.h"
+
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
@@ -27,35 +29,53 @@ std::string environment(const char* name)
 
 } // namespace
 
-PortDirectory::PortDirectory(std::string path) : _path(std::move(path)) {}
+PortDirectory::PortDirectory(std::string path, Origin origin)
+    : _path(std::move(path)), _origin(origin)
+{
+    // With a slash at its end a link would be followed.
+    while (_path.size() > 1 && _path.ends_with('/'))
+        _path.pop_back();
+}
 
-std::string PortDirectory::defaultPath()
+PortDirectory PortDirectory::fromEnvironment()
 {
     if (auto chosen = environment("VENTRIK_RUNTIME_DIR"); !chosen.empty())
-        return chosen;
-    if (const auto runtime = environment("XDG_RUNTIME_DIR"); !runtime.empty())
-        return runtime + "/ventrik";
-    return fmt::format("/tmp/ventrik-{}", geteuid());
+        return {std::move(chosen), Origin::Named};
+    if (const auto runtime = environment("XDG_RUNTIME_DIR"); runtime.starts_with('/'))
+        return {runtime + "/ventrik", Origin::Ours};
+    return {fmt::format("/tmp/ventrik-{}", geteuid()), Origin::Ours};
 }
 
 std::string PortDirectory::prepare(IfMissing ifMissing) const
 {
-    if (ifMissing == IfMissing::Create) {
-        std::error_code ignored; // opening it tells
-        std::filesystem::create_directories(std::filesystem::path(_path).parent_path(), ignored);
-        ::mkdir(_path.c_str(), S_IRWXU);
-    }
+    if (ifMissing == IfMissing::Create)
+        makePrivateDirectories(_path); // opening it tells
     // The checks are made on what was opened: nobody can swap it in between.
     const FileDescriptor directory(
         ::open(_path.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    if (directory.isOpen())
+        return faultOf(directory.get());
+    const int error = errno;
+    std::error_code ignored;
+    if (std::filesystem::is_symlink(_path, ignored))
+        return fmt::format("runtime directory {} is a symbolic link, which is not followed", _path);
+    return fmt::format("runtime directory {} cannot be used: {}", _path, std::strerror(error));
+}
+
+std::string PortDirectory::faultOf(int directory) const
+{
     struct stat status {
     };
-    if (!directory.isOpen() || ::fstat(directory.get(), &status) != 0)
+    if (::fstat(directory, &status) != 0)
         return fmt::format("runtime directory {} cannot be used: {}", _path, std::strerror(errno));
     if (status.st_uid != geteuid())
         return fmt::format("runtime directory {} belongs to user {}, not to user {}", _path,
                            status.st_uid, geteuid());
-    if ((status.st_mode & 07777) != S_IRWXU && ::fchmod(directory.get(), S_IRWXU) != 0)
+    const mode_t mode = status.st_mode & 07777;
+    if (_origin == Origin::Named && (mode & (S_IRWXG | S_IRWXO)) != 0)
+        return fmt::format("runtime directory {} may be used by others (mode {:04o}, not 0700)",
+                           _path, mode);
+    if (_origin == Origin::Ours && mode != S_IRWXU && ::fchmod(directory, S_IRWXU) != 0)
         return fmt::format("runtime directory {} cannot be made private: {}", _path,
                            std::strerror(errno));
     return {};

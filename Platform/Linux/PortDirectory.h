@@ -10,18 +10,26 @@
 namespace ventrik
 {
 
-/// The directory that holds the ports' sockets. It must belong to this user and is kept at mode
-/// 0700: whoever could put files there could pose as a port.
+/// The directory that holds the ports' sockets. It must belong to this user and be his alone:
+/// whoever could put files there could pose as a port. One of ours is made so; one that somebody
+/// named is refused where others may use it, since closing it to them might be against his will.
 class PortDirectory
 {
   public:
-    explicit PortDirectory(std::string path);
+    enum class Origin {
+        Named, ///< by the user; never changed
+        Ours,  ///< by our own rule; set to mode 0700
+    };
 
-    /// The directory that the environment names, or the user's own one; never empty.
-    static std::string defaultPath();
+    PortDirectory(std::string path, Origin origin = Origin::Named);
+
+    /// $VENTRIK_RUNTIME_DIR, a named one, else ours: $XDG_RUNTIME_DIR/ventrik where that is an
+    /// absolute path, else /tmp/ventrik-UID.
+    static PortDirectory fromEnvironment();
 
     enum class IfMissing { Create, Leave };
-    /// One line that says why the directory cannot be used, or nothing when it can.
+    /// One line that says why the directory cannot be used, or nothing when it can. What is made
+    /// has mode 0700, missing parents too.
     std::string prepare(IfMissing ifMissing) const;
     /// One line that says why no port can have that name, or nothing when one can.
     std::string nameFault(std::string_view name) const;
@@ -35,7 +43,10 @@ class PortDirectory
     FileDescriptor lock() const;
 
   private:
+    std::string faultOf(int directory) const;
+
     std::string _path;
+    Origin _origin;
 };
 
 /// A socket file and its identity, so that nobody else's is removed in its place.

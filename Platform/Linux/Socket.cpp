@@ -91,13 +91,13 @@ FileDescriptor listenSocket(const std::string& path)
     return FileDescriptor();
 }
 
-std::optional<uid_t> peerUser(int socket)
+std::optional<Peer> peerOf(int socket)
 {
     ucred credentials{};
     socklen_t length = sizeof credentials;
     if (getsockopt(socket, SOL_SOCKET, SO_PEERCRED, &credentials, &length) != 0)
         return std::nullopt;
-    return credentials.uid;
+    return Peer{credentials.uid, credentials.pid};
 }
 
 IoResult receiveBytes(int socket, std::span<std::uint8_t> buffer)
@@ -161,6 +161,11 @@ void SendBuffer::append(ByteView bytes)
 {
     if (empty())
         clear();
+    // More than half of it is waste: worth moving the rest.
+    if (_taken > _bytes.size() / 2) {
+        _bytes.erase(_bytes.begin(), _bytes.begin() + static_cast<std::ptrdiff_t>(_taken));
+        _taken = 0;
+    }
     _bytes.insert(_bytes.end(), bytes.begin(), bytes.end());
 }
 
@@ -168,6 +173,7 @@ void SendBuffer::clear()
 {
     _bytes = Bytes();
     _taken = 0;
+    _hasBegun = false;
 }
 
 IoStatus SendBuffer::sendOnce(int socket)
@@ -176,6 +182,7 @@ IoStatus SendBuffer::sendOnce(int socket)
         return IoStatus::Done;
     const IoResult result = sendBytes(socket, ByteView(_bytes).subspan(_taken));
     _taken += result.count;
+    _hasBegun |= result.count > 0;
     return result.status;
 }
 

@@ -57,8 +57,13 @@ Connecting connectSocket(const std::string& path);
 /// A socket that listens at the path, which must be free; not open and errno set on failure.
 FileDescriptor listenSocket(const std::string& path);
 
-/// The user behind the peer, as the kernel saw it when the connection was made.
-std::optional<uid_t> peerUser(int socket);
+/// Who is behind the peer, as the kernel saw it when the connection was made or, for a connection
+/// of ours, when the peer began to listen.
+struct Peer {
+    uid_t user = 0;
+    pid_t process = 0;
+};
+std::optional<Peer> peerOf(int socket);
 
 enum class IoStatus { Done, WouldBlock, Closed };
 struct IoResult {
@@ -92,9 +97,11 @@ class SendBuffer
   public:
     bool empty() const { return _taken == _bytes.size(); }
     std::size_t size() const { return _bytes.size() - _taken; }
-    /// How many bytes of what was last appended to an empty buffer have left it.
-    std::size_t taken() const { return _taken; }
+    /// Whether the socket took any byte of what was last appended to an empty buffer.
+    bool hasBegun() const { return _hasBegun; }
 
+    /// Room that was taken by what has been sent is used again, also while the buffer never
+    /// empties.
     void append(ByteView bytes);
     void clear();
     /// Offers the rest to the socket once.
@@ -102,7 +109,8 @@ class SendBuffer
 
   private:
     Bytes _bytes;
-    std::size_t _taken = 0;
+    std::size_t _taken = 0; // of the bytes that are held
+    bool _hasBegun = false;
 };
 
 struct NotifierDeleter {

@@ -2,6 +2,8 @@
 
 #include <numeric>
 
+#include <sys/resource.h>
+#include <sys/socket.h>
 #include <unistd.h>
 
 namespace ventrik
@@ -18,6 +20,35 @@ class LinuxLocalPortTest : public PortsTest
     void writeHeader(const FileDescriptor& socket, const FrameHeader& header)
     {
         sendBytes(socket.get(), encodeFrameHeader(header));
+    }
+    /// A delivering port whose connections make room after so long.
+    std::shared_ptr<LocalPort> makeImpatientPort(std::chrono::milliseconds idleLimit)
+    {
+        makePort().reset(); // for the directory
+        const std::string path = directory + "/port";
+        auto port = std::make_shared<LinuxLocalPort>(
+            LinuxLocalPort::Parts{"port", listenSocket(path), SocketFile(path),
+                                  PortSenders::SameUser, geteuid(),
+                                  [this](const PortMessage& message) -> std::optional<Bytes> {
+                                      received.push_back({message.id, {}, true});
+                                      return std::nullopt;
+                                  },
+                                  idleLimit},
+            log);
+        port->deliverOnMainQueue();
+        return port;
+    }
+    /// So many silent connections, accepted in this order.
+    std::vector<FileDescriptor> fillTable(std::size_t count)
+    {
+        std::vector<FileDescriptor> connections;
+        for (std::size_t i = 0; i < count; ++i) {
+            connections.push_back(connectRaw());
+            if (i % 16 == 0)
+                runReadyEvents();
+        }
+        runReadyEvents();
+        return connections;
     }
 };
 
@@ -125,10 +156,10 @@ TEST_F(LinuxLocalPortTest, DropsAPeerThatDoesNotReadItsReplies)
 {
     const auto local = makePort();
     local->deliverOnMainQueue();
-    reply = Bytes(std::size_t{40} << 20);
+    reply = Bytes(std::size_t{64} << 10);
     const FileDescriptor raw = connectRaw();
-    writeHeader(raw, {0, 1, FrameFlag::wantsReply, 1});
-    writeHeader(raw, {0, 2, FrameFlag::wantsReply, 2});
+    for (std::uint32_t serial = 1; serial <= 40; ++serial)
+        writeHeader(raw, {0, 1, FrameFlag::wantsReply, serial});
     EXPECT_TRUE(hasBeenClosed(raw));
     EXPECT_TRUE(log.contains("port port dropped a connection: it does not read its replies"));
 }
@@ -229,6 +260,168 @@ TEST_F(LinuxLocalPortTest, DoesNotRunAClearedInvalidationCallback)
     local->setInvalidationCallback(nullptr);
     local->invalidate();
     EXPECT_EQ(invalidations, 0);
+}
+
+TEST_F(LinuxLocalPortTest, HasLostItsStreamWhenThatConnectionEnds)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(getpid());
+    FileDescriptor stream = connectRaw();
+    runReadyEvents();
+    EXPECT_FALSE(local->hasLostStream());
+    stream.reset();
+    EXPECT_TRUE(runUntil([&] { return local->hasLostStream(); }));
+}
+
+TEST_F(LinuxLocalPortTest, HasLostItsStreamWhenThatConnectionIsHalfClosed)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(getpid());
+    const FileDescriptor stream = connectRaw();
+    shutdown(stream.get(), SHUT_WR);
+    EXPECT_TRUE(runUntil([&] { return local->hasLostStream(); }));
+}
+
+TEST_F(LinuxLocalPortTest, HasLostItsStreamWhenThatConnectionBreaksTheFraming)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(getpid());
+    const FileDescriptor stream = connectRaw();
+    writeHeader(stream, {1, 0, 0x80, 1});
+    EXPECT_TRUE(runUntil([&] { return local->hasLostStream(); }));
+}
+
+TEST_F(LinuxLocalPortTest, HasNotLostItsStreamWhileOneConnectionOfTheProcessIsThere)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(getpid());
+    FileDescriptor probe = connectRaw();
+    const FileDescriptor stream = connectRaw();
+    probe.reset();
+    runReadyEvents();
+    EXPECT_FALSE(local->hasLostStream());
+}
+
+TEST_F(LinuxLocalPortTest, TakesConnectionsOfOthersForNoStreamOnceTheProcessHasConnected)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    ASSERT_EQ(startSender("port"), "sent");
+    ASSERT_TRUE(runUntilReceived(1));
+    local->expectStreamOf(getpid());
+    const FileDescriptor stream = connectRaw();
+    runReadyEvents();
+    killHelper();
+    runReadyEvents();
+    EXPECT_FALSE(local->hasLostStream());
+}
+
+TEST_F(LinuxLocalPortTest, TakesWhoeverSendsForTheStreamWhereTheProcessNeverConnects)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(1);
+    FileDescriptor silent = connectRaw();
+    silent.reset();
+    runReadyEvents();
+    EXPECT_FALSE(local->hasLostStream());
+    FileDescriptor stream = connectRaw();
+    writeHeader(stream, {0, 1, 0, 1});
+    ASSERT_TRUE(runUntilReceived(1));
+    stream.reset();
+    EXPECT_TRUE(runUntil([&] { return local->hasLostStream(); }));
+}
+
+TEST_F(LinuxLocalPortTest, LosesNoStreamBeforeOneIsExpected)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    FileDescriptor raw = connectRaw();
+    writeHeader(raw, {0, 1, 0, 1});
+    ASSERT_TRUE(runUntilReceived(1));
+    raw.reset();
+    runReadyEvents();
+    EXPECT_FALSE(local->hasLostStream());
+}
+
+// Both wait for 5 s for real.
+TEST_F(LinuxLocalPortTest, EndsAConnectionThatStallsWithinAMessageAndNoOther)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    local->expectStreamOf(getpid());
+    const FileDescriptor betweenMessages = connectRaw();
+    writeHeader(betweenMessages, {0, 1, 0, 1});
+    const FileDescriptor withinPayload = connectRaw();
+    writeHeader(withinPayload, {100, 1, 0, 1});
+    const FileDescriptor withinHeader = connectRaw();
+    sendBytes(withinHeader.get(), Bytes{1, 0, 0});
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_TRUE(runUntil([&] {
+        return log.count("port port dropped a connection: it stalled within a message") == 2;
+    }));
+    EXPECT_GE(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(4900));
+    EXPECT_FALSE(hasHungUp(betweenMessages.get()));
+    EXPECT_TRUE(hasHungUp(withinPayload.get()));
+    EXPECT_TRUE(hasHungUp(withinHeader.get()));
+    EXPECT_FALSE(local->hasLostStream());
+}
+
+TEST_F(LinuxLocalPortTest, MakesRoomForANewConnectionByTheOneThatIsIdleLongest)
+{
+    const auto local = makeImpatientPort(std::chrono::milliseconds(0));
+    const FileDescriptor speaker = connectRaw();
+    writeHeader(speaker, {0, 1, 0, 1});
+    ASSERT_TRUE(runUntilReceived(1));
+    std::vector<FileDescriptor> idle = fillTable(255);
+    const auto remote = ports.createRemotePort("port");
+    send(*remote, 2);
+    ASSERT_TRUE(runUntilReceived(2));
+    EXPECT_TRUE(hasHungUp(idle.front().get()));
+    EXPECT_FALSE(hasHungUp(idle[1].get()));
+    EXPECT_FALSE(hasHungUp(speaker.get()));
+}
+
+TEST_F(LinuxLocalPortTest, MakesNoRoomByTheConnectionThatCarriesTheStream)
+{
+    const auto local = makeImpatientPort(std::chrono::milliseconds(0));
+    local->expectStreamOf(getpid());
+    std::vector<FileDescriptor> streams = fillTable(256);
+    const FileDescriptor late = connectRaw();
+    EXPECT_TRUE(hasBeenClosed(late));
+    EXPECT_TRUE(log.contains("port port refused a connection: it has 256 already"));
+    EXPECT_FALSE(hasHungUp(streams.front().get()));
+}
+
+TEST_F(LinuxLocalPortTest, RefusesAConnectionWhileNoOtherHasBeenIdleForLong)
+{
+    const auto local = makeImpatientPort(std::chrono::seconds(30));
+    std::vector<FileDescriptor> idle = fillTable(256);
+    const FileDescriptor late = connectRaw();
+    EXPECT_TRUE(hasBeenClosed(late));
+    EXPECT_FALSE(hasHungUp(idle.front().get()));
+}
+
+TEST_F(LinuxLocalPortTest, SaysOnceThatItIsOutOfDescriptors)
+{
+    const auto local = makePort();
+    local->deliverOnMainQueue();
+    rlimit limits{};
+    getrlimit(RLIMIT_NOFILE, &limits);
+    const FileDescriptor waiting = connectRaw();
+    // The lowest free number is above the limit from now on.
+    const rlimit none{static_cast<rlim_t>(waiting.get()) + 1, limits.rlim_max};
+    setrlimit(RLIMIT_NOFILE, &none);
+    const auto start = std::chrono::steady_clock::now();
+    runUntil([&] { return std::chrono::steady_clock::now() - start > std::chrono::seconds(1); });
+    setrlimit(RLIMIT_NOFILE, &limits);
+    EXPECT_EQ(log.count("port port cannot take connections for now: Too many open files"), 1U);
+    sendBytes(waiting.get(), encodeFrameHeader({0, 7, 0, 1}));
+    EXPECT_TRUE(runUntilReceived(1));
 }
 
 } // namespace

@@ -44,12 +44,39 @@ TEST_F(LinuxMessagePortsTest, MakesAPrivateDirectoryWithAFileForThePort)
     EXPECT_TRUE(fileExists("port"));
 }
 
-TEST_F(LinuxMessagePortsTest, TightensItsOwnDirectory)
+TEST_F(LinuxMessagePortsTest, TightensTheDirectoryOfOurOwnRule)
 {
     std::filesystem::create_directory(directory);
     chmod(directory.c_str(), 0755);
-    EXPECT_NE(create("port").port, nullptr);
+    LinuxMessagePorts own({directory, PortDirectory::Origin::Ours}, log);
+    EXPECT_NE(own.createLocalPort("port", PortSenders::SameUser, nullptr).port, nullptr);
     EXPECT_EQ(directoryMode(), 0700U);
+}
+
+TEST_F(LinuxMessagePortsTest, RefusesANamedDirectoryThatOthersMayUseAndLeavesItAsItIs)
+{
+    std::filesystem::create_directory(directory);
+    for (const mode_t mode : {0755, 0710, 0702}) {
+        chmod(directory.c_str(), mode);
+        const auto creation = create("port");
+        EXPECT_EQ(creation.port, nullptr);
+        EXPECT_THAT(creation.error,
+                    HasSubstr("runtime directory " + directory + " may be used by others"));
+        EXPECT_EQ(directoryMode(), mode);
+    }
+}
+
+TEST_F(LinuxMessagePortsTest, MakesMissingParentsPrivateToo)
+{
+    const std::string parent = temporary.filePath("a").toStdString();
+    LinuxMessagePorts nested(parent + "/b/run", log);
+    EXPECT_NE(nested.createLocalPort("port", PortSenders::SameUser, nullptr).port, nullptr);
+    for (const char* name : {"", "/b", "/b/run"}) {
+        struct stat status {
+        };
+        ASSERT_EQ(stat((parent + name).c_str(), &status), 0);
+        EXPECT_EQ(status.st_mode & 07777U, 0700U);
+    }
 }
 
 TEST_F(LinuxMessagePortsTest, RefusesADirectoryThatIsAFile)
@@ -62,8 +89,17 @@ TEST_F(LinuxMessagePortsTest, RefusesADirectoryThatIsAFile)
 
 TEST_F(LinuxMessagePortsTest, RefusesADirectoryBehindALink)
 {
-    std::filesystem::create_directory_symlink(temporary.path().toStdString(), directory);
-    EXPECT_EQ(create("port").port, nullptr);
+    const std::string target = temporary.filePath("target").toStdString();
+    std::filesystem::create_directory(target);
+    chmod(target.c_str(), 0700);
+    std::filesystem::create_directory_symlink(target, directory);
+    for (const char* ending : {"", "/", "//"}) {
+        LinuxMessagePorts linked(directory + ending, log);
+        const auto creation = linked.createLocalPort("port", PortSenders::SameUser, nullptr);
+        EXPECT_EQ(creation.port, nullptr);
+        EXPECT_EQ(creation.error,
+                  "runtime directory " + directory + " is a symbolic link, which is not followed");
+    }
 }
 
 TEST_F(LinuxMessagePortsTest, RefusesNamesThatAreNoFileNames)
@@ -110,6 +146,7 @@ TEST_F(LinuxMessagePortsTest, CountsALivePortOfAnotherProcessAsTaken)
     const auto creation = create("port");
     EXPECT_EQ(creation.port, nullptr);
     EXPECT_FALSE(creation.alreadyExists);
+    EXPECT_TRUE(creation.nameIsTaken);
     EXPECT_EQ(creation.error, "port port is in use by another process");
 }
 
@@ -130,7 +167,7 @@ TEST_F(LinuxMessagePortsTest, TakesOverTheFileOfAKilledProcess)
 
 TEST_F(LinuxMessagePortsTest, LeavesAFileThatIsNoSocketAlone)
 {
-    std::filesystem::create_directory(directory);
+    ASSERT_NE(create("first").port, nullptr);
     std::ofstream(directory + "/port") << "x";
     EXPECT_THAT(create("port").error, HasSubstr("something else than a socket is there"));
     EXPECT_TRUE(fileExists("port"));
@@ -164,6 +201,16 @@ TEST_F(LinuxMessagePortsTest, GivesNoRemotePortWhereNobodyListens)
     EXPECT_NE(ports.createRemotePort("port"), nullptr);
 }
 
+TEST_F(LinuxMessagePortsTest, ConnectsOnlyToWhatTheTrustedUserServes)
+{
+    const auto creation = create("port");
+    LinuxMessagePorts distrusting(directory, log, geteuid() + 1);
+    EXPECT_EQ(distrusting.createRemotePort("port"), nullptr);
+    EXPECT_TRUE(log.contains(fmt::format("port port is not used: it belongs to user {}, not to "
+                                         "user {}",
+                                         geteuid(), geteuid() + 1)));
+}
+
 TEST_F(LinuxMessagePortsTest, RefusesTheDirectoryOfAnotherUser)
 {
     std::filesystem::create_directory(directory);
@@ -180,12 +227,14 @@ TEST_F(LinuxMessagePortsTest, RefusesTheDirectoryOfAnotherUser)
 TEST(PortDirectory, ComesFromTheEnvironment)
 {
     qputenv("VENTRIK_RUNTIME_DIR", "/chosen");
-    EXPECT_EQ(PortDirectory::defaultPath(), "/chosen");
+    EXPECT_EQ(PortDirectory::fromEnvironment().path(), "/chosen");
     qunsetenv("VENTRIK_RUNTIME_DIR");
+    qputenv("XDG_RUNTIME_DIR", "relative");
+    EXPECT_EQ(PortDirectory::fromEnvironment().path(), "/tmp/ventrik-" + std::to_string(geteuid()));
     qputenv("XDG_RUNTIME_DIR", "/run/user/7");
-    EXPECT_EQ(PortDirectory::defaultPath(), "/run/user/7/ventrik");
+    EXPECT_EQ(PortDirectory::fromEnvironment().path(), "/run/user/7/ventrik");
     qunsetenv("XDG_RUNTIME_DIR");
-    EXPECT_EQ(PortDirectory::defaultPath(), "/tmp/ventrik-" + std::to_string(geteuid()));
+    EXPECT_EQ(PortDirectory::fromEnvironment().path(), "/tmp/ventrik-" + std::to_string(geteuid()));
 }
 
 } // namespace

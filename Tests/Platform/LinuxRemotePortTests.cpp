@@ -85,7 +85,22 @@ TEST_F(LinuxRemotePortTest, ExchangesLargeData)
     const auto remote = ports.createRemotePort("port");
     const auto result = ask(*remote, 4, Bytes(std::size_t{32} << 20));
     ASSERT_EQ(result.error, PortError::success);
-    EXPECT_TRUE(result.reply == Bytes(std::size_t{40} << 20, 4));
+    EXPECT_TRUE(result.reply == Bytes(std::size_t{64} << 10, 4));
+}
+
+TEST_F(LinuxRemotePortTest, GetsNoDataInThePlaceOfAReplyAboveTheLimit)
+{
+    ASSERT_EQ(startHelper("port"), "ready");
+    const auto remote = ports.createRemotePort("port");
+    const auto result = ask(*remote, 5);
+    EXPECT_EQ(result.error, PortError::success);
+    EXPECT_EQ(result.reply, std::nullopt);
+}
+
+TEST_F(LinuxRemotePortTest, KnowsTheProcessBehindIt)
+{
+    ASSERT_EQ(startHelper("port"), "ready");
+    EXPECT_EQ(ports.createRemotePort("port")->process(), helper.processId());
 }
 
 TEST_F(LinuxRemotePortTest, RefusesDataAboveTheLimit)
@@ -201,10 +216,10 @@ TEST_F(LinuxRemotePortTest, FailsOnAMalformedReply)
 
 TEST_F(LinuxRemotePortTest, FailsOnAReplyAboveTheLimit)
 {
-    const auto header = encodeFrameHeader({(64U << 20), 0, FrameFlag::isReply, 1});
-    Bytes tooLarge(header.begin(), header.end());
-    tooLarge[0] = 1;
+    const auto header = encodeFrameHeader({(64U << 10) + 1, 0, FrameFlag::isReply, 1});
+    const Bytes tooLarge(header.begin(), header.end());
     EXPECT_EQ(askRawServer(tooLarge).error, PortError::transportFault);
+    EXPECT_FALSE(stayedValid);
 }
 
 TEST_F(LinuxRemotePortTest, FailsOnAMessageInPlaceOfAReply)

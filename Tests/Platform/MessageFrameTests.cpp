@@ -29,6 +29,31 @@ TEST(MessageFrame, HasALengthOf64MiBAtMost)
     EXPECT_FALSE(decodeFrameHeader(headerWith(0xFFFFFFFF, 0)));
 }
 
+TEST(MessageFrame, MayBeLimitedFurther)
+{
+    EXPECT_TRUE(decodeFrameHeader(headerWith(100, 0), 100));
+    EXPECT_FALSE(decodeFrameHeader(headerWith(101, 0), 100));
+    FrameReader reader(100);
+    const FrameHeaderBytes header = headerWith(101, 0);
+    ByteView input(header);
+    EXPECT_EQ(reader.consume(input), Status::Malformed);
+}
+
+TEST(MessageFrame, IsBegunFromItsFirstByteToItsLast)
+{
+    FrameReader reader;
+    EXPECT_FALSE(reader.isWithinFrame());
+    Bytes bytes(sample.begin(), sample.end());
+    bytes.insert(bytes.end(), {1, 2, 3});
+    for (std::size_t i = 0; i < bytes.size(); ++i) {
+        ByteView input = ByteView(bytes).subspan(i, 1);
+        reader.consume(input);
+        EXPECT_TRUE(reader.isWithinFrame());
+    }
+    reader.takePayload();
+    EXPECT_FALSE(reader.isWithinFrame());
+}
+
 TEST(MessageFrame, RefusesFlagsThatMakeNoSense)
 {
     EXPECT_FALSE(decodeFrameHeader(headerWith(0, 3))); // a reply that wants a reply

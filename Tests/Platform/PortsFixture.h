@@ -103,14 +103,17 @@ class PortsTest : public ::testing::Test
     }
 
     /// Starts the helper process as the owner of the port of that name; gives its first line.
-    std::string startHelper(const std::string& name)
+    std::string startHelper(const std::string& name, const QStringList& more = {})
     {
         helper.start(VENTRIK_PORT_HELPER,
-                     {QString::fromStdString(directory), QString::fromStdString(name)});
+                     QStringList{QString::fromStdString(directory), QString::fromStdString(name)} +
+                         more);
         while (!helper.canReadLine() && helper.waitForReadyRead(10000)) {
         }
         return helper.readLine().trimmed().toStdString();
     }
+    /// Starts the helper process as one that has sent a message to the port of that name.
+    std::string startSender(const std::string& name) { return startHelper(name, {"send"}); }
     void killHelper()
     {
         helper.kill();

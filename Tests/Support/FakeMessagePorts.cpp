@@ -15,6 +15,8 @@ LocalPortCreation FakeMessagePorts::createLocalPort(std::string_view name, PortS
 {
     if (auto error = std::exchange(_nextError, std::nullopt))
         return {nullptr, false, std::move(*error)};
+    if (std::exchange(_nextIsTaken, false))
+        return {nullptr, false, "taken", true};
     const bool mustExist = std::exchange(_nextExists, false);
     if (auto existing = localPort(name))
         return {std::move(existing), true, {}};
@@ -49,6 +51,11 @@ std::shared_ptr<RemotePort> FakeMessagePorts::createRemotePort(std::string_view 
 void FakeMessagePorts::failNextLocalPort(std::string error)
 {
     _nextError = std::move(error);
+}
+
+void FakeMessagePorts::reportNextLocalPortAsTaken()
+{
+    _nextIsTaken = true;
 }
 
 void FakeMessagePorts::reportNextLocalPortAsExisting()

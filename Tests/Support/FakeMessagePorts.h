@@ -42,6 +42,8 @@ class FakeMessagePorts : public MessagePorts
     // Local ports.
     /// The next creation of a local port gives none and this error.
     void failNextLocalPort(std::string error = "no local port on demand");
+    /// The next creation finds its name taken by another process.
+    void reportNextLocalPortAsTaken();
     /// The next creation finds its name taken in this process: by the live port of that name, or
     /// by one that stands for somebody else's and that these ports then keep.
     void reportNextLocalPortAsExisting();
@@ -98,6 +100,7 @@ class FakeMessagePorts : public MessagePorts
     std::vector<std::weak_ptr<FakeRemotePort>> _remotePorts;
     std::set<std::string, std::less<>> _listeners;
     std::optional<std::string> _nextError;
+    bool _nextIsTaken = false;
     bool _nextExists = false;
 };
 

@@ -31,7 +31,12 @@ class FakeLocalPort : public LocalPort, public std::enable_shared_from_this<Fake
     void setInvalidationCallback(InvalidationCallback callback) override;
     void invalidate() override;
     bool isValid() const override { return _isValid; }
+    void expectStreamOf(ProcessNumber process) override { _streamProcess = process; }
+    bool hasLostStream() const override { return _hasLostStream; }
 
+    /// The process whose stream was expected; none before.
+    std::optional<ProcessNumber> streamProcess() const { return _streamProcess; }
+    void loseStream() { _hasLostStream = true; }
     PortSenders senders() const { return _senders; }
     bool isDelivering() const { return _isDelivering; }
     bool hasInvalidationCallback() const { return static_cast<bool>(_invalidationCallback); }
@@ -59,6 +64,8 @@ class FakeLocalPort : public LocalPort, public std::enable_shared_from_this<Fake
     std::shared_ptr<OperationRecord> _record;
     std::deque<Message> _inbox;
     bool _isDelivering = false;
+    std::optional<ProcessNumber> _streamProcess;
+    bool _hasLostStream = false;
     bool _isValid = true;
 };
 
@@ -89,6 +96,8 @@ class FakeRemotePort : public RemotePort, public std::enable_shared_from_this<Fa
     void setInvalidationCallback(InvalidationCallback callback) override;
     void invalidate() override;
     bool isValid() const override { return _isValid; }
+    static constexpr ProcessNumber processNumber = 4711;
+    ProcessNumber process() const override { return processNumber; }
 
     bool hasInvalidationCallback() const { return static_cast<bool>(_invalidationCallback); }
     /// The peer has gone: the port is invalid at once, the callback follows on the main queue.

@@ -7,11 +7,18 @@
 namespace ventrik
 {
 
+/// What becomes of a message that breaks what the service promises.
+enum class AssertionPolicy {
+    EndProcess, ///< with the failure as the last line on standard error
+    Throw,      ///< an `AssertionFailure`
+};
+
 /// What a generator needs of the platform; all of it outlives the generator.
 struct GeneratorServices {
     SystemLog& log;
     const Resources& resources;
     const Clock& clock;
+    AssertionPolicy assertions = AssertionPolicy::EndProcess;
 };
 
 } // namespace ventrik

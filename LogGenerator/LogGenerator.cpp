@@ -85,6 +85,12 @@ std::string_view LogGenerator::technologyName(const PlistValue& technology)
     return found ? found->name : std::string_view();
 }
 
+void LogGenerator::recordDisplay(PlistDictionary& state) const
+{
+    if (state.contains("Display"))
+        updateHistoryInState(state, clock());
+}
+
 void LogGenerator::updateHistoryInState(PlistDictionary& state, const Clock& clock)
 {
     PlistValue* existing = state.find("History");

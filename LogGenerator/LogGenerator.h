@@ -53,6 +53,10 @@ class LogGenerator
 
     void init();
 
+    /// Records the display in the history, as `updateHistoryInState` does; where there is none, for
+    /// another technology's has made way, there is nothing to record.
+    void recordDisplay(PlistDictionary& state) const;
+
     /// Drops the display of another technology's generator from the state, so that its values are
     /// not taken for ours after the baseband changed its technology. The history stays.
     static void claimDisplay(PlistDictionary& state, std::string_view owner);
@@ -60,6 +64,7 @@ class LogGenerator
     SystemLog& log() const { return _services.log; }
     const Resources& resources() const { return _services.resources; }
     const Clock& clock() const { return _services.clock; }
+    AssertionPolicy assertions() const { return _services.assertions; }
 
   private:
     GeneratorServices _services;

@@ -329,10 +329,7 @@ ModelNodePointer VentrikModel::nodeAtPath(const std::string& path)
 {
     if (!_nodesByPath)
         topLevelNodes();
-    if (!_nodesByPath)
-        return nullptr;
-    const auto node = _nodesByPath->find(path);
-    return node == _nodesByPath->end() ? nullptr : node->second;
+    return _nodesByPath ? _nodesByPath->find(path) : nullptr;
 }
 
 void VentrikModel::updateWithData(ByteView data)

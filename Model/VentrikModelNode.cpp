@@ -3,6 +3,7 @@
 #include "LogGenerator/Orbel/ArrayLock.h"
 
 #include <algorithm>
+#include <optional>
 
 #include <fmt/format.h>
 
@@ -28,29 +29,36 @@ class TreeBuilder
   public:
     explicit TreeBuilder(PathIndex& index) : _index(index) {}
 
-    ModelNodePointer build(std::string name, const PlistValue* object, const std::string& path)
+    ModelNodePointer build(std::string name, const PlistValue* object, PathIndex::Place& place)
     {
-        auto node = makeNode(std::move(name), object, path);
-        _index[path] = node;
+        auto node = makeNode(std::move(name), object, place);
+        _index.put(place, node);
         return node;
     }
 
   private:
-    ModelNodePointer makeNode(std::string name, const PlistValue* object, const std::string& path)
+    ModelNodePointer makeNode(std::string name, const PlistValue* object, PathIndex::Place& place)
     {
         if (object && object->string())
             return VentrikModelLeafNode::initWithName(std::move(name), *object->string());
         if (object && object->dictionary())
             return VentrikModelTreeNode::initWithName(std::move(name),
-                                                      childrenOf(*object->dictionary(), path));
+                                                      childrenOf(*object->dictionary(), place));
         if (object && object->array())
             return VentrikModelTreeNode::initWithName(std::move(name),
-                                                      childrenOf(*object->array(), path));
+                                                      childrenOf(*object->array(), place));
         return VentrikModelLeafNode::initWithName(std::move(name), "(unknown)");
     }
 
+    ModelNodePointer buildChild(std::string name, const PlistValue& object,
+                                PathIndex::Place& parent)
+    {
+        PathIndex::Place& place = _index.join(parent, name);
+        return build(std::move(name), &object, place);
+    }
+
     VentrikModelNode::Children childrenOf(const PlistDictionary& dictionary,
-                                          const std::string& path)
+                                          PathIndex::Place& place)
     {
         std::vector<const PlistDictionary::Entry*> entries;
         for (const auto& entry : dictionary)
@@ -62,33 +70,38 @@ class TreeBuilder
 
         VentrikModelNode::Children children;
         children.reserve(entries.size());
-        for (const auto* entry : entries) {
-            const std::string name(isSorted ? labelOfSortedKey(entry->key) : entry->key);
-            children.push_back(build(name, &entry->value, pathJoining(path, name)));
-        }
+        for (const auto* entry : entries)
+            children.push_back(
+                buildChild(std::string(isSorted ? labelOfSortedKey(entry->key) : entry->key),
+                           entry->value, place));
         return children;
     }
 
-    VentrikModelNode::Children childrenOf(const PlistArray& array, const std::string& path)
+    VentrikModelNode::Children childrenOf(const PlistArray& array, PathIndex::Place& place)
     {
-        const ArrayLock::Scope locked;
+        // Arrays in an array are walked under its lock. Each lock within a lock would leave a level
+        // behind, and the levels of a lock are finite.
+        std::optional<ArrayLock::Scope> locked;
+        if (_arraysAround == 0)
+            locked.emplace();
+        ++_arraysAround;
         VentrikModelNode::Children children;
         children.reserve(array.size());
-        for (const PlistValue& element : array) {
-            const std::string name = fmt::format("{}", children.size());
-            children.push_back(build(name, &element, pathJoining(path, name)));
-        }
+        for (const PlistValue& element : array)
+            children.push_back(buildChild(fmt::format("{}", children.size()), element, place));
+        --_arraysAround;
         return children;
     }
 
     PathIndex& _index;
+    int _arraysAround = 0;
 };
 
 } // namespace
 
 ModelNodePointer VentrikModelNode::makeTreeFromObject(const PlistValue* object, PathIndex& index)
 {
-    return TreeBuilder(index).build("Ventrik", object, "/");
+    return TreeBuilder(index).build("Ventrik", object, index.root());
 }
 
 ModelNodePointer VentrikModelLeafNode::initWithName(std::string name, std::string value)
@@ -99,17 +112,6 @@ ModelNodePointer VentrikModelLeafNode::initWithName(std::string name, std::strin
 ModelNodePointer VentrikModelTreeNode::initWithName(std::string name, Children children)
 {
     return std::make_shared<VentrikModelTreeNode>(std::move(name), std::move(children));
-}
-
-std::string pathJoining(std::string_view path, std::string_view name)
-{
-    while (path.ends_with('/'))
-        path.remove_suffix(1);
-    while (name.starts_with('/'))
-        name.remove_prefix(1);
-    if (name.empty())
-        return path.empty() ? "/" : std::string(path);
-    return fmt::format("{}/{}", path, name);
 }
 
 } // namespace ventrik

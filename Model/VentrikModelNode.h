@@ -1,21 +1,14 @@
 #pragma once
 
+#include "Model/PathIndex.h"
 #include "PropertyList/PlistValue.h"
 
 #include <memory>
 #include <string>
-#include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace ventrik
 {
-
-class VentrikModelNode;
-
-using ModelNodePointer = std::shared_ptr<const VentrikModelNode>;
-/// Nodes by path. Of several nodes with one path the one built last stays.
-using PathIndex = std::unordered_map<std::string, ModelNodePointer>;
 
 /// A node of the display tree: what a pane shows as one row, or one level deeper as a screen. Nodes
 /// never change; a new display gives a new tree.
@@ -74,8 +67,5 @@ class VentrikModelTreeNode : public VentrikModelNode
   private:
     Children _childNodes;
 };
-
-/// The path of a child: exactly one "/" between the two, none doubled.
-std::string pathJoining(std::string_view path, std::string_view name);
 
 } // namespace ventrik

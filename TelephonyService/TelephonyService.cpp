@@ -80,6 +80,11 @@ PlistDictionary TelephonyService::openChannel(const PortMessage& message)
 
 PlistDictionary TelephonyService::openChannelFor(const std::string& clientPortName)
 {
+    // What we streamed to a port of ours would come back to us as commands.
+    if (clientPortName.starts_with(telephonyServicePortName)) {
+        _log.error("Refused a log channel for {}: that is a port of the service", clientPortName);
+        return refusal(EINVAL);
+    }
     // A client that comes again has lost its earlier channel.
     closeChannelsOf(clientPortName);
     if (_channels.size() >= maximumChannels) {

@@ -1,6 +1,7 @@
 #include "Tools/DecodeCommand.h"
 
 #include "Capture/SnapshotFile.h"
+#include "LogGenerator/AssertionFailure.h"
 #include "LogGenerator/DateText.h"
 #include "Model/TreePrinter.h"
 #include "Platform/Linux/LinuxClock.h"
@@ -9,9 +10,12 @@
 #include "Tools/Json.h"
 #include "Tools/OfflineDecoder.h"
 
+#include <array>
 #include <atomic>
 #include <cerrno>
 #include <cstring>
+#include <memory>
+#include <new>
 
 #include <fmt/format.h>
 #include <unistd.h>
@@ -21,6 +25,9 @@ namespace ventrik
 
 namespace
 {
+
+// Freed when memory is out, for telling so and for the result.
+constexpr std::size_t reserveSize = std::size_t{1} << 20;
 
 std::atomic<bool> interrupted = false;
 static_assert(std::atomic<bool>::is_always_lock_free);
@@ -70,12 +77,15 @@ class Decoding
     int run()
     {
         readAll();
-        _decoder.finish();
         writeResult();
         int status = DecodeStatus::done;
         // An interrupted read looks like damage, and is none.
-        if (!_reader.error().empty() && !interrupted) {
-            complain(_reader.error());
+        if (!_failure.empty() && !interrupted) {
+            complain(_failure);
+            status = DecodeStatus::badInput;
+        }
+        if (const std::string fault = _decoder.displayFault(); !fault.empty()) {
+            complain(fault);
             status = DecodeStatus::badInput;
         }
         if (std::fflush(_output) != 0 || std::ferror(_output)) {
@@ -88,13 +98,32 @@ class Decoding
     }
 
   private:
+    // What was decoded before a message that cannot be decoded is still the result.
     void readAll()
+    {
+        auto reserve = std::make_unique<std::array<char, reserveSize>>();
+        try {
+            readMessages();
+            _decoder.finish();
+        } catch (const AssertionFailure& failure) {
+            _failure =
+                fmt::format("{}: message {}: {}", _options.capture, _packets, failure.what());
+            _decoder.finish();
+        } catch (const std::bad_alloc&) {
+            reserve.reset();
+            _failure = fmt::format("{}: message {}: out of memory", _options.capture, _packets);
+        }
+    }
+
+    void readMessages()
     {
         Progress progress;
         while (!interrupted && !std::ferror(_output)) {
             const auto message = _reader.next();
-            if (!message)
+            if (!message) {
+                _failure = _reader.error();
                 return;
+            }
             _decoder.take(*message);
             if (_options.format == DecodeFormat::JsonLines)
                 writeLine(*message);
@@ -172,6 +201,7 @@ class Decoding
     OfflineDecoder _decoder;
     std::size_t _packets = 0;
     std::string _text;
+    std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
 
 std::optional<CaptureTechnology> chooseTechnology(const DecodeOptions& options,
@@ -204,8 +234,8 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
                                    options.version);
     const LinuxClock systemClock;
     CaptureClock clock(systemClock);
-    const auto generator =
-        LogGenerator::generatorFromTechnology(technology->identifier, {log, resources, clock});
+    const auto generator = LogGenerator::generatorFromTechnology(
+        technology->identifier, {log, resources, clock, AssertionPolicy::Throw});
     if (!generator) {
         complain(fmt::format("{}: there is no decoder for the technology {}", options.capture,
                              technology->name));
@@ -217,7 +247,7 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
 } // namespace
 
 int decodeCapture(const DecodeOptions& options, std::FILE* output)
-{
+try {
     if (!options.systemLogFile) {
         SilentSystemLog log;
         return decodeWithLog(options, log, output);
@@ -232,6 +262,9 @@ int decodeCapture(const DecodeOptions& options, std::FILE* output)
     if (log->commit(error))
         return status;
     complain(error);
+    return DecodeStatus::badInput;
+} catch (const std::bad_alloc&) {
+    complain(fmt::format("{}: out of memory", options.capture));
     return DecodeStatus::badInput;
 }
 

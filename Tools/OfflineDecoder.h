@@ -5,6 +5,7 @@
 
 #include <memory>
 #include <optional>
+#include <string>
 
 namespace ventrik
 {
@@ -26,7 +27,8 @@ class CaptureClock : public Clock
 
 /// Runs captured messages through a generator as the viewer would have at that time: a display is
 /// generated at every tick of 2 seconds from the first message on, when something arrived since the
-/// last one. A message at a tick's time still belongs to it.
+/// last one. A message at a tick's time still belongs to it. Where times run back by more than a
+/// tick, one passes there and then, and ticks are counted from the message on.
 class OfflineDecoder
 {
   public:
@@ -41,14 +43,17 @@ class OfflineDecoder
 
     /// The display as it stands; null while the generator has none.
     const PlistValue* display() const { return _state.find("Display"); }
+    std::string displayFault() const { return _generator.displayFault(); }
     PlistValue saveContents() const { return _generator.getSaveContentsFromState(_state); }
 
   private:
     void runTicksBefore(Clock::TimePoint time);
+    void generate();
 
     LogGenerator& _generator;
     CaptureClock& _clock;
     PlistDictionary _state;
+    Clock::TimePoint _lastTime; // of the last message
     std::optional<Clock::TimePoint> _nextTick;
     bool _updated = false;
 };

@@ -9,7 +9,6 @@
 #include "LogGenerator/C2K/OneXStatus.h"
 #include "LogGenerator/C2K/OneXTrafficFER.h"
 #include "LogGenerator/Orbel/LogPacket.h"
-#include "PropertyList/PropertyListReader.h"
 
 #include <algorithm>
 #include <array>
@@ -20,7 +19,7 @@ namespace ventrik
 namespace
 {
 
-constexpr std::string_view templateName = "C2KTemplate";
+constexpr const char* templateName = "C2KTemplate";
 
 struct Decoder {
     std::uint32_t logCode;
@@ -85,7 +84,7 @@ std::optional<PlistValue> C2KLogGenerator::generateLogUsingState(PlistDictionary
 {
     auto display = getDisplayFromState(state);
     storePacketsInState(state);
-    updateHistoryInState(state, clock());
+    recordDisplay(state);
     return display;
 }
 
@@ -94,7 +93,8 @@ std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& 
     claimDisplay(state, templateName);
     if (const PlistValue* display = state.find("Display"))
         return *display;
-    const auto displayTemplate = loadTemplate(state);
+    const auto displayTemplate =
+        loadTemplate(state, templateName, "Cannot load C2K template for display");
     if (!displayTemplate)
         return std::nullopt;
     PlistDictionary display;
@@ -104,21 +104,6 @@ std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& 
     state.set("Lookup", lookup);
     state.set("ExtraInfo", PlistDictionary());
     return display;
-}
-
-std::optional<PlistValue> C2KLogGenerator::loadTemplate(PlistDictionary& state)
-{
-    if (const PlistValue* loaded = state.find("Template"))
-        return *loaded;
-    const auto path = resources().path(templateName, "plist");
-    const auto contents = path ? resources().contents(*path) : std::nullopt;
-    const auto reading = contents ? readPropertyList(*contents) : PropertyListReading{};
-    if (!reading || !reading.value->dictionary()) {
-        log().error("Cannot load C2K template for display");
-        return std::nullopt;
-    }
-    state.set("Template", *reading.value);
-    return *reading.value;
 }
 
 void C2KLogGenerator::processTemplate(const PlistDictionary& displayTemplate,

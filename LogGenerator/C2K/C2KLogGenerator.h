@@ -31,8 +31,6 @@ class C2KLogGenerator : public OrbelLogGenerator
 
   private:
     using OrbelLogGenerator::OrbelLogGenerator;
-
-    std::optional<PlistValue> loadTemplate(PlistDictionary& state);
 };
 
 } // namespace ventrik

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 
+#include "LogGenerator/AssertionFailure.h"
 #include "PropertyList/PropertyListReader.h"
 
 #include <cstdio>
@@ -18,14 +19,19 @@ constexpr std::string_view sourceName = "LogGenerator/GSM/GSMLogGenerator";
 constexpr int unknownObjectLine = 78;
 constexpr int notDeserializedLine = 90;
 
-// Whatever was printed or logged so far must not be lost with the process.
 [[noreturn]] void failAssertion(const std::string& description, int line, SystemLog& log)
 {
     const auto text =
         fmt::format("Assertion failure: {} ({}, line {})", description, sourceName, line);
     log.error("{}", text);
+    throw AssertionFailure(text);
+}
+
+// Whatever was printed or logged so far must not be lost with the process.
+[[noreturn]] void endProcess(const AssertionFailure& failure)
+{
     std::fflush(nullptr);
-    std::fprintf(stderr, "%s\n", text.c_str());
+    std::fprintf(stderr, "%s\n", failure.what());
     std::fflush(stderr);
     std::abort();
 }
@@ -56,6 +62,17 @@ std::unique_ptr<GSMLogGenerator> GSMLogGenerator::generator(const GeneratorServi
 
 void GSMLogGenerator::updateState(PlistDictionary& state, ByteView data)
 {
+    try {
+        takeMessage(state, data);
+    } catch (const AssertionFailure& failure) {
+        if (assertions() == AssertionPolicy::Throw)
+            throw;
+        endProcess(failure);
+    }
+}
+
+void GSMLogGenerator::takeMessage(PlistDictionary& state, ByteView data)
+{
     const PropertyListReading reading = readPropertyList(data);
     if (!reading)
         failAssertion("Could not deserialize the object", notDeserializedLine, log());
@@ -69,7 +86,7 @@ void GSMLogGenerator::updateState(PlistDictionary& state, ByteView data)
 std::optional<PlistValue> GSMLogGenerator::generateLogUsingState(PlistDictionary& state)
 {
     claimDisplay(state, displayOwner);
-    updateHistoryInState(state, clock());
+    recordDisplay(state);
     const PlistValue* display = state.find("Display");
     return display ? std::optional(*display) : std::nullopt;
 }

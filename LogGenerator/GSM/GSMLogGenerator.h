@@ -9,7 +9,8 @@ namespace ventrik
 /// message is a property list of dictionaries, arrays and strings, and replaces the one before.
 ///
 /// The service is trusted to send nothing else. Any other message is an assertion failure: it is
-/// reported on standard error and in the system log, and ends the process.
+/// reported in the system log and on standard error and ends the process, or is thrown where the
+/// services ask for that.
 class GSMLogGenerator : public LogGenerator
 {
   public:
@@ -22,12 +23,15 @@ class GSMLogGenerator : public LogGenerator
 
     /// The value as it is displayed: without the first element of every array, and with the value
     /// of each one-entry dictionary in that dictionary's place. The top level is never replaced.
+    /// Throws AssertionFailure for a value that is not shown.
     static PlistValue processObject(const PlistValue& value, SystemLog& log);
     /// The single value of a one-entry dictionary, or none.
     std::optional<PlistValue> canCollapse(const PlistValue& value) const;
 
   private:
     using LogGenerator::LogGenerator;
+
+    void takeMessage(PlistDictionary& state, ByteView data);
 };
 
 } // namespace ventrik

@@ -46,8 +46,10 @@ int ETLDLFAddVersionReport(std::uint8_t* buffer, std::size_t capacity, std::size
                            const char* versionText, const char* executableName,
                            const char* buildDate, const ETLDLFTimeRecord* time)
 {
-    *written = 0;
-    if (capacity < etlDLFVersionReportSize)
+    std::size_t unwanted = 0;
+    std::size_t& count = written ? *written : unwanted;
+    count = 0;
+    if (!buffer || capacity < etlDLFVersionReportSize)
         return etlDLFBufferTooSmall;
 
     RecordWriter record({buffer, etlDLFVersionReportSize});
@@ -58,9 +60,11 @@ int ETLDLFAddVersionReport(std::uint8_t* buffer, std::size_t capacity, std::size
     record.text(20, 7, versionText);
     record.text(27, 16, executableName);
     record.text(67, 18, buildDate);
-    record.number(85, 4, time->secondsSince1970);
-    record.number(89, 2, static_cast<std::uint16_t>(time->zoneOffsetMinutes));
-    record.number(91, 1, time->daylightSaving);
-    *written = etlDLFVersionReportSize;
+    if (time) {
+        record.number(85, 4, time->secondsSince1970);
+        record.number(89, 2, static_cast<std::uint16_t>(time->zoneOffsetMinutes));
+        record.number(91, 1, time->daylightSaving);
+    }
+    count = etlDLFVersionReportSize;
     return etlDLFSuccess;
 }

@@ -16,7 +16,8 @@ inline constexpr int etlDLFBufferTooSmall = 3;
 
 /// Writes the version report record that begins a DLF file at the start of the buffer. Texts are
 /// cut to their fields (6, 15 and 17 characters). `written` is set to 161, or to 0 when the
-/// capacity is below that; the result is then `etlDLFBufferTooSmall`.
+/// capacity is below that; the result is then `etlDLFBufferTooSmall`. A null buffer has no
+/// capacity; what else is null is left out: the count, a text, the time.
 extern "C" [[gnu::visibility("default"), gnu::used]] int
 ETLDLFAddVersionReport(std::uint8_t* buffer, std::size_t capacity, std::size_t* written,
                        std::uint16_t firstVersion, std::uint16_t secondVersion,

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Orbel/BuildDate.h"
 #include "LogGenerator/Orbel/ETLDLF.h"
+#include "PropertyList/PropertyListReader.h"
 
 #include <fmt/format.h>
 
@@ -25,13 +26,60 @@ void OrbelLogGenerator::init()
 void OrbelLogGenerator::keepPacket(ByteView packet)
 {
     if (_binData)
-        _binData->insert(_binData->end(), packet.begin(), packet.end());
+        _binData->append(packet);
 }
 
 void OrbelLogGenerator::storePacketsInState(PlistDictionary& state)
 {
-    if (_binData)
-        state.set("DisplayState", std::exchange(*_binData, {}));
+    if (!_binData)
+        return;
+    if (_binData->droppedCount() > 0)
+        log().error("The period's raw packets are above {} MiB: the oldest {} are dropped",
+                    PeriodPackets::maximumSize >> 20, _binData->droppedCount());
+    state.set("DisplayState", _binData->take());
+}
+
+std::optional<PlistValue> OrbelLogGenerator::loadTemplate(PlistDictionary& state,
+                                                          const std::string& name,
+                                                          std::string_view failureLine)
+{
+    if (const PlistValue* loaded = state.find("Template"))
+        return *loaded;
+    auto loaded = _isTemplateBad ? std::nullopt : readTemplate(name);
+    if (loaded)
+        state.set("Template", *loaded);
+    else
+        log().error("{}", failureLine);
+    return loaded;
+}
+
+// One that is missing may come; looking for it costs little.
+std::optional<PlistValue> OrbelLogGenerator::readTemplate(const std::string& name)
+{
+    const auto path = resources().path(name, "plist");
+    if (!path) {
+        _templateFault = name.empty() ? "there is no display template for this technology"
+                                      : fmt::format("display template {}.plist is missing", name);
+        return std::nullopt;
+    }
+    _templatePath = *path;
+    _templateFault.clear();
+    const auto contents = resources().contents(*path);
+    const auto reading = contents ? readPropertyList(*contents) : PropertyListReading{};
+    if (!contents)
+        rejectTemplate("it cannot be read");
+    else if (!reading)
+        rejectTemplate(reading.error);
+    else if (!reading.value->dictionary())
+        rejectTemplate(
+            fmt::format("it is no dictionary but of type {}", reading.value->kindName()));
+    return _isTemplateBad ? std::nullopt : reading.value;
+}
+
+void OrbelLogGenerator::rejectTemplate(std::string_view reason)
+{
+    _isTemplateBad = true;
+    _templateFault = fmt::format("display template {}: {}", _templatePath, reason);
 }
 
 std::optional<Bytes> OrbelLogGenerator::makeVersionReport() const

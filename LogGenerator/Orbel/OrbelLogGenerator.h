@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Orbel/PeriodPackets.h"
 
 namespace ventrik
 {
@@ -16,6 +17,7 @@ class OrbelLogGenerator : public LogGenerator
 
     /// The history's entries and, when it could be made, one more with the DLF log.
     PlistValue getSaveContentsFromState(const PlistDictionary& state) const override;
+    std::string displayFault() const override { return _templateFault; }
 
   protected:
     using LogGenerator::LogGenerator;
@@ -27,11 +29,22 @@ class OrbelLogGenerator : public LogGenerator
     /// Moves the packets since the last call into the state as "DisplayState".
     void storePacketsInState(PlistDictionary& state);
 
+    /// The state's display template, from the resource of that name at first. None, with the line
+    /// at error level, when it cannot be used: one that is there and broken is read only once.
+    std::optional<PlistValue> loadTemplate(PlistDictionary& state, const std::string& name,
+                                           std::string_view failureLine);
+    /// From now on there is no display of this template.
+    void rejectTemplate(std::string_view reason);
+
   private:
     std::optional<Bytes> makeVersionReport() const;
+    std::optional<PlistValue> readTemplate(const std::string& name);
 
     // The packets since the last display; none in a generator that was never initialised.
-    std::optional<Bytes> _binData;
+    std::optional<PeriodPackets> _binData;
+    std::string _templatePath;   // where the template was read
+    std::string _templateFault;  // why it cannot be used, in one line; empty when it can
+    bool _isTemplateBad = false; // it was read; reading it again would give the same
 };
 
 } // namespace ventrik

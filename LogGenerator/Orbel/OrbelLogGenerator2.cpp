@@ -1,8 +1,8 @@
 #include "LogGenerator/Orbel/OrbelLogGenerator2.h"
 
 #include "LogGenerator/Orbel/UnparsableDataException.h"
-#include "PropertyList/PropertyListReader.h"
 
+#include <algorithm>
 #include <charconv>
 
 namespace ventrik
@@ -62,7 +62,7 @@ std::optional<PlistValue> OrbelLogGenerator2::generateLogUsingState(PlistDiction
 {
     auto display = getDisplayFromState(state);
     storePacketsInState(state);
-    updateHistoryInState(state, clock());
+    recordDisplay(state);
     return display;
 }
 
@@ -72,20 +72,15 @@ std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionar
     if (const PlistValue* display = state.find("Display")) {
         // After a restart the display of the generator before us is still in the state: values go
         // on where they stood, so our sections take over its containers.
-        if (display->dictionary() && !_boundDisplay.refersTo(*display->dictionary())) {
-            bindSections(*display);
+        const PlistValue* displayTemplate = state.find("Template");
+        if (displayTemplate && display->dictionary() &&
+            !_boundDisplay.refersTo(*display->dictionary())) {
+            bindSections(*displayTemplate, *display);
             _boundDisplay = WeakContainer(*display);
         }
         return *display;
     }
-
-    const auto displayTemplate = loadTemplate(state);
-    if (!displayTemplate)
-        return std::nullopt;
-    log().warning("Initialized class index: {}, Self: {}", fmt::ptr(cIndex.get()), fmt::ptr(this));
-    if (cIndex)
-        cIndex->status();
-    if (const auto display = processTemplate(*displayTemplate)) {
+    if (const auto display = buildDisplay(state)) {
         printDict(*display);
         _boundDisplay = WeakContainer(*display);
         state.set("Display", *display);
@@ -94,19 +89,20 @@ std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionar
     return std::nullopt;
 }
 
-std::optional<PlistValue> OrbelLogGenerator2::loadTemplate(PlistDictionary& state)
+std::optional<PlistValue> OrbelLogGenerator2::buildDisplay(PlistDictionary& state)
 {
-    if (const PlistValue* loaded = state.find("Template"))
-        return *loaded;
-    const auto path = resources().path(pListName, "plist");
-    const auto contents = path ? resources().contents(*path) : std::nullopt;
-    const auto reading = contents ? readPropertyList(*contents) : PropertyListReading{};
-    if (!reading || !reading.value->dictionary()) {
-        log().error("Cannot load template for display");
+    const auto displayTemplate = loadTemplate(state, pListName, "Cannot load template for display");
+    if (!displayTemplate || _cannotBuild)
         return std::nullopt;
+    log().warning("Initialized class index: {}, Self: {}", fmt::ptr(cIndex.get()), fmt::ptr(this));
+    if (cIndex)
+        cIndex->status();
+    auto display = processTemplate(*displayTemplate);
+    if (!display) {
+        _cannotBuild = true;
+        rejectTemplate("it holds a value that is neither text nor array nor dictionary");
     }
-    state.set("Template", *reading.value);
-    return *reading.value;
+    return display;
 }
 
 std::optional<PlistValue> OrbelLogGenerator2::processTemplate(const PlistValue& value)
@@ -145,15 +141,20 @@ void OrbelLogGenerator2::bindSection(std::string_view name, const PlistValue& co
         section->updateSectionRef(container);
 }
 
-void OrbelLogGenerator2::bindSections(const PlistValue& value)
+void OrbelLogGenerator2::bindSections(const PlistValue& displayTemplate, const PlistValue& display)
 {
-    if (const PlistArray* elements = value.array())
-        for (const PlistValue& element : *elements)
-            bindSections(element);
-    if (const PlistDictionary* entries = value.dictionary())
-        for (const auto& [key, entry] : *entries) {
-            bindSections(entry);
-            bindSection(key, entry);
+    if (displayTemplate.array() && display.array()) {
+        const PlistArray& elements = *display.array();
+        const std::size_t count = std::min(elements.size(), displayTemplate.array()->size());
+        for (std::size_t i = 0; i < count; ++i)
+            bindSections((*displayTemplate.array())[i], elements[i]);
+    }
+    if (!displayTemplate.dictionary() || !display.dictionary())
+        return;
+    for (const auto& [key, entry] : *displayTemplate.dictionary())
+        if (const PlistValue* displayed = display.dictionary()->find(key)) {
+            bindSections(entry, *displayed);
+            bindSection(key, *displayed);
         }
 }
 

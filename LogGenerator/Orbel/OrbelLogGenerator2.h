@@ -41,14 +41,17 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
 
   private:
     static void deliver(const LogPacket& packet, std::uint32_t logCode, Base& section);
-    std::optional<PlistValue> loadTemplate(PlistDictionary& state);
+    std::optional<PlistValue> buildDisplay(PlistDictionary& state);
     void bindSection(std::string_view name, const PlistValue& container);
-    void bindSections(const PlistValue& value);
+    /// Binds the sections that the template names, and nothing that a record brought into the
+    /// display under such a name.
+    void bindSections(const PlistValue& displayTemplate, const PlistValue& display);
 
     std::string pListName;
     std::shared_ptr<ClassIndex> cIndex;
     // The display that our sections are bound to.
     WeakContainer _boundDisplay;
+    bool _cannotBuild = false; // the template holds what no template may hold
 };
 
 } // namespace ventrik

@@ -56,6 +56,21 @@ TEST(VersionReport, HasItsLengthCodeAndVersions)
               (Bytes{0xA1, 0x00, 0xFD, 0x1F, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 1, 0, 1, 0}));
 }
 
+TEST(VersionReport, LeavesOutWhatIsNull)
+{
+    Bytes buffer(161, 0xEE);
+    EXPECT_EQ(ETLDLFAddVersionReport(buffer.data(), buffer.size(), nullptr, 1, 1, nullptr, nullptr,
+                                     nullptr, nullptr),
+              etlDLFSuccess);
+    EXPECT_EQ(textIn(buffer, 20, 141), std::string(141, '\0'));
+    std::size_t written = 7;
+    EXPECT_EQ(ETLDLFAddVersionReport(nullptr, 161, &written, 1, 1, "a", "b", "c", &someTime),
+              etlDLFBufferTooSmall);
+    EXPECT_EQ(written, 0U);
+    EXPECT_EQ(ETLDLFAddVersionReport(nullptr, 0, nullptr, 1, 1, "a", "b", "c", &someTime),
+              etlDLFBufferTooSmall);
+}
+
 TEST(VersionReport, FillsShortTextsWithZeros)
 {
     const Bytes record = versionReport("abc", "def", "ghi");

@@ -1,3 +1,4 @@
+#include "LogGenerator/AssertionFailure.h"
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "Platform/TelephonyConstants.h"
 #include "PropertyList/PropertyListWriter.h"
@@ -188,12 +189,10 @@ TEST_F(GSMLogGeneratorTest, GeneratingRecordsTheDisplayAndGivesIt)
                 ElementsAre("DisplayState", "Display", "ExtraInfo", "Date", "Description"));
 }
 
-TEST_F(GSMLogGeneratorTest, WithoutAMessageThereIsNoDisplay)
+TEST_F(GSMLogGeneratorTest, WithoutAMessageThereIsNoDisplayAndNothingToRecord)
 {
-    EXPECT_EQ(generator->generateLogUsingState(state), std::nullopt);
-    const PlistArray& history = *state.find("History")->array();
-    ASSERT_EQ(history.size(), 1U);
-    EXPECT_TRUE(history[0].dictionary()->empty());
+    EXPECT_FALSE(generator->generateLogUsingState(state));
+    EXPECT_FALSE(state.contains("History"));
 }
 
 TEST_F(GSMLogGeneratorTest, SavesANewArrayWithTheHistoryAlone)
@@ -258,6 +257,28 @@ TEST_F(GSMLogGeneratorDeathTest, TheSystemLogIsToldBeforeStandardError)
                 "log 3 Assertion failure: Could not deserialize the object "
                 ".LogGenerator/GSM/GSMLogGenerator, line 90.\n"
                 "Assertion failure: Could not deserialize the object");
+}
+
+TEST_F(GSMLogGeneratorTest, ThrowsItsAssertionFailuresWhereThatIsAskedFor)
+{
+    GeneratorServices throwing = services();
+    throwing.assertions = AssertionPolicy::Throw;
+    const auto thrower = GSMLogGenerator::generator(throwing);
+    thrower->updateState(state, message(PlistDictionary{{"A", "a"}}));
+    EXPECT_THROW(thrower->updateState(state, message(PlistDictionary{{"A", 1}})), AssertionFailure);
+    EXPECT_THROW(thrower->updateState(state, Bytes{}), AssertionFailure);
+    EXPECT_EQ(platform.log.texts(3).size(), 2U);
+    EXPECT_EQ(display(), PlistValue(PlistDictionary{{"A", "a"}}));
+}
+
+TEST_F(GSMLogGeneratorTest, ADisplayOfAnotherTechnologyThatMakesWayLeavesNoBrokenHistoryEntry)
+{
+    state.set("DisplayOwner", "LTE");
+    state.set("DisplayState", Bytes{1});
+    state.set("Display", PlistDictionary{{"RSRP", "-100"}});
+    state.set("ExtraInfo", PlistDictionary());
+    EXPECT_FALSE(generator->generateLogUsingState(state));
+    EXPECT_FALSE(state.contains("History"));
 }
 
 } // namespace ventrik

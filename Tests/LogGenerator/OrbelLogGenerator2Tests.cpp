@@ -230,6 +230,51 @@ TEST_F(OrbelLogGenerator2Test, AMissingTemplateIsReportedAndTriedAgain)
     setTemplate("<dict><key>First</key><dict/></dict>");
     feed(PacketBuilder(0x1000).build());
     EXPECT_EQ(displayed({"First", "Size"}), "13");
+    EXPECT_EQ(generator->displayFault(), "");
+}
+
+TEST_F(OrbelLogGenerator2Test, ATemplateThatCannotBeUsedIsNamedWithTheReason)
+{
+    EXPECT_EQ(generator->displayFault(), "");
+    platform.resources.remove("/res/Notes.plist");
+    feed(PacketBuilder(0x1000).build());
+    EXPECT_EQ(generator->displayFault(), "display template Notes.plist is missing");
+    setTemplate("<array/>");
+    feed(PacketBuilder(0x1000).build());
+    EXPECT_EQ(generator->displayFault(),
+              "display template /res/Notes.plist: it is no dictionary but of type array");
+}
+
+TEST_F(OrbelLogGenerator2Test, ABrokenTemplateIsReadOnceAndReportedEachTime)
+{
+    platform.resources.add("/res/Notes.plist", "no property list");
+    feed(PacketBuilder(0x1000).build());
+    EXPECT_THAT(generator->displayFault(),
+                testing::StartsWith("display template /res/Notes.plist: "));
+    setTemplate("<dict/>");
+    feed(PacketBuilder(0x1000).build());
+    EXPECT_FALSE(state.contains("Display"));
+    EXPECT_EQ(platform.log.count("Cannot load template for display"), 2U);
+    NotingGenerator(services(), notes).updateState(state, PacketBuilder(0x1000).build());
+    EXPECT_TRUE(state.contains("Display"));
+}
+
+TEST_F(OrbelLogGenerator2Test, ATemplateThatHoldsANumberIsProcessedOnce)
+{
+    setTemplate("<dict><key>N</key><integer>1</integer></dict>");
+    feed(PacketBuilder(0x1000).build());
+    feed(PacketBuilder(0x1000).build());
+    EXPECT_EQ(platform.log.count("Received an object of unknown type"), 1U);
+    EXPECT_EQ(generator->displayFault(), "display template /res/Notes.plist: it holds a value that "
+                                         "is neither text nor array nor dictionary");
+}
+
+TEST_F(OrbelLogGenerator2Test, WithoutADisplayNothingIsAddedToTheHistory)
+{
+    platform.resources.remove("/res/Notes.plist");
+    feed(PacketBuilder(0x1000).build());
+    generator->generateLogUsingState(state);
+    EXPECT_FALSE(state.contains("History"));
 }
 
 TEST_F(OrbelLogGenerator2Test, ATemplateThatIsNoDictionaryCannotBeLoaded)
@@ -283,6 +328,47 @@ TEST_F(OrbelLogGenerator2Test, AGeneratorAfterARestartGoesOnInTheSameDisplay)
     feed(PacketBuilder(0x1000).size(30).build());
     EXPECT_TRUE(before.dictionary()->isSameContainer(*state.find("Display")->dictionary()));
     EXPECT_EQ(displayed({"Group", "First", "Size"}), "30");
+}
+
+TEST_F(OrbelLogGenerator2Test, ARowThatBearsASectionsNameDoesNotGetThatSectionAfterARestart)
+{
+    platform.resources.add("/res/LTE.plist",
+                           plistXml("<dict><key>SIM Info</key><dict><key>EF-ICCID</key>"
+                                    "<string>-</string></dict>"
+                                    "<key>PDP Context Info</key><array/></dict>"));
+    const PlistArray rows{PlistDictionary{{"SIM Info", PlistDictionary{{"a", "b"}}}}};
+    LTELogGenerator::generator(services())
+        ->updateState(state, propertyListPacket(0xFF0002, rows.copy()));
+    const auto next = LTELogGenerator::generator(services());
+    next->updateState(state,
+                      propertyListPacket(0xFF0000, PlistDictionary{{"kSimFile_ICCID", "8"}}));
+    EXPECT_EQ(displayed({"SIM Info", "EF-ICCID"}), "8");
+    EXPECT_EQ(*state.find("Display")->dictionary()->find("PDP Context Info"), PlistValue(rows));
+}
+
+TEST_F(OrbelLogGenerator2Test, AnArrayOfTheTemplateIsBoundElementByElementAfterARestart)
+{
+    setTemplate("<dict><key>L</key><array><dict><key>First</key><dict/></dict></array></dict>");
+    feed(PacketBuilder(0x1000).size(20).build());
+    generator = std::make_unique<NotingGenerator>(services(), notes);
+    feed(PacketBuilder(0x1000).size(30).build());
+    const PlistArray& list = *state.find("Display")->dictionary()->find("L")->array();
+    EXPECT_EQ(textAt(list[0], {"First", "Size"}), "30");
+}
+
+TEST_F(OrbelLogGenerator2Test, AFloodKeepsTheNewestPacketsOfThePeriodAndSaysSoOnce)
+{
+    for (int i = 0; i < 70; ++i)
+        feed(PacketBuilder(0x1000).size(std::size_t{1} << 20).build());
+    generator->generateLogUsingState(state);
+    EXPECT_EQ(state.find("DisplayState")->data()->size(), std::size_t{64} << 20);
+    EXPECT_EQ(platform.log.count("The period's raw packets are above 64 MiB: the oldest 6 are "
+                                 "dropped"),
+              1U);
+    EXPECT_EQ(displayed({"Group", "First", "Size"}), "1048576");
+    platform.log.clear();
+    generator->generateLogUsingState(state);
+    EXPECT_TRUE(platform.log.texts(3).empty());
 }
 
 TEST_F(OrbelLogGenerator2Test, ADisplayOfAnotherTechnologyMakesWayAndTheHistoryStays)

@@ -1,8 +1,12 @@
+#include "LogGenerator/Orbel/ArrayLock.h"
 #include "Model/TreePrinter.h"
 #include "Model/VentrikModelNode.h"
 
+#include <thread>
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <malloc.h>
 
 namespace ventrik
 {
@@ -20,12 +24,10 @@ class TreeTest : public testing::Test
         const std::string text = printTree(*root);
         return text.substr(text.find('\n') + 1);
     }
-    std::vector<std::string> paths()
+    std::string nameAt(std::string_view path) const
     {
-        std::vector<std::string> result;
-        for (const auto& [path, node] : index)
-            result.push_back(path);
-        return result;
+        const auto node = index.find(path);
+        return node ? node->displayName() : "none";
     }
 
     PathIndex index;
@@ -38,13 +40,13 @@ TEST_F(TreeTest, TheRootIsNamedVentrikAtTheRootPath)
 {
     treeOf(PlistDictionary());
     EXPECT_EQ(root->displayName(), "Ventrik");
-    EXPECT_EQ(index.at("/"), root);
+    EXPECT_EQ(index.find("/"), root);
 }
 
 TEST_F(TreeTest, AStringIsALeaf)
 {
     treeOf(PlistDictionary{{"RSSI", "-70 dBm"}});
-    const auto leaf = index.at("/RSSI");
+    const auto leaf = index.find("/RSSI");
     EXPECT_EQ(*leaf->value(), "-70 dBm");
     EXPECT_EQ(leaf->childNodes(), nullptr);
 }
@@ -53,8 +55,9 @@ TEST_F(TreeTest, DictionariesNestWithTheirPathsJoined)
 {
     EXPECT_EQ(treeOf(PlistDictionary{{"Cell", PlistDictionary{{"RSSI", "-70"}}}}),
               "  Cell\n    RSSI: -70\n");
-    EXPECT_THAT(paths(), testing::UnorderedElementsAre("/", "/Cell", "/Cell/RSSI"));
-    EXPECT_EQ(index.at("/Cell")->value(), nullptr);
+    EXPECT_EQ(nameAt("/Cell"), "Cell");
+    EXPECT_EQ(nameAt("/Cell/RSSI"), "RSSI");
+    EXPECT_EQ(index.find("/Cell")->value(), nullptr);
 }
 
 TEST_F(TreeTest, AnUnsortedDictionaryKeepsItsOwnOrderAndItsKeys)
@@ -89,7 +92,7 @@ TEST_F(TreeTest, OfTwoSortedKeysWithOneLabelTheIndexKeepsTheLater)
 {
     EXPECT_EQ(treeOf(PlistDictionary{{"2;X", "two"}, {"1;X", "one"}, {"_sorted", ""}}),
               "  X: one\n  X: two\n");
-    EXPECT_EQ(*index.at("/X")->value(), "two");
+    EXPECT_EQ(*index.find("/X")->value(), "two");
 }
 
 TEST_F(TreeTest, EmptyContainersAreInnerNodesWithoutChildren)
@@ -97,8 +100,8 @@ TEST_F(TreeTest, EmptyContainersAreInnerNodesWithoutChildren)
     treeOf(PlistDictionary{
         {"D", PlistDictionary()}, {"A", PlistArray()}, {"S", PlistDictionary{{"_sorted", ""}}}});
     for (const char* path : {"/D", "/A", "/S"}) {
-        ASSERT_NE(index.at(path)->childNodes(), nullptr) << path;
-        EXPECT_TRUE(index.at(path)->childNodes()->empty()) << path;
+        ASSERT_NE(index.find(path)->childNodes(), nullptr) << path;
+        EXPECT_TRUE(index.find(path)->childNodes()->empty()) << path;
     }
 }
 
@@ -106,7 +109,7 @@ TEST_F(TreeTest, ArrayElementsAreNamedByTheirNumber)
 {
     EXPECT_EQ(treeOf(PlistDictionary{{"L", PlistArray{"a", PlistDictionary{{"k", "v"}}}}}),
               "  L\n    0: a\n    1\n      k: v\n");
-    EXPECT_EQ(*index.at("/L/1/k")->value(), "v");
+    EXPECT_EQ(*index.find("/L/1/k")->value(), "v");
 }
 
 TEST_F(TreeTest, AnythingElseIsUnknown)
@@ -123,19 +126,19 @@ TEST_F(TreeTest, NoObjectGivesARootLeafUnknown)
     EXPECT_EQ(root->displayName(), "Ventrik");
     EXPECT_EQ(*root->value(), "(unknown)");
     EXPECT_EQ(root->childNodes(), nullptr);
-    EXPECT_THAT(paths(), testing::ElementsAre("/"));
+    EXPECT_EQ(index.find("/"), root);
 }
 
 TEST_F(TreeTest, ANameWithASlashIsJoinedAsItStands)
 {
     treeOf(PlistDictionary{{"PS/LOCI", PlistDictionary{{"x", "1"}}}});
-    EXPECT_TRUE(index.contains("/PS/LOCI/x"));
+    EXPECT_TRUE(index.find("/PS/LOCI/x"));
 }
 
 TEST_F(TreeTest, AnEmptyNameLeavesTheRootAtItsPath)
 {
     treeOf(PlistDictionary{{"", "v"}});
-    EXPECT_EQ(index.at("/"), root);
+    EXPECT_EQ(index.find("/"), root);
 }
 
 TEST(PathJoining, PutsExactlyOneSlashBetween)
@@ -144,6 +147,81 @@ TEST(PathJoining, PutsExactlyOneSlashBetween)
     EXPECT_EQ(pathJoining("/Cell", "RSSI"), "/Cell/RSSI");
     EXPECT_EQ(pathJoining("/Cell/", "/RSSI"), "/Cell/RSSI");
     EXPECT_EQ(pathJoining("/Cell", ""), "/Cell");
+}
+
+// The path of a child has exactly one "/" between the two, whatever slashes the names hold.
+TEST_F(TreeTest, NodesAreFoundByTheirJoinedPathsWhateverSlashesTheNamesHold)
+{
+    struct Case {
+        std::string outer;
+        std::string inner;
+        std::string path;
+    };
+    const std::vector<Case> cases{
+        {"a", "b", "/a/b"},       {"a/", "b", "/a/b"},      {"a//", "/b", "/a/b"},
+        {"a", "b/", "/a/b/"},     {"a", "b//c", "/a/b//c"}, {"a//b", "c", "/a//b/c"},
+        {"/", "b", "/b"},         {"", "b", "/b"},          {"a/b", "c", "/a/b/c"},
+        {"a", "b///", "/a/b///"},
+    };
+    for (const Case& test : cases) {
+        PathIndex fresh;
+        const PlistValue object = PlistDictionary{{test.outer, PlistDictionary{{test.inner, "v"}}}};
+        VentrikModelNode::makeTreeFromObject(&object, fresh);
+        const auto node = fresh.find(test.path);
+        ASSERT_TRUE(node) << test.path;
+        EXPECT_EQ(node->displayName(), test.inner) << test.path;
+        EXPECT_EQ(pathJoining(pathJoining("/", test.outer), test.inner), test.path);
+    }
+}
+
+TEST_F(TreeTest, ANodeWithoutANameLeavesItsParentAtTheirPath)
+{
+    treeOf(PlistDictionary{{"a", PlistDictionary{{"", "inner"}, {"/", "inner"}}}});
+    EXPECT_EQ(nameAt("/a"), "a");
+}
+
+TEST_F(TreeTest, ADeeperLookingNameAndADeeperNodeAreAtOnePathWhereTheLaterStays)
+{
+    treeOf(PlistDictionary{{"a", PlistDictionary{{"b", "first"}}}, {"a/b", "second"}});
+    EXPECT_EQ(*index.find("/a/b")->value(), "second");
+}
+
+TEST_F(TreeTest, NothingIsFoundWhereThereIsNoNode)
+{
+    treeOf(PlistDictionary{{"a/b", PlistDictionary{{"c", "v"}}}});
+    for (const char* path : {"", "a", "/a", "/a/b/", "/a/b/c/", "//a/b", "/a/b/d", "/b"})
+        EXPECT_EQ(index.find(path), nullptr) << path;
+}
+
+// Each of the children's paths is 100,000 characters long.
+TEST_F(TreeTest, ALongNameIsKeptOnceForAllItsChildren)
+{
+    PlistArray rows;
+    for (int i = 0; i < 2000; ++i)
+        rows.append("v");
+    const std::string name(100'000, 'n');
+    const auto before = mallinfo2().uordblks;
+    treeOf(PlistDictionary{{name, rows}});
+    const auto grown = mallinfo2().uordblks - before;
+    EXPECT_LT(grown, std::size_t{2} << 20);
+    EXPECT_EQ(*index.find("/" + name + "/1999")->value(), "v");
+}
+
+// Another thread gets the lock only when no level of it is left behind.
+TEST_F(TreeTest, ArraysInArraysLeaveNoLevelOfTheLockBehind)
+{
+    const auto isFree = [] {
+        bool result = false;
+        std::thread([&] {
+            result = ArrayLock::lock().try_lock();
+            if (result)
+                ArrayLock::lock().unlock();
+        }).join();
+        return result;
+    };
+    ASSERT_TRUE(isFree());
+    treeOf(PlistArray{PlistArray{PlistArray{"a"}, "b"}, PlistArray{"c"}});
+    EXPECT_TRUE(isFree());
 }
 
 } // namespace ventrik

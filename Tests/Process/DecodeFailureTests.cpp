@@ -1,7 +1,8 @@
 #include "Tests/Process/CellMonitorCaptures.h"
 #include "Tests/Process/DecodeFixture.h"
+#include "Tests/Process/LargePropertyLists.h"
 
-#include <csignal>
+#include <filesystem>
 
 namespace ventrik
 {
@@ -26,6 +27,17 @@ class DecodeFailure : public DecodeFixture
                                       .record(captureStart, 1, antennaMessage(4));
         return Bytes(capture.bytes().begin(), capture.bytes().end() - 5);
     }
+    /// With the display templates that are shipped, and that much address space, in KiB.
+    Result decodeWithin(int limit, const Arguments& arguments) const
+    {
+        Arguments all{"-c", "ulimit -v \"$1\"; shift; exec \"$@\"", "sh", std::to_string(limit),
+                      VENTRIK_PROGRAMS "/ventrik-decode"};
+        all.insert(all.end(), arguments.begin(), arguments.end());
+        Program program("/bin/sh", all, environment);
+        return finish(program);
+    }
+
+    static constexpr int addressSpace = 150'000;
 };
 
 } // namespace
@@ -100,22 +112,87 @@ TEST_F(DecodeFailure, OfAnUnknownLinkTypeIsWrongUsage)
 }
 
 // The cell monitor's service is trusted to send texts only.
-TEST_F(DecodeFailure, OfACellMonitorMessageEndsTheProcessBehindWhatWasDecoded)
+TEST_F(DecodeFailure, OfACellMonitorMessageLeavesWhatWasDecodedBefore)
 {
-    const PcapBytes capture = PcapBytes(cellMonitorLinkType)
-                                  .record(captureStart, 0, cellMonitorMessage("<string>a</string>"))
-                                  .record(captureStart, 1, cellMonitorMessage("<real>7</real>"));
+    const PcapBytes capture =
+        PcapBytes(cellMonitorLinkType)
+            .record(captureStart, 0, cellMonitorMessage("<string>a</string>"))
+            .record(captureStart, 1, cellMonitorMessage("<real>7</real>"))
+            .record(captureStart, 2, cellMonitorMessage("<string>b</string>"));
+    const std::string file = writeFile("cells.pcap", capture.bytes());
     const std::string log = path("system.log");
-    const Result result = decode(capture, {"--format", "jsonl", "--system-log", log});
-    EXPECT_EQ(result.status, 128 + SIGABRT);
-    EXPECT_EQ(result.output, R"({"packet": 0, "time": 1000000000.000000, "display": )"
-                             R"({"Cell": "a"}})"
-                             "\n");
+    const std::string snapshot = path("snapshot");
     const std::string line = "Assertion failure: Unknown object of type real encountered "
                              "(LogGenerator/GSM/GSMLogGenerator, line 78)";
-    EXPECT_EQ(linesOf(result.errors).back(), line);
-    EXPECT_EQ(linesOf(readFile(log)).back(), "3\t" + line);
+    const std::vector<std::pair<std::string, std::string>> results{
+        {"jsonl", "{\"packet\": 0, \"time\": 1000000000.000000, \"display\": {\"Cell\": \"a\"}}\n"},
+        {"json", "{\"technology\": \"ifx\", \"packets\": 1, \"display\": {\"Cell\": \"a\"}}\n"},
+        {"text", "Ventrik\n  Cell: a\n"}};
+    for (const auto& [format, expected] : results) {
+        const Result result = decode(
+            Arguments{"--format", format, "--system-log", log, "--snapshot", snapshot, file});
+        EXPECT_EQ(result.status, 1);
+        EXPECT_EQ(result.output, expected);
+        EXPECT_THAT(result.complaints,
+                    ElementsAre("ventrik-decode: " + file + ": message 1: " + line));
+        EXPECT_EQ(linesOf(readFile(log)).back(), "3\t" + line);
+        EXPECT_THAT(readFile(snapshot), HasSubstr("<string>a</string>"));
+    }
 }
+
+TEST_F(DecodeFailure, OfATemplateThatIsMissingOrBrokenNamesIt)
+{
+    const std::string file = writeFile("lte.pcap", lteCapture()
+                                                       .record(captureStart, 0, antennaMessage(2))
+                                                       .record(captureStart, 1, antennaMessage(2))
+                                                       .bytes());
+    const std::string directory = path("templates");
+    std::filesystem::create_directory(directory);
+    const auto complaint = [&] {
+        const Result result = decode(Arguments{"--resources", directory, file});
+        EXPECT_EQ(result.status, 1);
+        EXPECT_EQ(result.output, "Ventrik: (unknown)\n");
+        EXPECT_EQ(result.complaints.size(), 1U) << result.errors;
+        return result.complaints.empty() ? std::string() : result.complaints.front();
+    };
+    EXPECT_EQ(complaint(), "ventrik-decode: display template LTE.plist is missing");
+    const std::string bad = writeFile("templates/LTE.plist", "<plist><array/></plist>");
+    EXPECT_EQ(complaint(), "ventrik-decode: display template " + bad +
+                               ": it is no dictionary but of type array");
+    writeFile("templates/LTE.plist", "no property list");
+    EXPECT_THAT(complaint(), StartsWith("ventrik-decode: display template " + bad + ": "));
+    writeFile("templates/LTE.plist", "<plist><dict><key>a</key><real>1</real></dict></plist>");
+    EXPECT_EQ(complaint(), "ventrik-decode: display template " + bad +
+                               ": it holds a value that is neither text nor array nor "
+                               "dictionary");
+}
+
+// The sanitizers need more address space than any limit leaves.
+#if !defined(__SANITIZE_ADDRESS__)
+TEST_F(DecodeFailure, ForWantOfMemoryLeavesWhatWasDecodedBefore)
+{
+    const PcapBytes capture = lteCapture()
+                                  .record(captureStart, 0, antennaMessage(2))
+                                  .record(captureStart, 1, pdpMessage(oneTextManyTimes()));
+    const std::string file = writeFile("large.pcap", capture.bytes());
+    const Result result = decodeWithin(addressSpace, {file});
+    EXPECT_EQ(result.status, 1) << result.errors;
+    EXPECT_THAT(result.complaints,
+                ElementsAre("ventrik-decode: " + file + ": message 1: out of memory"));
+    EXPECT_THAT(result.output, HasSubstr("Num Tx Antennas: 2\n"));
+}
+
+// The paths alone would take 5 GB.
+TEST_F(DecodeFailure, DoesNotComeOfALongNameOverManyValues)
+{
+    const PcapBytes capture =
+        lteCapture().record(captureStart, 0, pdpMessage(longNameOverManyValues()));
+    const std::string file = writeFile("long.pcap", capture.bytes());
+    const Result result = decodeWithin(addressSpace, {file});
+    EXPECT_EQ(result.status, 0) << result.errors;
+    EXPECT_THAT(result.output, HasSubstr("49999: v\n"));
+}
+#endif
 
 TEST_F(DecodeFailure, ToWriteTheSystemLogOrTheSnapshotIsTold)
 {

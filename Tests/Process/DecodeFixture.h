@@ -37,7 +37,7 @@ class DecodeFixture : public ProcessFixture
     /// A cell info and, a microsecond later, an antenna count.
     static PcapBytes cellCapture();
 
-  private:
+    /// What came of a program when it has ended.
     Result finish(Program& program) const;
 };
 

@@ -128,7 +128,7 @@ TEST_F(DecodeResult, IsNullWithoutATemplate)
 {
     std::remove(path("resources/LTE.plist").c_str());
     const Result result = decode(cellCapture(), {"--format", "jsonl"});
-    EXPECT_EQ(result.status, 0) << result.errors;
+    EXPECT_EQ(result.status, 1) << result.errors;
     EXPECT_EQ(result.output, R"({"packet": 0, "time": 1000000000.000000, "display": null})"
                              "\n"
                              R"({"packet": 1, "time": 1000000000.000001, "display": null})"

@@ -139,6 +139,18 @@ TEST_F(TelephonyServiceTest, RefusesAClientWhoseLocalPortIsNotThere)
     EXPECT_EQ(errorCode(openChannel("nobody")), ENOENT);
 }
 
+TEST_F(TelephonyServiceTest, RefusesAClientThatNamesAPortOfTheService)
+{
+    const auto channel = remotePort(openChannel("client"));
+    for (const std::string& name : {std::string(telephonyServicePortName), channel}) {
+        fake.ports.listen(name);
+        EXPECT_EQ(errorCode(openChannel(name)), EINVAL);
+        EXPECT_TRUE(fake.log.contains("Refused a log channel for " + name +
+                                      ": that is a port of the service"));
+    }
+    EXPECT_EQ(service->channelCount(), 1U);
+}
+
 TEST_F(TelephonyServiceTest, RefusesRequestsItDoesNotUnderstand)
 {
     EXPECT_EQ(errorCode(ask(telephonyServicePortName, Bytes{'x'})), EINVAL);

@@ -120,12 +120,33 @@ TEST_F(OfflineDecoderTest, TheEndWithoutAMessageGeneratesNothing)
     EXPECT_EQ(decoder.display(), nullptr);
 }
 
-TEST_F(OfflineDecoderTest, TimesThatRunBackwardTickNothing)
+TEST_F(OfflineDecoderTest, TimesThatRunBackByATickAtMostTickNothing)
 {
     take(10s);
-    take(5s);
+    take(8s);
     take(12s);
     EXPECT_TRUE(generator.notes.empty());
+}
+
+TEST_F(OfflineDecoderTest, AMessageMoreThanATickEarlierRunsATickAndTicksCountFromIt)
+{
+    take(10s);
+    take(11s);
+    take(8999ms);
+    EXPECT_THAT(generator.notes, ElementsAre("11000:2"));
+    take(10999ms);
+    EXPECT_EQ(generator.notes.size(), 1U);
+    take(11s);
+    EXPECT_THAT(generator.notes, ElementsAre("11000:2", "10999:4"));
+}
+
+TEST_F(OfflineDecoderTest, AfterOneMessageFarAheadTicksComeAsBefore)
+{
+    take(10s);
+    take(100'000s);
+    take(11s);
+    take(14s);
+    EXPECT_THAT(generator.notes, ElementsAre("12000:1", "100000000:2", "13000:3"));
 }
 
 TEST_F(OfflineDecoderTest, TheDisplayStandsAsAfterTheLastMessage)

@@ -1,0 +1,89 @@
+#include "Model/PathIndex.h"
+
+#include <algorithm>
+#include <functional>
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+void removeLeadingSlashes(std::string_view& text)
+{
+    text.remove_prefix(std::min(text.find_first_not_of('/'), text.size()));
+}
+
+// Takes the part up to the next slash off the text, and the slash; false when nothing is left.
+bool takePart(std::string_view& rest, std::string_view& part)
+{
+    if (!rest.data())
+        return false;
+    const auto slash = rest.find('/');
+    part = rest.substr(0, slash);
+    rest = slash == rest.npos ? std::string_view() : rest.substr(slash + 1);
+    return true;
+}
+
+} // namespace
+
+std::size_t PathIndex::KeyHash::operator()(const Key& key) const
+{
+    constexpr std::size_t spread = 0x9E3779B97F4A7C15;
+    return std::hash<std::string_view>()(key.part) ^ std::hash<const Place*>()(key.before) * spread;
+}
+
+PathIndex::Place& PathIndex::join(Place& parent, std::string_view name)
+{
+    Place* place = &parent;
+    while (place->before && place->part.empty()) // slashes at the path's end
+        place = place->before;
+    removeLeadingSlashes(name);
+    if (name.empty())
+        return *place;
+    for (std::string_view part; takePart(name, part);)
+        place = &step(*place, part);
+    return *place;
+}
+
+PathIndex::Place& PathIndex::step(Place& before, std::string_view part)
+{
+    if (const auto found = _steps.find({&before, part}); found != _steps.end())
+        return *found->second;
+    Place& made = _places.emplace_back();
+    made.before = &before;
+    made.part = part;
+    _steps.emplace(Key{&before, made.part}, &made);
+    return made;
+}
+
+ModelNodePointer PathIndex::find(std::string_view path) const
+{
+    if (path == "/")
+        return _root.node;
+    if (!path.starts_with('/'))
+        return nullptr;
+    path.remove_prefix(1);
+    const Place* place = &_root;
+    for (std::string_view part; takePart(path, part);) {
+        const auto found = _steps.find({place, part});
+        if (found == _steps.end())
+            return nullptr;
+        place = found->second;
+    }
+    return place->node;
+}
+
+std::string pathJoining(std::string_view path, std::string_view name)
+{
+    while (path.ends_with('/'))
+        path.remove_suffix(1);
+    removeLeadingSlashes(name);
+    if (name.empty())
+        return path.empty() ? "/" : std::string(path);
+    return fmt::format("{}/{}", path, name);
+}
+
+} // namespace ventrik

@@ -57,6 +57,7 @@ class HeadlessViewer
     bool comesToShow(const std::string& path);
     PlistArray saveContents() const;
 
+    const VentrikModel& model() const { return _model; }
     TimedSystemLog& log() { return _log; }
     /// Error lines with their addresses replaced by %p.
     std::vector<std::string> errors() const;

@@ -61,17 +61,24 @@ bool CaptureWriter::write(Clock::TimePoint time, ByteView message)
     // The library's dump function takes its dumper as a byte pointer, so that it can serve as a
     // packet callback.
     pcap_dump(static_cast<u_char*>(static_cast<void*>(_dumper.get())), &header, message.data());
-    return true;
+    noteError();
+    return _error == 0;
+}
+
+// The library tells of a failed write only by the stream's mark.
+void CaptureWriter::noteError()
+{
+    if (_error == 0 && std::ferror(pcap_dump_file(_dumper.get())))
+        _error = errno;
 }
 
 bool CaptureWriter::commit(std::string& error)
 {
-    errno = 0;
-    const bool isFlushed =
-        pcap_dump_flush(_dumper.get()) == 0 && std::ferror(pcap_dump_file(_dumper.get())) == 0;
-    if (isFlushed)
+    if (pcap_dump_flush(_dumper.get()) != 0 && _error == 0)
+        _error = errno;
+    if (_error == 0)
         return _file.commit(error);
-    error = fmt::format("{}: {}", _file.path(), std::strerror(errno == 0 ? EIO : errno));
+    error = fmt::format("{}: {}", _file.path(), std::strerror(_error));
     return false;
 }
 

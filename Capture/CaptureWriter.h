@@ -28,7 +28,8 @@ class CaptureWriter
     static std::optional<CaptureWriter>
     create(const std::string& path, const CaptureTechnology& technology, std::string& error);
 
-    /// False, with nothing written, for a message above `maximumMessageSize`.
+    /// False, with nothing written, for a message above `maximumMessageSize`; false also when the
+    /// file cannot be written, which `commit` explains.
     bool write(Clock::TimePoint time, ByteView message);
     /// After the last message. False, and the error, when something did not reach the file; there
     /// is none then.
@@ -42,9 +43,12 @@ class CaptureWriter
     CaptureWriter(PrivateFile file, std::unique_ptr<pcap, Closer> handle,
                   std::unique_ptr<pcap_dumper, Closer> dumper);
 
+    void noteError();
+
     PrivateFile _file;
     std::unique_ptr<pcap, Closer> _handle;
     std::unique_ptr<pcap_dumper, Closer> _dumper;
+    int _error = 0; // errno of the first write that failed
 };
 
 } // namespace ventrik

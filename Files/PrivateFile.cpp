@@ -108,6 +108,7 @@ PrivateFile::~PrivateFile()
 PrivateFile::PrivateFile(PrivateFile&& other) noexcept
     : _path(std::move(other._path)),
       _temporaryName(std::exchange(other._temporaryName, {})),
+      _writeError(other._writeError),
       _stream(std::move(other._stream))
 {
 }
@@ -117,13 +118,15 @@ PrivateFile& PrivateFile::operator=(PrivateFile&& other) noexcept
     discard();
     _path = std::move(other._path);
     _temporaryName = std::exchange(other._temporaryName, {});
+    _writeError = other._writeError;
     _stream = std::move(other._stream);
     return *this;
 }
 
 void PrivateFile::write(std::string_view text)
 {
-    std::fwrite(text.data(), 1, text.size(), stream());
+    if (std::fwrite(text.data(), 1, text.size(), stream()) != text.size() && _writeError == 0)
+        _writeError = errno;
 }
 
 bool PrivateFile::commit(std::string& error)
@@ -135,14 +138,14 @@ bool PrivateFile::commit(std::string& error)
     return false;
 }
 
-// A write that failed earlier has left its mark on the stream, but perhaps no errno.
 bool PrivateFile::bringToDisk()
 {
-    errno = 0;
-    const bool isWritten = std::fflush(stream()) == 0 && std::ferror(stream()) == 0;
-    if (!isWritten && errno == 0)
-        errno = EIO;
-    return isWritten && flushToDisk(::fileno(stream()));
+    const bool isFlushed = std::fflush(stream()) == 0;
+    const int error = isFlushed ? EIO : errno;
+    if (isFlushed && _writeError == 0 && std::ferror(stream()) == 0)
+        return flushToDisk(::fileno(stream()));
+    errno = _writeError != 0 ? _writeError : error;
+    return false;
 }
 
 bool PrivateFile::takeName()

@@ -51,6 +51,7 @@ class PrivateFile
 
     std::string _path;
     std::string _temporaryName; // empty while it has none
+    int _writeError = 0;        // errno of the first write that failed
     std::unique_ptr<std::FILE, Closer> _stream;
 };
 

@@ -29,12 +29,13 @@ bool writeScenarioCapture(MessageSource& source, std::uint64_t messageCount,
         const auto message = source.next();
         if (!message)
             break;
+        if (message->data.size() > CaptureWriter::maximumMessageSize) {
+            error = fmt::format("{}: a message is too large for a capture", path);
+            return false;
+        }
         isWritten = writer->write(captureStart + message->due, message->data);
     }
-    if (isWritten)
-        return writer->commit(error);
-    error = fmt::format("{}: a message is too large for a capture", path);
-    return false;
+    return writer->commit(error);
 }
 
 } // namespace ventrik

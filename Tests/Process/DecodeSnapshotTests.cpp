@@ -109,4 +109,38 @@ TEST_F(DecodeSnapshot, IsReadByPython)
                                "4\n");
 }
 
+// A limit on the size of files stands for the full disk.
+TEST_F(DecodeSnapshot, ThatDoesNotFitOnTheDiskLeavesTheOldOneAndNothingElse)
+{
+    const std::string directory = path("logs");
+    const std::string snapshot = writeFile("logs/old", "the old one");
+    const std::string capture = writeFile("cells.pcap", cellCapture().bytes());
+    Program program("/bin/sh",
+                    {"-c", "trap '' XFSZ; ulimit -f 0; exec \"$@\"", "sh",
+                     VENTRIK_PROGRAMS "/ventrik-decode", "--snapshot", snapshot, capture},
+                    environment);
+    EXPECT_EQ(program.waitForEnd(), 1);
+    EXPECT_TRUE(program.says("ventrik-decode: " + snapshot + ": File too large\n"))
+        << program.errors();
+    EXPECT_EQ(readFile(snapshot), "the old one");
+    EXPECT_EQ(namesIn(directory), std::set<std::string>{"old"});
+}
+
+TEST_F(DecodeSnapshot, IsMadeAlsoOfTextThatXmlCannotCarry)
+{
+    const std::string snapshot = path("snapshot");
+    // A binary property list: one row of one value, the bytes 1 and 'a'.
+    const Bytes row{'b', 'p', 'l', 'i', 's', 't', '0', '0', 0xA1, 0x01, 0x52, 0x01, 'a', 8, 10, 0,
+                    0,   0,   0,   0,   0,   1,   1,   0,   0,    0,    0,    0,    0,   0, 2,  0,
+                    0,   0,   0,   0,   0,   0,   0,   0,   0,    0,    0,    0,    0,   0, 13};
+    const Result result =
+        decode(lteCapture().record(captureStart, 0, PacketBuilder(0xFF0002).bytes(13, row).build()),
+               {"--resources", VENTRIK_RESOURCES, "--snapshot", snapshot});
+    EXPECT_EQ(result.status, 0) << result.errors;
+    EXPECT_THAT(result.complaints,
+                testing::ElementsAre("ventrik-decode: " + snapshot +
+                                     ": 1 characters that XML cannot carry are written as U+FFFD"));
+    EXPECT_THAT(readFile(snapshot), testing::HasSubstr("<string>\uFFFDa</string>"));
+}
+
 } // namespace ventrik

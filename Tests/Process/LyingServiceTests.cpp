@@ -136,4 +136,20 @@ TEST_F(LyingService, ThatTellsItsTechnologyIn64MebibytesHoldsTheViewerNoLongerTh
     expectShortHold("technology:large");
 }
 
+// A gigabyte a second for 8 s.
+TEST_F(LyingService, ThatFloodsWithLargeMessagesFillsNoMoreThanThePeriodsOfTheHistory)
+{
+    environment.insert("ASAN_OPTIONS", "quarantine_size_mb=1");
+    service = std::make_unique<Program>(
+        "/usr/bin/python3", Arguments{VENTRIK_LYING_SERVICE, "stream:large-messages"}, environment);
+    ASSERT_TRUE(waitUntil([this] { return service->prints("listening"); })) << service->errors();
+    const auto watch = start("ventrik-watch", {}, Program::Output::Discarded);
+    ASSERT_TRUE(waitUntil([this] { return service->prints("lied"); }));
+    waitUntil([] { return false; }, 8s);
+    EXPECT_TRUE(watch->isRunning());
+    // Five periods of the history, the present one, and what grows while it is moved.
+    EXPECT_LT(watch->peakMemory(), isSanitized ? 1'200'000 : 700'000);
+    EXPECT_GT(watch->peakMemory(), 250'000);
+}
+
 } // namespace ventrik

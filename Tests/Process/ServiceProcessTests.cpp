@@ -88,4 +88,32 @@ TEST_F(ServiceProcess, ClosesTheLogChannelOfAClientThatHasGone)
     EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
 }
 
+// A limit on the size of files stands for the full disk.
+TEST_F(ServiceProcess, WhoseCaptureDoesNotFitOnTheDiskLeavesTheOldOneAndNothingElse)
+{
+    const std::string capture = writeFile("logs/old.pcap", "the old one");
+    Program service("/bin/sh",
+                    {"-c", "trap '' XFSZ; ulimit -f 8; exec \"$@\"", "sh",
+                     VENTRIK_PROGRAMS "/ventrik-telephony", "--technology", "lte", "--write",
+                     capture},
+                    environment);
+    EXPECT_EQ(service.waitForEnd(), 1);
+    EXPECT_EQ(service.errors(), "ventrik-telephony: " + capture + ": File too large\n");
+    EXPECT_EQ(readFile(capture), "the old one");
+    EXPECT_THAT(namesIn(path("logs")), ElementsAre("old.pcap"));
+}
+
+TEST_F(ServiceProcess, RefusesAClientThatNamesItsOwnPort)
+{
+    const auto service = startScenario();
+    CapturingSystemLog log;
+    LinuxMainQueue queue;
+    LinuxMessagePorts ports(runtimeDirectory(), log);
+    LinuxTelephonyClient telephony(ports, queue);
+    const auto connection = telephony.createServerConnection({});
+    ASSERT_TRUE(connection);
+    const auto answer = connection->networkMonitorCreateLogChannel("org.ventrik.TelephonyService");
+    EXPECT_EQ(answer.error.code, EINVAL);
+}
+
 } // namespace ventrik

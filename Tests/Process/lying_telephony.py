@@ -2,12 +2,14 @@
 
 It serves the log channel in $VENTRIK_RUNTIME_DIR as a good service would, with LTE cells whose
 physical cell identity is 300 and the number of the attempt, and misbehaves in the way of that name,
-TIMES times (once by default). Steps are the answers to a channel's "request" and to the question for
-the "technology", and the "stream". It prints "listening" when it is ready and "lied" each time that
-it has misbehaved.
+TIMES times (once by default). Steps are its "port", the answers to a channel's "request" and to the
+question for the "technology", the "start" command and the "stream". It prints "listening" when it is
+ready and "lied" each time that it has misbehaved. "die" and "stop" are signals to itself; whoever
+stopped it lets it go on.
 """
 import os
 import plistlib
+import signal
 import socket
 import struct
 import sys
@@ -20,13 +22,15 @@ CHANNEL = "org.ventrik.LyingTelephony.LogChannel"
 WANTS_REPLY, IS_REPLY = 1, 2
 LARGE = 64 << 20
 ANSWERS = ["silent", "close", "garbage", "half", "dribble", "large", "too-large", "bad-flags",
-           "bad-header"]
+           "bad-header", "die", "stop"]
 KINDS = {
     "request": ANSWERS + ["refuse", "no-name", "empty-name", "dead-name"],
     "technology": ANSWERS + ["unknown", "number"],
     "stream": ["close", "close-at-once", "half-close", "bad-flags", "bad-header", "too-large",
                "stall-in-header", "stall-in-message", "silent", "none", "odd-messages", "flood",
-               "large-messages", "close-commands", "close-service"],
+               "large-messages", "close-commands", "close-service", "die", "stop"],
+    "start": ["die", "stop"],
+    "port": ["foreign"],
 }
 
 
@@ -78,12 +82,20 @@ class LyingService:
         self.times -= 1
         print("lied", flush=True)
 
+    def end_or_stop(self):
+        print("lied", flush=True)
+        self.times -= 1
+        os.kill(os.getpid(), signal.SIGKILL if self.kind == "die" else signal.SIGSTOP)
+
     def listen(self, name):
         path = os.path.join(DIRECTORY, name)
         if os.path.exists(path):
             os.unlink(path)
         listener = socket.socket(socket.AF_UNIX, socket.SOCK_STREAM)
         listener.bind(path)
+        # The kernel notes who listens.
+        if self.lies("port"):
+            os.seteuid(65534)
         listener.listen(16)
         self.listeners[name] = listener
         return listener
@@ -116,6 +128,10 @@ class LyingService:
             connection.sendall(good)
             return
         kind = self.kind
+        if kind in ("die", "stop"):
+            self.end_or_stop()
+            connection.sendall(good)
+            return
         self.lied()
         if kind == "close":
             connection.shutdown(socket.SHUT_RDWR)
@@ -160,7 +176,10 @@ class LyingService:
                 answer = {"unknown": "Semaphore", "number": 5}[self.kind]
                 self.lied()
             self.answer(connection, serial, {"GetTechnology": answer}, "technology")
-        elif not (self.lies("stream") and self.kind == "none"):
+            return
+        if self.lies("start"):
+            self.end_or_stop()
+        if not (self.lies("stream") and self.kind == "none"):
             threading.Thread(target=self.run_stream, args=(self.stream, self.attempt),
                              daemon=True).start()
         else:
@@ -185,6 +204,9 @@ class LyingService:
         for _ in range(30):
             stream.sendall(frame(cell_info(300 + attempt)))
             time.sleep(0.1)
+        if kind in ("die", "stop"):
+            self.end_or_stop()
+            return
         self.lied()
         if kind == "close":
             stream.shutdown(socket.SHUT_RDWR)
@@ -230,6 +252,8 @@ class LyingService:
     def run(self):
         self.serve(SERVICE, self.handle_request)
         self.serve(CHANNEL, self.handle_command)
+        if self.lies("port"):
+            self.lied()
         print("listening", flush=True)
         threading.Event().wait()
 

@@ -68,8 +68,11 @@ std::string_view channelFaultText(ChannelFault fault)
     return "";
 }
 
-VentrikModel::VentrikModel(const Platform& platform, UpdateCallback updateScreens)
-    : _platform(platform), _updateScreens(std::move(updateScreens))
+VentrikModel::VentrikModel(const Platform& platform, UpdateCallback updateScreens,
+                           GeneratorFactory makeGenerator)
+    : _platform(platform),
+      _updateScreens(std::move(updateScreens)),
+      _makeGenerator(std::move(makeGenerator))
 {
 }
 
@@ -205,8 +208,8 @@ void VentrikModel::configureGenerator()
         return;
     }
     setFault(ChannelFault::NoTechnology);
-    _logGenerator = LogGenerator::generatorFromTechnology(
-        *technology, {_platform.log, _platform.resources, _platform.clock});
+    _logGenerator =
+        _makeGenerator(*technology, {_platform.log, _platform.resources, _platform.clock});
     if (_logGenerator)
         _technologyName = LogGenerator::technologyName(*technology);
     _platform.log.error("Got log generated: {}", fmt::ptr(_logGenerator.get()));

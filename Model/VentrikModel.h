@@ -37,9 +37,13 @@ class VentrikModel
 {
   public:
     using UpdateCallback = std::function<void()>;
+    /// The generator for a technology identifier, or none if it is unknown.
+    using GeneratorFactory = std::function<std::unique_ptr<LogGenerator>(
+        const PlistValue& technology, const GeneratorServices& services)>;
 
     /// `updateScreens` is called on the main queue after a refresh that found something new.
-    VentrikModel(const Platform& platform, UpdateCallback updateScreens);
+    VentrikModel(const Platform& platform, UpdateCallback updateScreens,
+                 GeneratorFactory makeGenerator = LogGenerator::generatorFromTechnology);
     ~VentrikModel();
     VentrikModel(const VentrikModel&) = delete;
     VentrikModel& operator=(const VentrikModel&) = delete;
@@ -94,6 +98,7 @@ class VentrikModel
 
     Platform _platform;
     UpdateCallback _updateScreens;
+    GeneratorFactory _makeGenerator;
 
     std::shared_ptr<LocalPort> _recvPort;
     std::shared_ptr<RemotePort> _sendPort;

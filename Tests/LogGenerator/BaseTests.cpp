@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/Base.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
+#include "Tests/Support/ArrayLockHolder.h"
 
 namespace ventrik
 {
@@ -151,6 +152,15 @@ TEST(LookUpECNO, GivesEachRowsValueAtBothItsEnds)
         EXPECT_EQ(Base::lookUpECNO(row.from), row.result) << row.from;
         EXPECT_EQ(Base::lookUpECNO(row.to), row.result) << row.to;
     }
+}
+
+TEST(BaseArrays, AreClearedAndReplacedUnderTheirLock)
+{
+    PlistArray array{"a"};
+    EXPECT_TRUE(waitsForArrayLock([&] { Base::clearElementsInArray(array); }));
+    EXPECT_TRUE(array.empty());
+    EXPECT_TRUE(waitsForArrayLock([&] { Base::replaceArray(array, PlistArray{"b"}); }));
+    EXPECT_EQ(array, PlistArray{"b"});
 }
 
 } // namespace ventrik

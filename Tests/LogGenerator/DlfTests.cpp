@@ -140,6 +140,14 @@ TEST_F(DlfTest, TheReportCarriesTheFixedTextsAndTheClock)
     EXPECT_EQ(textIn(record, 27, 16), std::string("EXECUTABLE_NAME\0", 16));
     // 1794809428 is 0x6AFA9E54.
     EXPECT_EQ((Bytes{record.begin() + 85, record.begin() + 89}), (Bytes{0x54, 0x9E, 0xFA, 0x6A}));
+    EXPECT_EQ((Bytes{record.begin() + 16, record.begin() + 20}), (Bytes{1, 0, 1, 0}));
+    EXPECT_EQ(textIn(record, 67, 18), std::string(buildDate(), 17) + '\0');
+}
+
+TEST_F(DlfTest, TheSecondsOfTheReportAreWholeOnesThatHavePassed)
+{
+    platform.clock.advance(std::chrono::milliseconds(999));
+    EXPECT_EQ(dlf()->at(85), 0x54);
 }
 
 TEST_F(DlfTest, WithoutAVersionTheTextIsNone)
@@ -153,6 +161,7 @@ TEST_F(DlfTest, WritesZonesWestAndEast)
     platform.clock.setTimeZone({-12600, false}); // UTC-03:30: -210 minutes, 0xFF2E
     EXPECT_EQ(dlf()->at(89), 0x2E);
     EXPECT_EQ(dlf()->at(90), 0xFF);
+    EXPECT_EQ(dlf()->at(91), 0);
     platform.clock.setTimeZone({20700, true}); // UTC+05:45: 345 minutes, 0x0159
     EXPECT_EQ(dlf()->at(89), 0x59);
     EXPECT_EQ(dlf()->at(90), 0x01);

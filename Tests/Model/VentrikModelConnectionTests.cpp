@@ -318,4 +318,52 @@ TEST_F(ConnectionTest, DestroyingTheModelClosesItsPorts)
     EXPECT_EQ(attempts(), 1U);
 }
 
+// Not at the next tick, which comes after 2 s.
+TEST_F(ConnectionTest, ANotificationOfTheServiceRefreshesAtOnce)
+{
+    fake.telephony.notifyDuringRequests();
+    model.updateWithData(cellInfo(301));
+    model.startMonitor();
+    fake.mainQueue.run();
+    EXPECT_EQ(redraws, 1);
+}
+
+TEST_F(ConnectionTest, NothingIsDeliveredFromAPortThatExistedAlready)
+{
+    fake.ports.reportNextLocalPortAsExisting();
+    model.startMonitor();
+    EXPECT_THAT(fake.ports.operations(), Not(Contains(testing::StartsWith("local delivering"))));
+}
+
+namespace
+{
+
+// A generator whose start command XML cannot carry.
+class UnspeakableGenerator : public LogGenerator
+{
+  public:
+    explicit UnspeakableGenerator(const GeneratorServices& services) : LogGenerator(services) {}
+
+    void updateState(PlistDictionary&, ByteView) override {}
+    std::optional<PlistValue> generateLogUsingState(PlistDictionary&) override { return {}; }
+    PlistDictionary getStartCommand() const override { return {{"SetState", "\x01"}}; }
+    PlistValue getSaveContentsFromState(const PlistDictionary&) const override { return "none"; }
+};
+
+} // namespace
+
+TEST_F(ConnectionTest, AStartCommandThatCannotBeSerialisedIsNotSentAndTriedAgain)
+{
+    VentrikModel other(fake.platform(), {},
+                       [](const PlistValue&, const GeneratorServices& services) {
+                           return std::make_unique<UnspeakableGenerator>(services);
+                       });
+    other.startMonitor();
+    EXPECT_TRUE(fake.log.contains(" Could not generate PLIST"));
+    EXPECT_EQ(fake.ports.sends().size(), 1U); // the question for the technology
+    EXPECT_FALSE(other.isConnected());
+    fake.mainQueue.advance(5s);
+    EXPECT_EQ(fake.log.count(" Could not generate PLIST"), 2U);
+}
+
 } // namespace ventrik

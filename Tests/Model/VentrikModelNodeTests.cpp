@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/ArrayLock.h"
 #include "Model/TreePrinter.h"
 #include "Model/VentrikModelNode.h"
+#include "Tests/Support/ArrayLockHolder.h"
 
 #include <thread>
 
@@ -222,6 +223,16 @@ TEST_F(TreeTest, ArraysInArraysLeaveNoLevelOfTheLockBehind)
     ASSERT_TRUE(isFree());
     treeOf(PlistArray{PlistArray{PlistArray{"a"}, "b"}, PlistArray{"c"}});
     EXPECT_TRUE(isFree());
+}
+
+TEST_F(TreeTest, AnArrayIsWalkedUnderItsLock)
+{
+    const PlistValue list = PlistArray{"a"};
+    const PlistValue dictionary = PlistDictionary{{"a", "b"}};
+    EXPECT_TRUE(waitsForArrayLock([&] { VentrikModelNode::makeTreeFromObject(&list, index); }));
+    PathIndex other;
+    EXPECT_FALSE(
+        waitsForArrayLock([&] { VentrikModelNode::makeTreeFromObject(&dictionary, other); }));
 }
 
 } // namespace ventrik

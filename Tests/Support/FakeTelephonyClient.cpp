@@ -10,6 +10,7 @@ namespace ventrik
 struct FakeTelephonyClient::State {
     std::shared_ptr<OperationRecord> record;
     bool isAvailable = true;
+    bool notifiesDuringRequests = false;
     std::size_t creationCount = 0;
     std::uint64_t nextConnection = 0;
     std::map<std::uint64_t, NotificationCallback> callbacks; // of the live connections
@@ -46,6 +47,9 @@ class FakeTelephonyClient::Connection : public ServerConnection
     {
         _state->requests.emplace_back(localPortName);
         _state->record->add("log channel requested " + std::string(localPortName));
+        if (const auto callback = _state->callbacks.at(_id);
+            callback && _state->notifiesDuringRequests)
+            callback();
         return _state->nextResult();
     }
 
@@ -94,6 +98,11 @@ void FakeTelephonyClient::notify()
     for (const auto& [id, callback] : before)
         if (state->callbacks.contains(id) && callback)
             callback();
+}
+
+void FakeTelephonyClient::notifyDuringRequests()
+{
+    _state->notifiesDuringRequests = true;
 }
 
 std::size_t FakeTelephonyClient::creationCount() const

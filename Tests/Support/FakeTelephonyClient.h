@@ -40,6 +40,8 @@ class FakeTelephonyClient : public TelephonyClient
 
     /// Calls the callback of every live connection, at once. A callback may end connections.
     void notify();
+    /// The service notifies in the middle of each request for a log channel.
+    void notifyDuringRequests();
 
     /// Calls of `createServerConnection`, the ones that gave none included.
     std::size_t creationCount() const;

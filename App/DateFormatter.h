@@ -9,8 +9,8 @@
 namespace ventrik
 {
 
-/// Writes times as local time. The format is that of QDateTime: letters stand for the parts of the
-/// time, what is quoted stands for itself.
+/// Writes times as local time, the same in every language. The format is that of QDateTime: letters
+/// stand for the parts of the time, what is quoted stands for itself.
 class DateFormatter
 {
   public:

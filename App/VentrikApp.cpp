@@ -12,9 +12,6 @@ namespace ventrik
 namespace
 {
 
-constexpr const char* saveButtonMarker =
-    "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
-
 constexpr std::string_view homeScreenDomain = "org.ventrik.HomeScreen";
 constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
 
@@ -27,7 +24,7 @@ VentrikPaneController& paneOf(Screen& screen)
     return static_cast<VentrikPaneController&>(screen);
 }
 
-bool exists(const char* path)
+bool exists(const std::string& path)
 {
     std::error_code error;
     return std::filesystem::exists(path, error);
@@ -44,7 +41,7 @@ VentrikApp::~VentrikApp() = default;
 
 void VentrikApp::getSaveButtonPref()
 {
-    setAllowSaveButton(_options.saveButton || exists(saveButtonMarker));
+    setAllowSaveButton(_options.saveButton || exists(_options.saveButtonMarker));
 }
 
 void VentrikApp::applicationDidFinishLaunching()
@@ -69,6 +66,14 @@ void VentrikApp::createWindow()
         _window->resize(*_options.windowSize);
     else
         _window->setGeometry(QGuiApplication::primaryScreen()->geometry());
+}
+
+// The application owns the save screen, the window must not delete it.
+void VentrikApp::setWindow(std::unique_ptr<QWidget> window)
+{
+    if (_navController)
+        _navController->dismiss(false);
+    _window = std::move(window);
 }
 
 void VentrikApp::createDateFormatter()
@@ -110,8 +115,8 @@ void VentrikApp::applicationWillTerminate()
     setUpdateMessage(std::nullopt);
     _dateFormatter.reset();
     setSaveViewController(nullptr);
-    _window->hide();
-    _navController = nullptr;
+    if (_window)
+        _window->hide();
     setWindow(nullptr);
     _model.reset();
 }
@@ -125,7 +130,7 @@ void VentrikApp::_setGSMRSSI(bool value)
 
 void VentrikApp::showSaveView()
 {
-    if (_saveViewController)
+    if (_saveViewController || !_navController)
         return;
     setSaveViewController(VentrikSaveViewController::initWithSaveHistory(
         *this, _platform, _options.snapshotDirectory, _model->getSaveContents()));
@@ -136,7 +141,8 @@ void VentrikApp::closeSaveView()
 {
     if (!_saveViewController)
         return;
-    _navController->dismiss(true);
+    if (_navController)
+        _navController->dismiss(true);
     setSaveViewController(nullptr);
 }
 
@@ -163,6 +169,8 @@ bool VentrikApp::reloadPane(const std::vector<Screen*>& screens, std::size_t ind
 
 void VentrikApp::updateViewControllerFromModel()
 {
+    if (!_navController)
+        return;
     const std::vector<Screen*> screens = _navController->screens();
     for (std::size_t i = 0; i < screens.size() && reloadPane(screens, i); ++i) {
     }

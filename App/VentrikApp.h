@@ -7,6 +7,7 @@
 #include "Model/VentrikModel.h"
 #include "Platform/Platform.h"
 
+#include <QPointer>
 #include <QSize>
 #include <QWidget>
 
@@ -18,7 +19,10 @@ namespace ventrik
 {
 
 struct VentrikAppOptions {
-    bool saveButton = false;       ///< offers Save also where the marker path is missing
+    bool saveButton = false; ///< offers Save also where the marker path is missing
+    /// Where anything stands at this path, Save is offered.
+    std::string saveButtonMarker =
+        "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
     std::string snapshotDirectory; ///< where Save writes
     bool animation = true;
     bool tintsChanges = true;        ///< tints values that have changed for a moment
@@ -38,6 +42,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
 
     void getSaveButtonPref();
     void applicationDidFinishLaunching();
+    /// May come more than once, and also where there was no launch.
     void applicationWillTerminate();
     /// Writes whether the home screen shows the signal level as a number.
     void _setGSMRSSI(bool value);
@@ -51,7 +56,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
 
     /// Null before launch and after termination, as is the stack, which belongs to the window.
     QWidget* window() const { return _window.get(); }
-    void setWindow(std::unique_ptr<QWidget> window) { _window = std::move(window); }
+    /// What was shown in the former window goes with it, but for the save screen, which stays open
+    /// without one.
+    void setWindow(std::unique_ptr<QWidget> window);
     NavigationStack* navController() const { return _navController; }
 
     /// The save screen while it is open, else null.
@@ -60,6 +67,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     {
         _saveViewController = std::move(screen);
     }
+    /// Null before launch and after termination.
+    const DateFormatter* dateFormatter() const { return _dateFormatter.get(); }
     const std::optional<std::string>& updateMessage() const { return _updateMessage; }
     void setUpdateMessage(std::optional<std::string> message)
     {
@@ -82,7 +91,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     VentrikAppOptions _options;
 
     std::unique_ptr<QWidget> _window;
-    NavigationStack* _navController = nullptr;
+    QPointer<NavigationStack> _navController;
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
     std::shared_ptr<VentrikModel> _model;
     bool _allowSaveButton = false;

@@ -1,9 +1,12 @@
 #include "Tests/App/AppFixture.h"
 
+#include "App/Toolkit/Transition.h"
 #include "App/VentrikCell.h"
 
+#include <QDir>
 #include <QGuiApplication>
 #include <QLineEdit>
+#include <QLocale>
 #include <QPushButton>
 #include <QScreen>
 #include <QTest>
@@ -33,6 +36,30 @@ class VentrikAppTest : public AppFixture
     QPushButton& saveButton()
     {
         return dynamic_cast<QPushButton&>(*topPane().toolbar().items().at(3));
+    }
+    // Pictures that slide; those that fade let clicks through.
+    std::size_t covers()
+    {
+        std::size_t count = 0;
+        for (const QWidget* widget : app.window()->findChildren<QWidget*>())
+            if (dynamic_cast<const Transition*>(widget) &&
+                !widget->testAttribute(Qt::WA_TransparentForMouseEvents))
+                ++count;
+        return count;
+    }
+    void waitForStillness()
+    {
+        ASSERT_TRUE(QTest::qWaitFor([this] { return covers() == 0; }));
+    }
+    // Launches with a tree two levels deep in view, and lets the window move from then on.
+    void launchMoving()
+    {
+        launchAndConnect();
+        refreshWithData();
+        openRow(0);
+        openRow(0);
+        app.navController()->setAnimationEnabled(true);
+        ASSERT_EQ(covers(), 0U);
     }
     int savedRows() { return app.saveViewController()->rowsInSection(0); }
     std::string valueText(int row)
@@ -396,6 +423,107 @@ TEST_F(VentrikAppTest, TheWindowIsLaidOutFromLeftToRightOnEveryDesktop)
     QGuiApplication::setLayoutDirection(Qt::LeftToRight);
     EXPECT_EQ(app.window()->layoutDirection(), Qt::LeftToRight);
     EXPECT_EQ(pane(0).toolbar().items().at(1)->x(), 12);
+}
+
+TEST_F(VentrikAppTest, TheMarkerIsTheOneOfInternalBuilds)
+{
+    EXPECT_EQ(VentrikAppOptions().saveButtonMarker,
+              "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle");
+}
+
+TEST_F(VentrikAppTest, TheLaunchLooksForTheMarker)
+{
+    VentrikAppOptions options;
+    options.saveButtonMarker = temporary.filePath("marker").toStdString();
+    VentrikApp without(fake.platform(), options);
+    without.applicationDidFinishLaunching();
+    EXPECT_FALSE(without.allowSaveButton());
+    QDir(temporary.path()).mkdir("marker");
+    VentrikApp with(fake.platform(), options);
+    with.applicationDidFinishLaunching();
+    EXPECT_TRUE(with.allowSaveButton());
+}
+
+TEST_F(VentrikAppTest, APaneWhoseNodeIsGoneGoesAwayInMotion)
+{
+    launchMoving();
+    changeTechnology(kQXLogChannelTechnology_Orbel_UTRAN2);
+    fake.mainQueue.advance(2s);
+    ASSERT_EQ(titles().size(), 3U);
+    refreshWithData();
+    ASSERT_EQ(titles().size(), 2U);
+    EXPECT_GT(covers(), 0U);
+}
+
+TEST_F(VentrikAppTest, TheSaveScreenComesAndGoesInMotion)
+{
+    launchMoving();
+    app.showSaveView();
+    EXPECT_GT(covers(), 0U);
+    waitForStillness();
+    app.closeSaveView();
+    EXPECT_GT(covers(), 0U);
+}
+
+TEST_F(VentrikAppTest, TheFormatterIsReleasedAtTermination)
+{
+    launchAndConnect();
+    EXPECT_NE(app.dateFormatter(), nullptr);
+    app.applicationWillTerminate();
+    EXPECT_EQ(app.dateFormatter(), nullptr);
+}
+
+TEST_F(VentrikAppTest, TheRootPaneIsReloadedAlsoWithoutANode)
+{
+    app.applicationDidFinishLaunching();
+    pane(0).reloadWithNode(VentrikModelTreeNode::initWithName("Old", {}));
+    app.updateViewControllerFromModel();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik"));
+}
+
+TEST_F(VentrikAppTest, TerminationMayComeTwice)
+{
+    launchAndConnect();
+    app.applicationWillTerminate();
+    app.applicationWillTerminate();
+    EXPECT_EQ(app.window(), nullptr);
+}
+
+TEST_F(VentrikAppTest, TerminationBeforeTheLaunchResetsTheHomeScreen)
+{
+    app.applicationWillTerminate();
+    EXPECT_EQ(fake.preferences.calls().size(), 3U);
+}
+
+TEST_F(VentrikAppTest, AnotherWindowLeavesTheOpenSaveScreenItsOwner)
+{
+    launchAndConnect();
+    app.showSaveView();
+    app.setWindow(std::make_unique<QWidget>());
+    EXPECT_EQ(app.navController(), nullptr);
+    ASSERT_NE(app.saveViewController(), nullptr);
+    EXPECT_EQ(app.saveViewController()->parentWidget(), nullptr);
+    app.closeSaveView();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+}
+
+TEST_F(VentrikAppTest, WithoutItsPanesNothingIsShownOrReloaded)
+{
+    app.showSaveView();
+    launchAndConnect();
+    app.setWindow(nullptr);
+    app.showSaveView();
+    app.updateViewControllerFromModel();
+    EXPECT_EQ(app.saveViewController(), nullptr);
+}
+
+TEST_F(VentrikAppTest, TheUpdateTimeIsWrittenTheSameInEveryLanguage)
+{
+    QLocale::setDefault(QLocale(QLocale::Arabic, QLocale::Egypt));
+    launchAndConnect();
+    refreshWithData();
+    QLocale::setDefault(QLocale::c());
+    EXPECT_EQ(statusText(pane(0)), "Updated 2026-11-16 at 06:10:28");
 }
 
 TEST_F(VentrikAppTest, PlainValuesAreNotTinted)

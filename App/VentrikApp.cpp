@@ -95,6 +95,8 @@ void VentrikApp::showWindow()
 {
     auto* layout = new QVBoxLayout(_window.get());
     layout->setContentsMargins(0, 0, 0, 0);
+    // What needs more room than there is gives way, not the window.
+    layout->setSizeConstraint(QLayout::SetNoConstraint);
     layout->addWidget(_navController);
     _window->show();
     _window->activateWindow();

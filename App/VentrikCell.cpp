@@ -3,11 +3,14 @@
 #include "App/Toolkit/EdgeFade.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/HorizontalScrollView.h"
+#include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/Transition.h"
 
 #include <QLabel>
 #include <QPainter>
 #include <QTimerEvent>
+
+#include <algorithm>
 
 namespace ventrik
 {
@@ -61,9 +64,10 @@ std::unique_ptr<VentrikCell> VentrikCell::initWithStyle(Style style, const QStri
 
 void VentrikCell::setKeyText(const QString& text)
 {
-    if (text != _key->text())
+    const QString shown = oneLine(text);
+    if (shown != _key->text())
         endTint(); // it was another node's value
-    _key->setText(text);
+    _key->setText(shown);
     updateAccessibleName();
 }
 
@@ -71,7 +75,7 @@ void VentrikCell::setValueText(const QString& text)
 {
     if (!_value)
         return;
-    _value->setText(text);
+    _value->setText(oneLine(text));
     updateAccessibleName();
 }
 
@@ -108,7 +112,8 @@ void VentrikCell::paintEvent(QPaintEvent* event)
     painter.setRenderHint(QPainter::Antialiasing);
     painter.setPen(Qt::NoPen);
     painter.setBrush(tint);
-    painter.drawRoundedRect(QRect(_value->mapTo(this, QPoint()), _value->size())
+    const QRect text = _value->contentsRect();
+    painter.drawRoundedRect(QRect(_value->mapTo(this, text.topLeft()), text.size())
                                 .adjusted(-tintMargin, -tintMargin, tintMargin, tintMargin),
                             tintMargin, tintMargin);
 }
@@ -166,7 +171,7 @@ void VentrikCell::updateFade()
     _fade->setVisible(placeInRow(last, last.width()) > edge + textPoints / 2);
     _fade->setDots(hasValue && placeInRow(last, textPoints) > edge);
     if (!_view)
-        setToolTip(isFading() ? _key->text() : QString());
+        setToolTip(isFading() ? plainToolTip(_key->text()) : QString());
 }
 
 bool VentrikCell::isFading() const
@@ -191,13 +196,16 @@ void VentrikCell::placeValue()
 {
     const QRect bounds = contentArea().rect();
     const int keyWidth = measured(_key->text(), boldFont()).width();
-    // Measured in the key's font, which is the wider one, so that the values keep some air on
-    // their right.
+    // Measured in the key's font, which is the wider one: a value has some air.
     const QSize size = measured(_value->text(), boldFont());
     const int needed = keyWidth + roomAroundKey + size.width();
-    const int left = needed < bounds.width() ? bounds.width() - size.width()
-                                             : bounds.x() + keyWidth + roomAroundKey;
+    const bool isAtTheRight = needed < bounds.width();
+    const int left =
+        isAtTheRight ? bounds.width() - size.width() : bounds.x() + keyWidth + roomAroundKey;
     _value->setGeometry(left, centredTop(bounds, size), size.width(), size.height());
+    // There the air goes to the left, so that all values end at one line.
+    const int air = size.width() - measured(_value->text(), _value->font()).width();
+    _value->setContentsMargins(isAtTheRight ? std::max(0, air) : 0, 0, 0, 0);
     const int scrolledWidth =
         needed > bounds.width() ? bounds.width() + keyWidth + size.width() : bounds.width();
     _view->setGeometry(bounds.x(), bounds.y(), bounds.width(), scrolledHeight);

@@ -1,13 +1,12 @@
 #include "App/VentrikPaneController.h"
 
 #include "App/Toolkit/ActivityIndicator.h"
+#include "App/Toolkit/ElidingLabel.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/NavigationStack.h"
+#include "App/Toolkit/PushButton.h"
 #include "App/VentrikCell.h"
-
-#include <QLabel>
-#include <QPushButton>
 
 #include <utility>
 
@@ -18,7 +17,6 @@ namespace
 {
 
 constexpr int statusPoints = 14;
-constexpr int buttonHeight = 32; // for a finger
 constexpr auto rowStyle = TableRow::Style::Value;
 
 QString identifier()
@@ -38,19 +36,17 @@ std::unique_ptr<QWidget> makeIndicator(bool isLoading)
 
 std::unique_ptr<QWidget> makeStatusLabel(const std::string& status)
 {
-    std::unique_ptr<QLabel> label(
-        makeLabel(systemFont(statusPoints, FontWeight::Regular), nullptr));
+    auto label = std::make_unique<ElidingLabel>();
+    label->setFont(systemFont(statusPoints, FontWeight::Regular));
     label->setText(QString::fromStdString(status));
-    label->setFixedSize(label->sizeHint());
+    label->resize(label->sizeHint());
     return label;
 }
 
 std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
 {
-    auto button = std::make_unique<QPushButton>(QStringLiteral("Save"));
+    auto button = std::make_unique<PushButton>(QStringLiteral("Save"));
     button->setShortcut(QKeySequence::Save);
-    button->setAutoDefault(true); // Enter presses it as Space does
-    button->setMinimumHeight(buttonHeight);
     QObject::connect(button.get(), &QPushButton::clicked, button.get(),
                      [&host] { host.showSaveView(); });
     return button;

@@ -1,5 +1,6 @@
 #include "App/VentrikSaveViewController.h"
 
+#include "App/Toolkit/Alert.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "Capture/SnapshotFile.h"
@@ -9,7 +10,7 @@
 #include <ui_VentrikSaveViewController.h>
 
 #include <QKeyEvent>
-#include <QMessageBox>
+#include <QShortcut>
 #include <QValidator>
 
 #include <algorithm>
@@ -104,16 +105,19 @@ VentrikSaveViewController::initWithSaveHistory(VentrikSaveHost& host, const Plat
 void VentrikSaveViewController::viewDidLoad()
 {
     setAutoFillBackground(true);
-    // The screen has the keyboard while the field has not.
-    setFocusPolicy(Qt::StrongFocus);
+    // The screen has the keyboard after a touch on it, but the Tab key passes it by.
+    setFocusPolicy(Qt::ClickFocus);
     _layout->titleLabel->setFont(systemFont(titlePoints, FontWeight::Bold));
     for (QLabel* label : {_layout->descriptionLabel, _layout->contentLabel})
         label->setFont(systemFont(labelPoints, FontWeight::Regular));
     saveDescription().setFont(systemFont(fieldPoints, FontWeight::Regular));
     saveDescription().setTextMargins(fieldMargin, 0, fieldMargin, 0);
     saveDescription().setValidator(new TextOnly(this));
-    connect(&saveDescription(), &QLineEdit::returnPressed, this,
-            [this] { textFieldShouldReturn(saveDescription()); });
+    connect(&saveDescription(), &QLineEdit::returnPressed, this, [this] {
+        if (textFieldShouldReturn(saveDescription()))
+            savePressed();
+    });
+    addShortcuts();
     connect(&saveButton(), &QPushButton::clicked, this, [this] { savePressed(); });
     connect(&cancelButton(), &QPushButton::clicked, this, [this] { cancelPressed(); });
 
@@ -121,6 +125,21 @@ void VentrikSaveViewController::viewDidLoad()
     table.setDataSource(*this);
     table.reloadData();
     table.setMaximumHeight(std::max(table.contentHeight(), TableView::rowHeight));
+}
+
+void VentrikSaveViewController::addShortcuts()
+{
+    for (const Qt::Key key : {Qt::Key_Return, Qt::Key_Enter}) {
+        auto* shortcut = new QShortcut(QKeySequence(Qt::CTRL | key), this);
+        shortcut->setContext(Qt::WidgetWithChildrenShortcut);
+        shortcut->setAutoRepeat(false);
+        connect(shortcut, &QShortcut::activated, this, [this] { savePressed(); });
+    }
+}
+
+QWidget& VentrikSaveViewController::firstFocus()
+{
+    return saveDescription();
 }
 
 // The whole of the window is what the application has of the main screen.
@@ -155,17 +174,13 @@ bool VentrikSaveViewController::writeFile(const std::string& fileName) const
     return static_cast<bool>(writing);
 }
 
-// The window's, since the screen closes below it. The title stands inside as well: where windows
-// have no frames it would not be seen.
+// The window's, since the screen closes below it.
 void VentrikSaveViewController::showFileError()
 {
     auto* alert =
-        new QMessageBox(QMessageBox::Warning, QStringLiteral("File Error"),
-                        QStringLiteral("<b>File Error</b>"), QMessageBox::NoButton, window());
-    alert->setInformativeText(QStringLiteral("Unable to write file to disk"));
-    alert->addButton(QStringLiteral("Close"), QMessageBox::RejectRole);
-    alert->setAttribute(Qt::WA_DeleteOnClose);
-    alert->open();
+        new Alert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
+                  QStringLiteral("Close"), window());
+    alert->openNow();
 }
 
 void VentrikSaveViewController::cancelPressed()
@@ -260,6 +275,9 @@ void VentrikSaveViewController::mousePressEvent(QMouseEvent*)
 {
     backgroundTouched();
 }
+
+// The second click on what has opened the screen is not meant for its background.
+void VentrikSaveViewController::mouseDoubleClickEvent(QMouseEvent*) {}
 
 void VentrikSaveViewController::keyPressEvent(QKeyEvent* event)
 {

@@ -50,6 +50,9 @@ class VentrikSaveViewController : public Screen, public TableViewDataSource
     bool textFieldShouldReturn(QLineEdit& field);
     void backgroundTouched();
 
+    /// The description, so that it can be typed at once.
+    QWidget& firstFocus() override;
+
     int rowsInSection(int section) override;
     std::unique_ptr<TableRow> rowForIndexPath(TableView& table, IndexPath indexPath) override;
     void rowSelected(TableView& table, std::optional<IndexPath> indexPath) override;
@@ -62,6 +65,7 @@ class VentrikSaveViewController : public Screen, public TableViewDataSource
 
   protected:
     void mousePressEvent(QMouseEvent* event) override;
+    void mouseDoubleClickEvent(QMouseEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
 
   private:
@@ -70,6 +74,7 @@ class VentrikSaveViewController : public Screen, public TableViewDataSource
 
     bool writeFile(const std::string& fileName) const;
     void showFileError();
+    void addShortcuts();
     void hideKeyboard();
     void queueClose();
     QString descriptionAt(IndexPath indexPath) const;

@@ -6,6 +6,14 @@
 namespace ventrik
 {
 
+namespace
+{
+
+// Above and below, a row draws its separator and its frame.
+constexpr int frameWidth = 3;
+
+} // namespace
+
 EdgeFade::EdgeFade(QWidget* parent) : QWidget(parent)
 {
     setAttribute(Qt::WA_TransparentForMouseEvents);
@@ -15,7 +23,8 @@ EdgeFade::EdgeFade(QWidget* parent) : QWidget(parent)
 void EdgeFade::layout()
 {
     const QRect room = parentWidget()->rect();
-    setGeometry(room.right() + 1 - fadeWidth, 0, fadeWidth, room.height() - 1);
+    setGeometry(room.right() + 1 - fadeWidth, frameWidth, fadeWidth,
+                room.height() - 2 * frameWidth);
     raise();
 }
 

@@ -1,5 +1,7 @@
 #include "App/Toolkit/EdgeSwipe.h"
 
+#include "App/Toolkit/HorizontalScrollView.h"
+
 #include <QApplication>
 #include <QMouseEvent>
 #include <QTouchEvent>
@@ -58,11 +60,21 @@ bool EdgeSwipe::eventFilter(QObject* receiver, QEvent* event)
     return false;
 }
 
+// Is the place on something that has been moved sideways and takes the drag for itself?
+bool EdgeSwipe::movesSomethingBack(const QPointF& position) const
+{
+    const QWidget* widget = _widget.childAt(_widget.mapFromGlobal(position).toPoint());
+    for (; widget && widget != &_widget; widget = widget->parentWidget())
+        if (const auto* view = dynamic_cast<const HorizontalScrollView*>(widget))
+            return view->contentOffset() > 0;
+    return false;
+}
+
 void EdgeSwipe::begin(const QPointF& position)
 {
     const qreal fromEdge = _widget.mapFromGlobal(position).x();
     _start = position;
-    _isWatching = fromEdge >= 0 && fromEdge < edgeWidth;
+    _isWatching = fromEdge >= 0 && fromEdge < edgeWidth && !movesSomethingBack(position);
 }
 
 void EdgeSwipe::moveTo(const QPointF& position)

@@ -11,7 +11,8 @@ namespace ventrik
 {
 
 /// Watches for a swipe from a widget's left edge to the right, by finger or mouse, anywhere on the
-/// widget or its children. It only looks on: what lies below gets its events all the same.
+/// widget or its children; but where it begins on content that has been moved sideways it moves
+/// that back and is no swipe. It only looks on: what lies below gets its events all the same.
 class EdgeSwipe : public QObject
 {
   public:
@@ -26,6 +27,7 @@ class EdgeSwipe : public QObject
 
   private:
     bool isMine(QObject* receiver) const;
+    bool movesSomethingBack(const QPointF& position) const;
     void begin(const QPointF& position);
     void moveTo(const QPointF& position);
     void end() { _isWatching = false; }

@@ -25,7 +25,6 @@ QLabel* makeLabel(const QFont& font, QWidget* parent)
     auto* label = new QLabel(parent);
     label->setTextFormat(Qt::PlainText);
     label->setFont(font);
-    // Of a text with line breaks, which is measured as one line, the first line is shown.
     label->setAlignment(Qt::AlignLeft | Qt::AlignTop);
     return label;
 }

@@ -2,14 +2,26 @@
 
 #include "App/Toolkit/EdgeSwipe.h"
 
+#include <QApplication>
 #include <QKeyEvent>
 #include <QStackedLayout>
 #include <QVBoxLayout>
 
+#include <algorithm>
 #include <utility>
 
 namespace ventrik
 {
+
+namespace
+{
+
+using namespace std::chrono_literals;
+
+// For so long an Escape may still be meant for a menu that has just gone.
+constexpr auto escapeWait = 1s;
+
+} // namespace
 
 NavigationStack::NavigationStack(std::unique_ptr<Screen> root, QWidget* parent)
     : QWidget(parent),
@@ -86,9 +98,22 @@ void NavigationStack::popTo(Screen& screen, bool animated)
         popped.push_back(_screens.back());
         _screens.pop_back();
     }
+    closePopupOf(popped);
     replace(*popped.front(), Transition::Kind::Pop, animated);
     for (Screen* old : popped)
         release(*old);
+}
+
+// A menu of a screen that goes does not outlive it. Whoever was about to close it with Escape means
+// nothing else by that.
+void NavigationStack::closePopupOf(const std::vector<Screen*>& popped)
+{
+    QWidget* popup = QApplication::activePopupWidget();
+    const QWidget* owner = popup ? popup->parentWidget() : nullptr;
+    if (std::ranges::none_of(popped, [&](Screen* screen) { return screen->isAncestorOf(owner); }))
+        return;
+    popup->close();
+    _escapeForPopup.setRemainingTime(escapeWait);
 }
 
 void NavigationStack::replace(Screen& leaving, Transition::Kind kind, bool animated)
@@ -109,8 +134,8 @@ void NavigationStack::replace(Screen& leaving, Transition::Kind kind, bool anima
     showTop();
     if (moves) {
         _transition = new Transition(kind, *_screenArea, screenBefore, topScreen().grab());
-        _toolbarTransition =
-            new Transition(Transition::Kind::Fade, *_toolbarArea, std::move(toolbarBefore));
+        _toolbarTransition = new Transition(Transition::Kind::Fade, *_toolbarArea,
+                                            std::move(toolbarBefore), _toolbarArea->grab());
     }
 }
 
@@ -139,7 +164,7 @@ void NavigationStack::present(Screen& screen, bool animated)
     _layout->addWidget(&screen);
     screen.viewWillAppear(animated);
     _layout->setCurrentWidget(&screen);
-    screen.setFocus();
+    screen.firstFocus().setFocus();
     if (moves)
         cover(Transition::Kind::Rise, before);
 }
@@ -205,9 +230,11 @@ void NavigationStack::keyPressEvent(QKeyEvent* event)
         event->key() == Qt::Key_Escape || event->key() == Qt::Key_Backspace ||
         event->key() == Qt::Key_Back ||
         (event->key() == Qt::Key_Left && event->modifiers().testFlag(Qt::AltModifier));
-    if (goesBack)
+    const bool isForPopup = event->key() == Qt::Key_Escape &&
+                            !std::exchange(_escapeForPopup, QDeadlineTimer()).hasExpired();
+    if (goesBack && !isForPopup)
         goBack();
-    else
+    else if (!goesBack)
         QWidget::keyPressEvent(event);
 }
 

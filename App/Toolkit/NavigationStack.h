@@ -4,6 +4,7 @@
 #include "App/Toolkit/TitleBar.h"
 #include "App/Toolkit/Transition.h"
 
+#include <QDeadlineTimer>
 #include <QPointer>
 #include <QWidget>
 
@@ -81,6 +82,7 @@ class NavigationStack : public QWidget
     void uncover(Screen& presented);
     void cover(Transition::Kind kind, const QPixmap& before);
     void focusTop();
+    void closePopupOf(const std::vector<Screen*>& popped);
     void updateTitleBar();
 
     NavigationStackDelegate* _delegate = nullptr;
@@ -95,6 +97,7 @@ class NavigationStack : public QWidget
     QStackedLayout* _screenLayout;
     QWidget* _toolbarArea;
     QStackedLayout* _toolbarLayout;
+    QDeadlineTimer _escapeForPopup;
     QPointer<Transition> _transition;
     QPointer<Transition> _toolbarTransition;
     QPointer<Transition> _presentTransition;

@@ -28,6 +28,9 @@ class Screen : public QWidget
     void setToolbarItems(std::vector<ToolBarItem> items, bool animated);
     ToolBar& toolbar() const { return *_toolbar; }
 
+    /// Who has the keyboard when the screen is presented; the screen itself as a rule.
+    virtual QWidget& firstFocus() { return *this; }
+
     /// Called before the screen comes into view and before it goes out of it.
     virtual void viewWillAppear(bool animated);
     virtual void viewWillDisappear(bool animated);

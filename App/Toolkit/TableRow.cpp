@@ -1,6 +1,7 @@
 #include "App/Toolkit/TableRow.h"
 
 #include "App/Toolkit/Fonts.h"
+#include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/Separator.h"
 
 #include <QLabel>
@@ -20,6 +21,12 @@ constexpr int separatorInset = 10;
 
 } // namespace
 
+void drawKeyboardFrame(QPainter& painter, const QRect& around, const QPalette& palette)
+{
+    painter.setPen(QPen(palette.color(QPalette::Highlight), 2));
+    painter.drawRect(around.adjusted(1, 1, -1, -1));
+}
+
 TableRow::TableRow(Style style, QString reuseIdentifier)
     : _style(style), _reuseIdentifier(std::move(reuseIdentifier)), _contentArea(new QWidget(this))
 {
@@ -38,8 +45,8 @@ QLabel& TableRow::textLabel()
 
 void TableRow::setText(const QString& text)
 {
-    textLabel().setText(text);
-    setAccessibleName(text);
+    textLabel().setText(oneLine(text));
+    setAccessibleName(textLabel().text());
 }
 
 void TableRow::setAccessory(TableRowAccessory accessory)
@@ -94,10 +101,8 @@ void TableRow::paintEvent(QPaintEvent*)
     painter.fillRect(separatorInset, height() - 1, width(), 1, separatorColor(palette()));
     painter.setRenderHint(QPainter::Antialiasing);
     paintAccessory(painter);
-    if (_hasKeyboardFrame) {
-        painter.setPen(QPen(palette().color(QPalette::Highlight), 2));
-        painter.drawRect(rect().adjusted(1, 1, -1, -2));
-    }
+    if (_hasKeyboardFrame)
+        drawKeyboardFrame(painter, rect().adjusted(0, 0, 0, -1), palette());
 }
 
 // A check mark says something; an indicator only hints.

@@ -63,4 +63,7 @@ class TableRow : public QWidget
     bool _hasKeyboardFrame = false;
 };
 
+/// The frame around what the keyboard is at.
+void drawKeyboardFrame(QPainter& painter, const QRect& around, const QPalette& palette);
+
 } // namespace ventrik

@@ -1,5 +1,6 @@
 #include "App/Toolkit/TableView.h"
 
+#include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/TableAccessibility.h"
 #include "App/Toolkit/ThinScrollBar.h"
 
@@ -10,6 +11,7 @@
 #include <QKeyEvent>
 #include <QMenu>
 #include <QMouseEvent>
+#include <QPainter>
 #include <QScrollBar>
 #include <QScroller>
 
@@ -24,6 +26,8 @@ namespace
 {
 
 constexpr int wheelStep = 20;
+constexpr int placeholderPoints = 15;
+constexpr int placeholderMargin = 24;
 
 } // namespace
 
@@ -164,6 +168,8 @@ void TableView::updateLook(int row, TableRow& widget) const
 
 void TableView::updateLooks()
 {
+    if (_rowCount == 0)
+        viewport()->update();
     for (const auto& [row, widget] : _rows)
         updateLook(row, *widget);
 }
@@ -210,6 +216,32 @@ void TableView::copyRow(IndexPath indexPath) const
     const QString text = _dataSource->textForCopying(indexPath);
     if (!text.isEmpty())
         QGuiApplication::clipboard()->setText(text);
+}
+
+void TableView::setPlaceholder(const QString& text)
+{
+    if (text == _placeholder)
+        return;
+    _placeholder = text;
+    setAccessibleDescription(text);
+    viewport()->update();
+}
+
+// Rows cover what is drawn here.
+void TableView::paintEvent(QPaintEvent*)
+{
+    if (_rowCount > 0)
+        return;
+    QPainter painter(viewport());
+    if (_showsKeyboardFrame && hasFocus())
+        drawKeyboardFrame(painter, viewport()->rect(), palette());
+    QColor grey = palette().color(QPalette::Text);
+    grey.setAlphaF(0.6F);
+    painter.setPen(grey);
+    painter.setFont(systemFont(placeholderPoints, FontWeight::Regular));
+    painter.drawText(viewport()->rect().adjusted(placeholderMargin, 0, -placeholderMargin, 0),
+                     static_cast<int>(Qt::AlignCenter) | Qt::TextWrapAnywhere | Qt::TextWordWrap,
+                     _placeholder);
 }
 
 void TableView::resizeEvent(QResizeEvent*)
@@ -264,11 +296,8 @@ void TableView::mouseReleaseEvent(QMouseEvent* event)
         updateLooks();
 }
 
-// Two quick clicks are two clicks.
-void TableView::mouseDoubleClickEvent(QMouseEvent* event)
-{
-    mousePressEvent(event);
-}
+// The second of two quick clicks belongs to the first, also where that has opened this table.
+void TableView::mouseDoubleClickEvent(QMouseEvent*) {}
 
 void TableView::activate(int row)
 {
@@ -377,9 +406,19 @@ void TableView::contextMenuEvent(QContextMenuEvent* event)
     menu->popup(event->globalPos());
 }
 
-void TableView::focusInEvent(QFocusEvent*)
+void TableView::focusInEvent(QFocusEvent* event)
 {
+    if (event->reason() == Qt::TabFocusReason || event->reason() == Qt::BacktabFocusReason)
+        showKeyboard();
     updateLooks();
+}
+
+// Whoever walks by keys is to see where they are.
+void TableView::showKeyboard()
+{
+    _showsKeyboardFrame = true;
+    if (!_current && _rowCount > 0)
+        _current = rangeInView().first;
 }
 
 void TableView::focusOutEvent(QFocusEvent*)

@@ -61,6 +61,9 @@ class TableView : public QAbstractScrollArea
     /// Asks for everything anew; the scroll position stays. Selection, current row and the rows in
     /// view go along with rows that have moved, where a mapping tells so.
     void reloadData(const RowMapping& newPlaceOf = {});
+    /// What an empty table says in its middle.
+    void setPlaceholder(const QString& text);
+    const QString& placeholder() const { return _placeholder; }
     /// The height of all rows together, which may be more than the table's own.
     int contentHeight() const;
     /// A row that waits under that identifier, or none. While an unchanged table is reloaded, every
@@ -81,6 +84,7 @@ class TableView : public QAbstractScrollArea
 
   protected:
     void resizeEvent(QResizeEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
     void scrollContentsBy(int dx, int dy) override;
     void mousePressEvent(QMouseEvent* event) override;
     void mouseMoveEvent(QMouseEvent* event) override;
@@ -109,6 +113,7 @@ class TableView : public QAbstractScrollArea
     void updateLooks();
     void updateLook(int row, TableRow& widget) const;
     void setHighlighted(std::optional<int> row);
+    void showKeyboard();
     void activate(int row);
     void moveTo(int row);
     void scrollTo(int row);
@@ -119,6 +124,7 @@ class TableView : public QAbstractScrollArea
 
     TableViewDataSource* _dataSource = nullptr;
     int _rowCount = 0;
+    QString _placeholder;
     // Rows are children of the viewport, which goes after them.
     std::map<int, std::unique_ptr<TableRow>> _rows;
     std::map<QString, std::deque<std::unique_ptr<TableRow>>> _reusable;

@@ -43,8 +43,9 @@ void ToolBar::setItems(std::vector<ToolBarItem> items, bool animated)
         add(std::move(item));
     if (focused < _items.size())
         giveFocus(_items[focused]);
+    _layout->activate();
     if (fades)
-        _transition = new Transition(Transition::Kind::Fade, *this, std::move(before));
+        _transition = new Transition(Transition::Kind::Fade, *this, std::move(before), grab());
 }
 
 QAbstractButton* ToolBar::pressedButton() const
@@ -73,13 +74,10 @@ std::size_t ToolBar::placeOfFocus() const
     return static_cast<std::size_t>(focused - _items.begin());
 }
 
-// The layout would show the item only later, and what is hidden cannot have the keyboard.
 void ToolBar::giveFocus(QWidget* item)
 {
-    if (!item || item->focusPolicy() == Qt::NoFocus)
-        return;
-    item->show();
-    item->setFocus();
+    if (item && item->focusPolicy() != Qt::NoFocus)
+        item->setFocus();
 }
 
 void ToolBar::clear()
@@ -105,6 +103,9 @@ void ToolBar::add(ToolBarItem item)
     }
     QWidget* widget = item.takeWidget().release();
     _layout->addWidget(widget);
+    // The layout would show it only later.
+    if (!widget->testAttribute(Qt::WA_WState_ExplicitShowHide))
+        widget->show();
     _items.push_back(widget);
 }
 

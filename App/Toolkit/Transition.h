@@ -13,7 +13,7 @@ class Transition : public QWidget
 {
   public:
     enum class Kind {
-        Fade, ///< the old look fades away over the widget itself
+        Fade, ///< where the looks differ, the old one fades away, then the new one comes
         Push, ///< the new look comes in from the right
         Pop,  ///< the old look goes away to the right
         Rise, ///< the new look comes up over the old one
@@ -23,14 +23,16 @@ class Transition : public QWidget
     /// False where the platform asks for less motion.
     static bool isWanted(const QWidget& widget);
 
-    /// Deletes itself at the end. `after` is not needed for a fade.
-    Transition(Kind kind, QWidget& covered, QPixmap before, QPixmap after = {});
+    /// Deletes itself at the end.
+    Transition(Kind kind, QWidget& covered, QPixmap before, QPixmap after);
 
   protected:
     void paintEvent(QPaintEvent* event) override;
 
   private:
+    void start();
     void draw(QPainter& painter) const;
+    void drawFade(QPainter& painter) const;
     /// Draws the look away from its place by parts of the widget's size, 1 being the whole of it.
     void drawMoved(QPainter& painter, const QPixmap& look, qreal right, qreal down) const;
 

@@ -1,6 +1,7 @@
 #include "Tests/App/TestScreen.h"
 
 #include <QApplication>
+#include <QMenu>
 #include <QTest>
 
 #include <gmock/gmock.h>
@@ -297,6 +298,33 @@ TEST_F(NavigationStackTest, OtherDragsDoNotPop)
     dragFinger(stack, {5, 300}, {52, 300});   // too short
     dragFinger(stack, {300, 300}, {5, 300});  // the other way
     EXPECT_EQ(top(), "Child");
+}
+
+TEST_F(NavigationStackTest, APopTakesTheScreensMenuAlongAndTheEscapeMeantForIt)
+{
+    showAt(stack, 400, 600);
+    push("A");
+    push("B");
+    auto* menu = new QMenu(&stack.topScreen());
+    menu->addAction("Copy");
+    menu->popup({10, 10});
+    ASSERT_TRUE(menu->isVisible());
+    stack.pop(false);
+    EXPECT_FALSE(menu->isVisible());
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    EXPECT_EQ(top(), "A");
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    EXPECT_EQ(top(), "Root");
+}
+
+TEST_F(NavigationStackTest, APopWithoutAMenuLeavesEscapeItsMeaning)
+{
+    showAt(stack, 400, 600);
+    push("A");
+    push("B");
+    stack.pop(false);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    EXPECT_EQ(top(), "Root");
 }
 
 TEST_F(NavigationStackTest, ASwipeDoesNotReachBelowAPresentedScreen)

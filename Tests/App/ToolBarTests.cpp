@@ -1,9 +1,14 @@
 #include "App/Toolkit/ActivityIndicator.h"
+#include "App/Toolkit/ElidingLabel.h"
+#include "App/Toolkit/PushButton.h"
 #include "App/Toolkit/ToolBar.h"
 #include "Tests/App/TestScreen.h"
 
+#include <QPainter>
 #include <QPushButton>
 #include <QTest>
+
+#include <algorithm>
 
 #include <gtest/gtest.h>
 
@@ -21,7 +26,118 @@ std::vector<ToolBarItem> buttonAtTheRight(std::unique_ptr<QPushButton> button)
     return items;
 }
 
+/// A widget of one colour.
+class Filled : public QWidget
+{
+  public:
+    explicit Filled(QColor color) : _color(color) {}
+
+  protected:
+    void paintEvent(QPaintEvent*) override { QPainter(this).fillRect(rect(), _color); }
+
+  private:
+    QColor _color;
+};
+
+bool holdsMixture(const QImage& picture)
+{
+    for (int y = 0; y < picture.height(); ++y)
+        for (int x = 0; x < picture.width(); ++x) {
+            const QColor color = picture.pixelColor(x, y);
+            if (color.red() < 255 && color.blue() < 255)
+                return true;
+        }
+    return false;
+}
+
+bool hasTransition(const QWidget& widget)
+{
+    return std::ranges::any_of(widget.children(), [](const QObject* child) {
+        return dynamic_cast<const Transition*>(child) != nullptr;
+    });
+}
+
+std::vector<ToolBarItem> textAndButton(const QString& text)
+{
+    auto label = std::make_unique<ElidingLabel>();
+    label->setText(text);
+    std::vector<ToolBarItem> items;
+    items.push_back(ToolBarItem::widget(std::move(label)));
+    items.push_back(ToolBarItem::flexibleSpace());
+    items.push_back(ToolBarItem::widget(std::make_unique<PushButton>("Save")));
+    return items;
+}
+
 } // namespace
+
+TEST(Transition, AFadeNeverShowsBothLooksAtOnce)
+{
+    Filled widget(Qt::blue);
+    QPalette palette;
+    palette.setColor(QPalette::Window, Qt::white);
+    widget.setPalette(palette);
+    showAt(widget, 60, 20);
+    QPixmap red(60, 20);
+    red.fill(Qt::red);
+    new Transition(Transition::Kind::Fade, widget, red, widget.grab());
+    int steps = 0;
+    const auto isOver = [&] {
+        EXPECT_FALSE(holdsMixture(widget.grab().toImage()));
+        ++steps;
+        return !hasTransition(widget);
+    };
+    EXPECT_TRUE(QTest::qWaitFor(isOver));
+    EXPECT_GT(steps, 2);
+}
+
+TEST(Transition, AFadeCoversOnlyWhatDiffers)
+{
+    ToolBar bar;
+    bar.setItems(textAndButton("Updated 1"), false);
+    showAt(bar, 400, ToolBar::barHeight);
+    bar.setItems(textAndButton("Updated 2"), true);
+    ASSERT_TRUE(hasTransition(bar));
+    for (const QObject* child : bar.children())
+        if (const auto* fade = dynamic_cast<const Transition*>(child)) {
+            EXPECT_LT(fade->width(), 40);
+            EXPECT_LT(fade->geometry().right(), bar.items()[2]->x());
+        }
+}
+
+TEST(Transition, WhatLooksTheSameIsNotCovered)
+{
+    ToolBar bar;
+    bar.setItems(textAndButton("Updated 1"), false);
+    showAt(bar, 400, ToolBar::barHeight);
+    bar.setItems(textAndButton("Updated 1"), true);
+    deletePopped();
+    EXPECT_FALSE(hasTransition(bar));
+}
+
+TEST(ToolBar, ALongTextAndAButtonGiveWayInANarrowBar)
+{
+    ToolBar bar;
+    const QString text = "Updated 2026-11-16 at 06:10:28";
+    bar.setItems(textAndButton(text), false);
+    showAt(bar, 200, ToolBar::barHeight);
+    EXPECT_EQ(bar.width(), 200);
+    EXPECT_LE(bar.items()[2]->geometry().right(), 200 - 12);
+    const auto& label = dynamic_cast<ElidingLabel&>(*bar.items()[0]);
+    EXPECT_TRUE(label.isElided());
+    EXPECT_EQ(label.toolTip(), text);
+    showAt(bar, 600, ToolBar::barHeight);
+    EXPECT_FALSE(label.isElided());
+    EXPECT_EQ(label.toolTip(), "");
+    EXPECT_EQ(label.size(), label.sizeHint());
+}
+
+TEST(ElidingLabel, ItsToolTipIsNoMarkup)
+{
+    ElidingLabel label;
+    label.setText("<b>far too long for that room</b>");
+    showAt(label, 30, 20);
+    EXPECT_TRUE(label.toolTip().contains("&lt;b&gt;"));
+}
 
 TEST(ToolBar, AFlexibleSpacePushesTheRestToTheRight)
 {

@@ -2,6 +2,7 @@
 
 #include "App/Toolkit/Transition.h"
 #include "App/VentrikCell.h"
+#include "Tests/App/TestScreen.h"
 
 #include <QDir>
 #include <QGuiApplication>
@@ -423,6 +424,25 @@ TEST_F(VentrikAppTest, TheWindowIsLaidOutFromLeftToRightOnEveryDesktop)
     QGuiApplication::setLayoutDirection(Qt::LeftToRight);
     EXPECT_EQ(app.window()->layoutDirection(), Qt::LeftToRight);
     EXPECT_EQ(pane(0).toolbar().items().at(1)->x(), 12);
+}
+
+TEST_F(VentrikAppTest, AWindowKeepsItsSizeHoweverNarrowItIs)
+{
+    launchAndConnect();
+    app.setAllowSaveButton(true);
+    refreshWithData();
+    for (const QSize size : {QSize(320, 568), QSize(200, 480)}) {
+        showAt(*app.window(), size.width(), size.height());
+        refreshWithData();
+        app.showSaveView();
+        QCoreApplication::processEvents();
+        EXPECT_EQ(app.window()->size(), size);
+        app.closeSaveView();
+        QCoreApplication::processEvents();
+        EXPECT_EQ(app.window()->size(), size);
+        EXPECT_EQ(topPane().width(), size.width());
+        EXPECT_LE(saveButton().geometry().right(), size.width() - 12);
+    }
 }
 
 TEST_F(VentrikAppTest, TheMarkerIsTheOneOfInternalBuilds)

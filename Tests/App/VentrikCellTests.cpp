@@ -276,6 +276,50 @@ TEST_F(VentrikCellTest, ALongNameFadesAndIsToldWholeByItsToolTip)
     EXPECT_EQ(cell->toolTip(), longValue);
 }
 
+TEST_F(VentrikCellTest, LineBreaksAndTabsStandAsSpaces)
+{
+    leaf("Two\nlines", "one\ttwo\r\nthree", 500);
+    EXPECT_EQ(cell->key().text(), "Two lines");
+    EXPECT_EQ(cell->value()->text(), "one two  three");
+    EXPECT_EQ(cell->value()->width(), boldWidth("one two  three"));
+}
+
+TEST_F(VentrikCellTest, ValuesOfAllLengthsEndAtTheSamePlace)
+{
+    const auto inkEnd = [this](const QString& value) {
+        leaf("", value, 500);
+        const QImage picture = cell->grab().toImage();
+        const QColor ground = picture.pixelColor(1, 25);
+        for (int x = picture.width() - 1; x > 0; --x)
+            for (int y = 5; y < 45; ++y)
+                if (picture.pixelColor(x, y) != ground)
+                    return x;
+        return 0;
+    };
+    const int end = inkEnd("-9 dBm");
+    EXPECT_NEAR(inkEnd("Measured at some length: -9 dBm"), end, 1);
+    EXPECT_NEAR(end, 500, 4);
+}
+
+TEST_F(VentrikCellTest, TheKeyboardFrameIsWholeAlsoWhereTheEdgeFades)
+{
+    leaf(name, longValue, 300);
+    cell->setKeyboardFrame(true);
+    ASSERT_TRUE(cell->isFading());
+    const QImage picture = cell->grab().toImage();
+    const QColor frame = picture.pixelColor(10, 1);
+    for (int x = 2; x < picture.width() - 2; ++x) {
+        ASSERT_EQ(picture.pixelColor(x, 1), frame) << x;
+        ASSERT_EQ(picture.pixelColor(x, picture.height() - 3), frame) << x;
+    }
+}
+
+TEST_F(VentrikCellTest, AToolTipIsNoMarkup)
+{
+    inner("<b>" + longValue + "</b>", 300);
+    EXPECT_TRUE(cell->toolTip().contains("&lt;b&gt;"));
+}
+
 TEST_F(VentrikCellTest, AValueOutOfSightIsHintedAtByDots)
 {
     leaf(longValue, shortValue, 300);

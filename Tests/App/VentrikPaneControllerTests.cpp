@@ -445,6 +445,38 @@ TEST_F(PaneTest, ASwipeFromTheLeftEdgeOverRowsGoesBack)
     EXPECT_EQ(title(), "Ventrik");
 }
 
+TEST_F(PaneTest, ADragFromTheLeftEdgeOnAMovedValueMovesItBack)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("Mode", std::string(200, 'x'))})}));
+    click(0);
+    cell(0).view()->setContentOffset(300);
+    QTest::mousePress(cell(0).view(), Qt::LeftButton, {}, {5, 25});
+    QTest::mouseMove(cell(0).view(), {105, 25});
+    EXPECT_EQ(cell(0).view()->contentOffset(), 200);
+    QTest::mouseMove(cell(0).view(), {455, 25});
+    QTest::mouseRelease(cell(0).view(), Qt::LeftButton, {}, {455, 25});
+    EXPECT_EQ(title(), "Cell");
+    EXPECT_EQ(cell(0).view()->contentOffset(), 0);
+}
+
+TEST_F(PaneTest, ADragFromTheLeftEdgeOnAValueThatIsAtItsPlaceGoesBack)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("Mode", std::string(200, 'x'))})}));
+    click(0);
+    QTest::mousePress(cell(0).view(), Qt::LeftButton, {}, {5, 25});
+    QTest::mouseMove(cell(0).view(), {105, 25});
+    EXPECT_EQ(title(), "Ventrik");
+    QTest::mouseRelease(root, Qt::LeftButton, {}, {105, 25});
+}
+
+TEST_F(PaneTest, ADoubleClickOpensOneLevel)
+{
+    open(inner("Ventrik", {inner("Cells", {inner("0", {inner("More")})})}));
+    const QPoint place = cell(0).mapTo(stack.get(), QPoint(60, 25));
+    QTest::mouseDClick(stack->windowHandle(), Qt::LeftButton, {}, place);
+    EXPECT_EQ(title(), "Cells");
+}
+
 TEST_F(PaneTest, OfTenThousandRowsOnlyThoseInViewExistBeforeAndAfterAReload)
 {
     const auto numbered = [](const std::string& value) {

@@ -8,6 +8,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMessageBox>
+#include <QMouseEvent>
 #include <QPushButton>
 #include <QTemporaryDir>
 #include <QTest>
@@ -15,6 +16,7 @@
 #include <filesystem>
 #include <fstream>
 #include <set>
+#include <utility>
 
 #include <gmock/gmock.h>
 
@@ -261,8 +263,8 @@ TEST_F(SaveScreenTest, AFailedWriteIsLoggedAndShownAndTheScreenClosesAllTheSame)
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(alert()->isVisible());
     EXPECT_EQ(alert()->windowTitle(), "File Error");
-    EXPECT_EQ(alert()->text(), "<b>File Error</b>");
-    EXPECT_EQ(alert()->informativeText(), "Unable to write file to disk");
+    EXPECT_EQ(alert()->text(), "Unable to write file to disk");
+    EXPECT_EQ(alert()->informativeText(), "");
     ASSERT_EQ(alert()->buttons().size(), 1);
     EXPECT_EQ(alert()->buttons().front()->text(), "Close");
     fake.mainQueue.run();
@@ -300,6 +302,95 @@ TEST_F(SaveScreenTest, EnterHidesTheKeyboardAndKeepsTheText)
     EXPECT_EQ(screen->saveDescription().text(), "drive");
     EXPECT_EQ(closings, 0);
     EXPECT_TRUE(screen->textFieldShouldReturn(screen->saveDescription()));
+}
+
+TEST_F(SaveScreenTest, WhatIsTypedAtOnceIsTheDescription)
+{
+    open(history());
+    QTest::keyClicks(QApplication::focusWidget(), "drive");
+    EXPECT_EQ(screen->saveDescription().text(), "drive");
+}
+
+TEST_F(SaveScreenTest, TheTabKeyWalksDescriptionTableCancelAndSave)
+{
+    open(history());
+    const std::vector<QWidget*> way{&screen->saveContentTable(), &screen->cancelButton(),
+                                    &screen->saveButton(), &screen->saveDescription()};
+    ASSERT_TRUE(fieldHasFocus());
+    for (QWidget* next : way) {
+        const QImage without = next->grab().toImage();
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+        ASSERT_EQ(QApplication::focusWidget(), next);
+        EXPECT_NE(next->grab().toImage(), without);
+    }
+}
+
+TEST_F(SaveScreenTest, EnterInTheDescriptionSaves)
+{
+    open(history());
+    type("drive");
+    QTest::keyClick(&screen->saveDescription(), Qt::Key_Return);
+    EXPECT_EQ(*saved().find("Description"), PlistValue("drive"));
+    fake.mainQueue.run();
+    EXPECT_EQ(closings, 1);
+}
+
+TEST_F(SaveScreenTest, ControlEnterSavesWhereverTheKeyboardIs)
+{
+    for (const Qt::Key key : {Qt::Key_Return, Qt::Key_Enter})
+        for (const bool isOnTable : {true, false}) {
+            open(history());
+            if (isOnTable)
+                screen->saveContentTable().setFocus();
+            QTest::keyClick(QApplication::focusWidget(), key, Qt::ControlModifier);
+            fake.mainQueue.run();
+            EXPECT_EQ(std::exchange(closings, 0), 1) << key << isOnTable;
+        }
+}
+
+TEST_F(SaveScreenTest, EscapeClosesTheAlertWhereverTheKeyboardIs)
+{
+    std::ofstream(directory) << "a file where the directory should be";
+    open(history());
+    press(screen->saveButton());
+    ASSERT_NE(alert(), nullptr);
+    QTest::keyClick(&stack.topScreen(), Qt::Key_Escape);
+    deletePopped();
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(SaveScreenTest, TheAlertDrawsItsTitleItselfWithoutAWindowFrame)
+{
+    std::ofstream(directory) << "a file where the directory should be";
+    open(history());
+    press(screen->saveButton());
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(alert()->windowFlags().testFlag(Qt::FramelessWindowHint));
+    const QImage titled = alert()->grab().toImage();
+    alert()->setWindowTitle("");
+    EXPECT_NE(alert()->grab().toImage(), titled);
+}
+
+TEST_F(SaveScreenTest, TheSecondClickOnWhatOpenedItLeavesTheKeyboard)
+{
+    open(history());
+    QMouseEvent second(QEvent::MouseButtonDblClick, {300, 760},
+                       screen->mapToGlobal(QPointF(300, 760)), Qt::LeftButton, Qt::LeftButton,
+                       Qt::NoModifier);
+    QCoreApplication::sendEvent(screen.get(), &second);
+    EXPECT_TRUE(fieldHasFocus());
+}
+
+TEST_F(SaveScreenTest, FitsIntoANarrowWindow)
+{
+    open(history());
+    for (const int width : {200, 320}) {
+        showAt(stack, width, 480);
+        EXPECT_EQ(stack.width(), width);
+        EXPECT_LE(screen->saveButton().geometry().right(), width - 12);
+        EXPECT_GT(screen->saveButton().width(), 40);
+        EXPECT_LT(screen->cancelButton().geometry().right(), screen->saveButton().x());
+    }
 }
 
 TEST_F(SaveScreenTest, ATouchOnTheBackgroundHidesTheKeyboard)

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <QPushButton>
+
+namespace ventrik
+{
+
+/// A button for a finger that the keyboard can reach. In a narrow window it gives way down to its
+/// text.
+class PushButton : public QPushButton
+{
+  public:
+    explicit PushButton(QWidget* parent = nullptr);
+    explicit PushButton(const QString& text, QWidget* parent = nullptr);
+
+    QSize minimumSizeHint() const override;
+};
+
+} // namespace ventrik

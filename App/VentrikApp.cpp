@@ -1,5 +1,7 @@
 #include "App/VentrikApp.h"
 
+#include "App/Toolkit/PlainText.h"
+
 #include <QGuiApplication>
 #include <QScreen>
 #include <QVBoxLayout>
@@ -12,8 +14,13 @@ namespace ventrik
 namespace
 {
 
+using namespace std::chrono_literals;
+
 constexpr std::string_view homeScreenDomain = "org.ventrik.HomeScreen";
 constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
+
+constexpr auto noteInterval = 1s;
+constexpr auto savedMessageTime = 8s;
 
 constexpr const char* firstStatus = "Connecting";
 constexpr const char* connectingStatus = "Connecting...";
@@ -49,10 +56,12 @@ void VentrikApp::applicationDidFinishLaunching()
     getSaveButtonPref();
     createWindow();
     _model = std::make_shared<VentrikModel>(_platform, [this] { updateViewControllerFromModel(); });
+    _model->setChannelCallback([this] { channelChanged(); });
     setUpdateMessage(connectingStatus);
     createDateFormatter();
     createNavigationStack();
     showWindow();
+    _noteTimer = _platform.mainQueue.repeatEvery(noteInterval, [this] { updateTopNotes(); });
     startModelLater();
 }
 
@@ -114,6 +123,8 @@ void VentrikApp::startModelLater()
 void VentrikApp::applicationWillTerminate()
 {
     _setGSMRSSI(false);
+    _noteTimer.reset();
+    _savedMessage.reset();
     setUpdateMessage(std::nullopt);
     _dateFormatter.reset();
     setSaveViewController(nullptr);
@@ -148,6 +159,18 @@ void VentrikApp::closeSaveView()
     setSaveViewController(nullptr);
 }
 
+void VentrikApp::snapshotSaved(const std::string& fileName)
+{
+    _savedMessage = std::make_shared<const std::string>("Saved to " + fileName);
+    updateTopNotes();
+    _platform.mainQueue.after(savedMessageTime, [this, shown = std::weak_ptr(_savedMessage)] {
+        if (shown.expired())
+            return; // the application is gone, or tells of another file
+        _savedMessage.reset();
+        updateTopNotes();
+    });
+}
+
 void VentrikApp::updateStatusForViewController(VentrikPaneController& pane)
 {
     if (_model->isConnected())
@@ -174,16 +197,71 @@ void VentrikApp::updateViewControllerFromModel()
     if (!_navController)
         return;
     const std::vector<Screen*> screens = _navController->screens();
+    _hasRefreshed = true;
     for (std::size_t i = 0; i < screens.size() && reloadPane(screens, i); ++i) {
     }
-    if (_model->isConnected())
-        setUpdateMessage(_dateFormatter->stringFromDate(_platform.clock.now()));
-    updateStatusForViewController(paneOf(_navController->topScreen()));
+    if (_model->isConnected()) {
+        _lastUpdate = _platform.clock.now();
+        setUpdateMessage(_dateFormatter->stringFromDate(*_lastUpdate));
+    }
+    updateStatusForViewController(topPane());
+    updateWindowTitle();
+}
+
+// Until the first refresh the root pane keeps its first status.
+void VentrikApp::channelChanged()
+{
+    if (!_navController)
+        return;
+    if (_hasRefreshed)
+        updateStatusForViewController(topPane());
+    else
+        updateTopNotes();
+    updateWindowTitle();
+}
+
+VentrikPaneController& VentrikApp::topPane() const
+{
+    return paneOf(_navController->topScreen());
+}
+
+void VentrikApp::updateTopNotes()
+{
+    if (_navController)
+        topPane().updateNotes();
+}
+
+StatusNote VentrikApp::statusNote() const
+{
+    if (_savedMessage)
+        return {*_savedMessage, StatusLabel::NoteKind::Passing};
+    return {_model ? channelNote(ChannelState::of(*_model), _platform.clock, _lastUpdate)
+                   : std::string()};
+}
+
+std::string VentrikApp::reasonForNoData() const
+{
+    return _model ? ventrik::reasonForNoData(ChannelState::of(*_model)) : std::string();
+}
+
+void VentrikApp::updateWindowTitle()
+{
+    QString title = QStringLiteral("Ventrik");
+    const auto add = [&title](const QString& part) {
+        if (!part.isEmpty())
+            title += QStringLiteral(" – ") + oneLine(part);
+    };
+    const std::string_view technology = _model->technologyName();
+    add(QString::fromUtf8(technology.data(), static_cast<qsizetype>(technology.size())));
+    if (_navController->screens().size() > 1)
+        add(topPane().title());
+    _window->setWindowTitle(title);
 }
 
 void VentrikApp::willShowScreen(NavigationStack&, Screen& screen, bool)
 {
     updateStatusForViewController(paneOf(screen));
+    updateWindowTitle();
 }
 
 } // namespace ventrik

@@ -49,6 +49,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
 
     void showSaveView() override;
     void closeSaveView() override;
+    /// The status line tells for some seconds where the file is.
+    void snapshotSaved(const std::string& fileName) override;
 
     void updateStatusForViewController(VentrikPaneController& pane);
     void updateViewControllerFromModel();
@@ -76,6 +78,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     }
     bool allowSaveButton() const override { return _allowSaveButton; }
     bool tintsChanges() const override { return _options.tintsChanges; }
+    StatusNote statusNote() const override;
+    std::string reasonForNoData() const override;
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
 
   private:
@@ -84,6 +88,10 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void createNavigationStack();
     void showWindow();
     void startModelLater();
+    void channelChanged();
+    VentrikPaneController& topPane() const;
+    void updateTopNotes();
+    void updateWindowTitle();
     /// False when the pane's node is gone; the panes above are popped then, and it with them.
     bool reloadPane(const std::vector<Screen*>& screens, std::size_t index);
 
@@ -97,6 +105,10 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     bool _allowSaveButton = false;
     std::unique_ptr<DateFormatter> _dateFormatter;
     std::optional<std::string> _updateMessage;
+    bool _hasRefreshed = false;
+    std::optional<Clock::TimePoint> _lastUpdate;
+    std::shared_ptr<const std::string> _savedMessage; // while it is shown
+    std::unique_ptr<RepeatingTimer> _noteTimer;
 };
 
 } // namespace ventrik

@@ -1,11 +1,12 @@
 #include "App/VentrikPaneController.h"
 
 #include "App/Toolkit/ActivityIndicator.h"
-#include "App/Toolkit/ElidingLabel.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/NavigationStack.h"
+#include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/PushButton.h"
+#include "App/Toolkit/StatusLabel.h"
 #include "App/VentrikCell.h"
 
 #include <utility>
@@ -34,11 +35,17 @@ std::unique_ptr<QWidget> makeIndicator(bool isLoading)
     return indicator;
 }
 
-std::unique_ptr<QWidget> makeStatusLabel(const std::string& status)
+void showNote(const StatusNote& note, StatusLabel& label)
 {
-    auto label = std::make_unique<ElidingLabel>();
+    label.setNote(oneLine(QString::fromStdString(note.text)), note.kind);
+}
+
+std::unique_ptr<QWidget> makeStatusLabel(const std::string& status, const StatusNote& note)
+{
+    auto label = std::make_unique<StatusLabel>();
     label->setFont(systemFont(statusPoints, FontWeight::Regular));
     label->setText(QString::fromStdString(status));
+    showNote(note, *label);
     label->resize(label->sizeHint());
     return label;
 }
@@ -138,11 +145,26 @@ void VentrikPaneController::createToolbarItems()
 {
     std::vector<ToolBarItem> items;
     items.push_back(ToolBarItem::widget(makeIndicator(_isLoading)));
-    items.push_back(ToolBarItem::widget(makeStatusLabel(_status)));
+    items.push_back(ToolBarItem::widget(makeStatusLabel(_status, _host.statusNote())));
     items.push_back(ToolBarItem::flexibleSpace());
     if (_host.allowSaveButton())
         items.push_back(ToolBarItem::widget(makeSaveButton(_host)));
     setToolbarItems(std::move(items), true);
+    table().setPlaceholder(reasonForNoRows());
+}
+
+void VentrikPaneController::updateNotes()
+{
+    for (QWidget* item : toolbar().items())
+        if (auto* label = dynamic_cast<StatusLabel*>(item))
+            showNote(_host.statusNote(), *label);
+    table().setPlaceholder(reasonForNoRows());
+}
+
+QString VentrikPaneController::reasonForNoRows() const
+{
+    return _nodes && _nodes->childNodes() ? QStringLiteral("This list is empty")
+                                          : QString::fromStdString(_host.reasonForNoData());
 }
 
 void VentrikPaneController::setStatus(const std::string& status, bool isLoading)

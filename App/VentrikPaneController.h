@@ -1,5 +1,6 @@
 #pragma once
 
+#include "App/StatusNote.h"
 #include "App/Toolkit/TableScreen.h"
 #include "Model/VentrikModelNode.h"
 
@@ -19,6 +20,10 @@ class VentrikPaneHost
     virtual void showSaveView() = 0;
     /// Whether values that have changed are tinted for a moment.
     virtual bool tintsChanges() const = 0;
+    /// What is said beside the status.
+    virtual StatusNote statusNote() const { return {}; }
+    /// Why there is nothing to show, where a pane has no node that could have rows.
+    virtual std::string reasonForNoData() const { return {}; }
 };
 
 /// A screen that shows the children of one node of the display tree, with the status below. A touch
@@ -32,6 +37,8 @@ class VentrikPaneController : public TableScreen
 
     void createToolbarItems();
     void setStatus(const std::string& status, bool isLoading);
+    /// Asks the host anew for what is said beside the status and on an empty pane.
+    void updateNotes();
     /// Shows another node's children, or nothing.
     void reloadWithNode(ModelNodePointer node);
     const std::string& path() const { return _keyPath; }
@@ -49,6 +56,7 @@ class VentrikPaneController : public TableScreen
     VentrikPaneController(VentrikPaneHost& host, ModelNodePointer node, std::string path);
 
     void updateTitle();
+    QString reasonForNoRows() const;
     const VentrikModelNode::Children& children() const;
     const ModelNodePointer& childAt(IndexPath indexPath) const;
     bool hasChanged(const VentrikModelNode& leaf, int row) const;

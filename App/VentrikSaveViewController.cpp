@@ -153,7 +153,9 @@ void VentrikSaveViewController::viewWillAppear(bool animated)
 void VentrikSaveViewController::savePressed()
 {
     const std::string fileName = snapshotFileName(_directory, _platform.clock.now());
-    if (!writeFile(fileName)) {
+    if (writeFile(fileName)) {
+        _host.snapshotSaved(fileName);
+    } else {
         _platform.log.error("Unable to write snapshot to {}", fileName);
         showFileError();
     }

@@ -26,6 +26,8 @@ class VentrikSaveHost
   public:
     virtual ~VentrikSaveHost() = default;
     virtual void closeSaveView() = 0;
+    /// A snapshot has been written to that file.
+    virtual void snapshotSaved(const std::string& fileName) = 0;
 };
 
 /// The screen that lists what a snapshot will hold, takes a description and writes the snapshot

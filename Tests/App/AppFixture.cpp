@@ -44,10 +44,12 @@ void AppFixture::changeTechnology(std::string_view technology)
         writeXmlPropertyList(PlistDictionary{{"GetTechnology", technology}}).text.value();
     fake.ports.setDefaultResult({PortError::success, Bytes(answer.begin(), answer.end())});
     fake.ports.listen(remoteName);
+    fake.telephony.setServiceAvailable(true);
 }
 
 void AppFixture::loseService()
 {
+    fake.telephony.setServiceAvailable(false);
     fake.ports.killRemote(remoteName);
 }
 
@@ -89,7 +91,17 @@ void AppFixture::openRow(int row)
 
 std::string AppFixture::statusText(const VentrikPaneController& pane)
 {
-    return dynamic_cast<QLabel&>(*pane.toolbar().items().at(1)).text().toStdString();
+    return statusLabel(pane).text().toStdString();
+}
+
+StatusLabel& AppFixture::statusLabel(const VentrikPaneController& pane)
+{
+    return dynamic_cast<StatusLabel&>(*pane.toolbar().items().at(1));
+}
+
+std::string AppFixture::note(const VentrikPaneController& pane)
+{
+    return statusLabel(pane).note().toStdString();
 }
 
 bool AppFixture::isSpinning(const VentrikPaneController& pane)

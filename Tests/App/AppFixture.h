@@ -37,6 +37,10 @@ class AppFixture : public testing::Test
     std::vector<std::string> titles();
     void openRow(int row);
     static std::string statusText(const VentrikPaneController& pane);
+    static StatusLabel& statusLabel(const VentrikPaneController& pane);
+    /// What is said beside the status.
+    static std::string note(const VentrikPaneController& pane);
+    std::string windowTitle() { return app.window()->windowTitle().toStdString(); }
     static bool isSpinning(const VentrikPaneController& pane);
 
     FakePlatform fake;

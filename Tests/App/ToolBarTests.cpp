@@ -1,6 +1,7 @@
 #include "App/Toolkit/ActivityIndicator.h"
 #include "App/Toolkit/ElidingLabel.h"
 #include "App/Toolkit/PushButton.h"
+#include "App/Toolkit/StatusLabel.h"
 #include "App/Toolkit/ToolBar.h"
 #include "Tests/App/TestScreen.h"
 
@@ -129,6 +130,74 @@ TEST(ToolBar, ALongTextAndAButtonGiveWayInANarrowBar)
     EXPECT_FALSE(label.isElided());
     EXPECT_EQ(label.toolTip(), "");
     EXPECT_EQ(label.size(), label.sizeHint());
+}
+
+class StatusLabelTest : public testing::Test
+{
+  protected:
+    StatusLabelTest()
+    {
+        auto made = std::make_unique<StatusLabel>();
+        label = made.get();
+        label->setText("Connecting...");
+        std::vector<ToolBarItem> items;
+        items.push_back(ToolBarItem::widget(std::move(made)));
+        items.push_back(ToolBarItem::flexibleSpace());
+        bar.setItems(std::move(items), false);
+    }
+    void showBar(int width) { showAt(bar, width, ToolBar::barHeight); }
+
+    ToolBar bar;
+    StatusLabel* label;
+};
+
+TEST_F(StatusLabelTest, ANoteIsASecondLineInAWideBar)
+{
+    showBar(600);
+    const QSize before = label->size();
+    label->setNote("last update 14:54:14 · no service", StatusLabel::NoteKind::Lasting);
+    QCoreApplication::processEvents();
+    EXPECT_TRUE(label->showsNoteBelow());
+    EXPECT_GT(label->height(), before.height());
+    EXPECT_GT(label->width(), before.width());
+    EXPECT_EQ(label->size(), label->sizeHint());
+}
+
+TEST_F(StatusLabelTest, ANoteLeavesANarrowBarAsItIs)
+{
+    showBar(400);
+    const QImage before = bar.grab().toImage();
+    label->setNote("last update 14:54:14 · no service", StatusLabel::NoteKind::Lasting);
+    QCoreApplication::processEvents();
+    EXPECT_EQ(bar.grab().toImage(), before);
+    EXPECT_EQ(label->toolTip(), "last update 14:54:14 · no service");
+    EXPECT_EQ(label->accessibleDescription(), "last update 14:54:14 · no service");
+}
+
+TEST_F(StatusLabelTest, ANoteComesAndGoesWithTheWidthOfTheBar)
+{
+    showBar(400);
+    label->setNote("no service", StatusLabel::NoteKind::Lasting);
+    showBar(600);
+    EXPECT_TRUE(label->showsNoteBelow());
+    EXPECT_EQ(label->size(), label->sizeHint());
+    showBar(400);
+    EXPECT_FALSE(label->showsNoteBelow());
+    EXPECT_EQ(label->size(), label->sizeHint());
+}
+
+TEST_F(StatusLabelTest, APassingNoteStandsInPlaceOfTheStatusInANarrowBar)
+{
+    showBar(400);
+    const QImage before = bar.grab().toImage();
+    label->setNote("Saved to /tmp/a.ventrik", StatusLabel::NoteKind::Passing);
+    QCoreApplication::processEvents();
+    EXPECT_TRUE(label->showsNoteInstead());
+    EXPECT_EQ(label->text(), "Connecting...");
+    EXPECT_NE(bar.grab().toImage(), before);
+    label->setNote({}, StatusLabel::NoteKind::Lasting);
+    QCoreApplication::processEvents();
+    EXPECT_EQ(bar.grab().toImage(), before);
 }
 
 TEST(ElidingLabel, ItsToolTipIsNoMarkup)

@@ -35,6 +35,8 @@ class PaneTest : public testing::Test, public VentrikPaneHost
     bool allowSaveButton() const override { return savesAllowed; }
     void showSaveView() override { ++savePresses; }
     bool tintsChanges() const override { return changesTinted; }
+    StatusNote statusNote() const override { return note; }
+    std::string reasonForNoData() const override { return noData; }
 
     void open(ModelNodePointer node, std::string path = "/")
     {
@@ -67,6 +69,8 @@ class PaneTest : public testing::Test, public VentrikPaneHost
     bool savesAllowed = false;
     bool changesTinted = true;
     int savePresses = 0;
+    StatusNote note;
+    std::string noData = "No service";
     VentrikPaneController* root = nullptr;
     std::unique_ptr<NavigationStack> stack;
 };
@@ -78,6 +82,36 @@ TEST_F(PaneTest, WithoutANodeThereAreNoRowsAndTheTitleIsTheProducts)
     open(nullptr);
     EXPECT_EQ(title(), "Ventrik");
     EXPECT_TRUE(top().table().visibleRows().empty());
+}
+
+TEST_F(PaneTest, WithoutANodeThePaneSaysWhyThereIsNoData)
+{
+    open(nullptr);
+    EXPECT_EQ(top().table().placeholder(), "No service");
+    noData = "No data yet";
+    root->updateNotes();
+    EXPECT_EQ(top().table().placeholder(), "No data yet");
+}
+
+TEST_F(PaneTest, AnEmptyListSaysThatItIs)
+{
+    open(inner("Ventrik", {inner("Empty")}));
+    click(0);
+    EXPECT_EQ(top().table().placeholder(), "This list is empty");
+}
+
+TEST_F(PaneTest, TheNoteOfTheHostStandsBesideTheStatus)
+{
+    open(nullptr);
+    note = {"no\nservice", StatusLabel::NoteKind::Lasting};
+    root->setStatus("Connecting...", true);
+    auto& label = dynamic_cast<StatusLabel&>(status(*root));
+    EXPECT_EQ(label.text(), "Connecting...");
+    EXPECT_EQ(label.note(), "no service");
+    note.text.clear();
+    root->updateNotes();
+    EXPECT_EQ(&status(*root), &label);
+    EXPECT_EQ(label.note(), "");
 }
 
 TEST_F(PaneTest, ALeafAsNodeGivesNoRows)

@@ -49,6 +49,7 @@ class SaveScreenTest : public testing::Test, public VentrikSaveHost
         showAt(stack, 390, 780);
     }
     void closeSaveView() override { ++closings; }
+    void snapshotSaved(const std::string& fileName) override { savedFiles.push_back(fileName); }
 
     VentrikSaveViewController& open(const std::optional<PlistValue>& saveContents)
     {
@@ -96,6 +97,7 @@ class SaveScreenTest : public testing::Test, public VentrikSaveHost
     Events events;
     NavigationStack stack{std::make_unique<TestScreen>("Root", events)};
     int closings = 0;
+    std::vector<std::string> savedFiles;
     std::unique_ptr<VentrikSaveViewController> screen;
 };
 
@@ -159,6 +161,21 @@ TEST_F(SaveScreenTest, SaveWritesTheTimeOfOpeningTheHistoryAndTheDescription)
               (PlistDictionary{{"Timestamp", "2026-11-16 06:10:28 +0000"},
                                {"Data", history()},
                                {"Description", "On the road"}}));
+}
+
+TEST_F(SaveScreenTest, TheApplicationIsToldWhereTheFileIs)
+{
+    open(history());
+    press(screen->saveButton());
+    EXPECT_THAT(savedFiles, ElementsAre(directory + "/VentrikSnapshot-1794809428.ventrik"));
+}
+
+TEST_F(SaveScreenTest, OfAFailedWriteTheApplicationIsToldNoFile)
+{
+    std::ofstream(directory) << "a file where the directory should be";
+    open(history());
+    press(screen->saveButton());
+    EXPECT_THAT(savedFiles, IsEmpty());
 }
 
 TEST_F(SaveScreenTest, AnEmptyDescriptionIsWrittenEmpty)

@@ -1,0 +1,105 @@
+#include "App/Toolkit/StatusLabel.h"
+
+#include "App/Toolkit/Fonts.h"
+
+#include <QEvent>
+#include <QPainter>
+
+#include <algorithm>
+
+namespace ventrik
+{
+
+namespace
+{
+
+QFont noteFont()
+{
+    return systemFont(11, FontWeight::Regular);
+}
+
+} // namespace
+
+void StatusLabel::setNote(const QString& note, NoteKind kind)
+{
+    if (note == _note && kind == _kind)
+        return;
+    _note = note;
+    _kind = kind;
+    setAccessibleDescription(note);
+    layOutAgain();
+}
+
+void StatusLabel::layOutAgain()
+{
+    updateGeometry();
+    updateTip();
+    update();
+}
+
+bool StatusLabel::showsNoteBelow() const
+{
+    return !_note.isEmpty() && parentWidget() && parentWidget()->width() >= widthForTwoLines;
+}
+
+bool StatusLabel::showsNoteInstead() const
+{
+    return !_note.isEmpty() && _kind == NoteKind::Passing && !showsNoteBelow();
+}
+
+QSize StatusLabel::sizeHint() const
+{
+    const QSize status = ElidingLabel::sizeHint();
+    if (showsNoteInstead())
+        return {measured(_note, font()).width(), status.height()};
+    if (!showsNoteBelow())
+        return status;
+    const QSize below = measured(_note, noteFont());
+    return {std::max(status.width(), below.width()), status.height() + below.height()};
+}
+
+QString StatusLabel::tip() const
+{
+    const QString status = ElidingLabel::tip();
+    return status.isEmpty() || _note.isEmpty() ? status + _note : status + u'\n' + _note;
+}
+
+bool StatusLabel::event(QEvent* event)
+{
+    if (event->type() == QEvent::ParentAboutToChange && parentWidget())
+        parentWidget()->removeEventFilter(this);
+    if (event->type() == QEvent::ParentChange && parentWidget())
+        parentWidget()->installEventFilter(this);
+    return ElidingLabel::event(event);
+}
+
+// The bar's width tells whether there is a second line.
+bool StatusLabel::eventFilter(QObject* receiver, QEvent* event)
+{
+    if (event->type() == QEvent::Resize && receiver == parentWidget())
+        layOutAgain();
+    return ElidingLabel::eventFilter(receiver, event);
+}
+
+void StatusLabel::paintEvent(QPaintEvent* event)
+{
+    if (!showsNoteBelow() && !showsNoteInstead()) {
+        ElidingLabel::paintEvent(event);
+        return;
+    }
+    QPainter painter(this);
+    QColor color = palette().color(foregroundRole());
+    painter.setPen(color);
+    if (showsNoteInstead()) {
+        drawLine(painter, rect(), _note);
+        return;
+    }
+    const int statusHeight = ElidingLabel::sizeHint().height();
+    drawLine(painter, {0, 0, width(), statusHeight}, text());
+    color.setAlphaF(0.7F);
+    painter.setPen(color);
+    painter.setFont(noteFont());
+    drawLine(painter, rect().adjusted(0, statusHeight, 0, 0), _note);
+}
+
+} // namespace ventrik

@@ -199,13 +199,13 @@ void VentrikCell::placeValue()
     // Measured in the key's font, which is the wider one: a value has some air.
     const QSize size = measured(_value->text(), boldFont());
     const int needed = keyWidth + roomAroundKey + size.width();
-    const bool isAtTheRight = needed < bounds.width();
-    const int left =
-        isAtTheRight ? bounds.width() - size.width() : bounds.x() + keyWidth + roomAroundKey;
+    const int left = needed < bounds.width() ? bounds.width() - size.width()
+                                             : bounds.x() + keyWidth + roomAroundKey;
     _value->setGeometry(left, centredTop(bounds, size), size.width(), size.height());
-    // There the air goes to the left, so that all values end at one line.
-    const int air = size.width() - measured(_value->text(), _value->font()).width();
-    _value->setContentsMargins(isAtTheRight ? std::max(0, air) : 0, 0, 0, 0);
+    // The air goes to the left as far as there is room, so that all values end at one line.
+    const int textWidth = measured(_value->text(), _value->font()).width();
+    const int air = std::max(0, size.width() - textWidth);
+    _value->setContentsMargins(std::clamp(bounds.width() - left - textWidth, 0, air), 0, 0, 0);
     const int scrolledWidth =
         needed > bounds.width() ? bounds.width() + keyWidth + size.width() : bounds.width();
     _view->setGeometry(bounds.x(), bounds.y(), bounds.width(), scrolledHeight);

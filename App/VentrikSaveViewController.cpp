@@ -108,6 +108,7 @@ void VentrikSaveViewController::viewDidLoad()
     // The screen has the keyboard after a touch on it, but the Tab key passes it by.
     setFocusPolicy(Qt::ClickFocus);
     _layout->titleLabel->setFont(systemFont(titlePoints, FontWeight::Bold));
+    _layout->titleLabel->setElideMode(Qt::ElideRight);
     for (QLabel* label : {_layout->descriptionLabel, _layout->contentLabel})
         label->setFont(systemFont(labelPoints, FontWeight::Regular));
     saveDescription().setFont(systemFont(fieldPoints, FontWeight::Regular));
@@ -123,6 +124,7 @@ void VentrikSaveViewController::viewDidLoad()
 
     TableView& table = saveContentTable();
     table.setDataSource(*this);
+    table.setPlaceholder(QStringLiteral("Nothing has come yet"));
     table.reloadData();
     table.setMaximumHeight(std::max(table.contentHeight(), TableView::rowHeight));
 }

@@ -3,6 +3,7 @@
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/PlainText.h"
 
+#include <QEvent>
 #include <QPainter>
 
 #include <algorithm>
@@ -50,6 +51,13 @@ void ElidingLabel::updateTip()
     setToolTip(plainToolTip(tip()));
 }
 
+void ElidingLabel::changeEvent(QEvent* event)
+{
+    QLabel::changeEvent(event);
+    if (event->type() == QEvent::FontChange)
+        updateTip();
+}
+
 void ElidingLabel::resizeEvent(QResizeEvent* event)
 {
     QLabel::resizeEvent(event);
@@ -60,7 +68,7 @@ void ElidingLabel::drawLine(QPainter& painter, const QRect& line, const QString&
 {
     const Qt::Alignment sideways = alignment() & Qt::AlignHorizontal_Mask;
     painter.drawText(line, static_cast<int>(sideways | Qt::AlignVCenter) | Qt::TextSingleLine,
-                     painter.fontMetrics().elidedText(text, Qt::ElideMiddle, line.width()));
+                     painter.fontMetrics().elidedText(text, elideMode(), line.width()));
 }
 
 void ElidingLabel::paintEvent(QPaintEvent*)

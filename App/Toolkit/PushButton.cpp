@@ -11,7 +11,9 @@ namespace
 {
 
 constexpr int leastHeight = 32;
-constexpr int besideText = 10;
+constexpr int leastWidth = 60;
+constexpr int besideTextAsARule = 16;
+constexpr int besideTextAtLeast = 8;
 
 } // namespace
 
@@ -24,11 +26,19 @@ PushButton::PushButton(const QString& text, QWidget* parent) : QPushButton(text,
     setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Fixed);
 }
 
+int PushButton::widthWith(int besideText) const
+{
+    return measured(text(), font()).width() + 2 * besideText;
+}
+
+QSize PushButton::sizeHint() const
+{
+    return {std::max(leastWidth, widthWith(besideTextAsARule)), QPushButton::sizeHint().height()};
+}
+
 QSize PushButton::minimumSizeHint() const
 {
-    const QSize wanted = sizeHint();
-    const int least = measured(text(), font()).width() + 2 * besideText;
-    return {std::min(wanted.width(), least), wanted.height()};
+    return {widthWith(besideTextAtLeast), sizeHint().height()};
 }
 
 } // namespace ventrik

@@ -13,7 +13,11 @@ class PushButton : public QPushButton
     explicit PushButton(QWidget* parent = nullptr);
     explicit PushButton(const QString& text, QWidget* parent = nullptr);
 
+    QSize sizeHint() const override;
     QSize minimumSizeHint() const override;
+
+  private:
+    int widthWith(int besideText) const;
 };
 
 } // namespace ventrik

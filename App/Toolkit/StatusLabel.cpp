@@ -64,6 +64,13 @@ QString StatusLabel::tip() const
     return status.isEmpty() || _note.isEmpty() ? status + _note : status + u'\n' + _note;
 }
 
+// What is left of a status in a very narrow bar is to be its end, the time of day.
+Qt::TextElideMode StatusLabel::elideMode() const
+{
+    const bool isCramped = 3 * width() < 2 * measured(text(), font()).width();
+    return isCramped && !showsNoteInstead() ? Qt::ElideLeft : Qt::ElideMiddle;
+}
+
 bool StatusLabel::event(QEvent* event)
 {
     if (event->type() == QEvent::ParentAboutToChange && parentWidget())

@@ -29,6 +29,7 @@ class StatusLabel : public ElidingLabel
 
   protected:
     QString tip() const override;
+    Qt::TextElideMode elideMode() const override;
     bool event(QEvent* event) override;
     bool eventFilter(QObject* receiver, QEvent* event) override;
     void paintEvent(QPaintEvent* event) override;

@@ -1,5 +1,6 @@
 #include "App/Toolkit/TableRow.h"
 
+#include "App/Toolkit/ElidingLabel.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/Separator.h"
@@ -36,8 +37,8 @@ TableRow::TableRow(Style style, QString reuseIdentifier)
 QLabel& TableRow::textLabel()
 {
     if (!_textLabel) {
-        _textLabel = makeLabel(systemFont(textPoints, FontWeight::Regular), _contentArea);
-        _textLabel->setAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+        _textLabel = new ElidingLabel(_contentArea);
+        _textLabel->setFont(systemFont(textPoints, FontWeight::Regular));
         layoutSubviews();
     }
     return *_textLabel;
@@ -46,7 +47,8 @@ QLabel& TableRow::textLabel()
 void TableRow::setText(const QString& text)
 {
     textLabel().setText(oneLine(text));
-    setAccessibleName(textLabel().text());
+    _textLabel->updateTip();
+    setAccessibleName(_textLabel->text());
 }
 
 void TableRow::setAccessory(TableRowAccessory accessory)

@@ -8,6 +8,8 @@ class QLabel;
 namespace ventrik
 {
 
+class ElidingLabel;
+
 /// What a row shows at its right edge.
 enum class TableRowAccessory { None, DisclosureIndicator, CheckMark };
 
@@ -57,7 +59,7 @@ class TableRow : public QWidget
     Style _style;
     QString _reuseIdentifier;
     QWidget* _contentArea;
-    QLabel* _textLabel = nullptr;
+    ElidingLabel* _textLabel = nullptr;
     TableRowAccessory _accessory = TableRowAccessory::None;
     bool _isSelected = false;
     bool _hasKeyboardFrame = false;

@@ -151,6 +151,22 @@ class StatusLabelTest : public testing::Test
     StatusLabel* label;
 };
 
+TEST_F(StatusLabelTest, InAVeryNarrowBarTheEndOfTheStatusStays)
+{
+    const auto rightHalf = [this] {
+        const QImage picture = label->grab().toImage();
+        return picture.copy(picture.width() / 2, 0, picture.width(), picture.height());
+    };
+    label->setText("Updated 2026-11-16 at 06:10:28");
+    showBar(110);
+    ASSERT_TRUE(label->isElided());
+    const QImage morning = rightHalf();
+    label->setText("Updated 2026-11-16 at 21:10:28");
+    EXPECT_NE(rightHalf(), morning);
+    label->setText("Different 2026-11-16 at 06:10:28");
+    EXPECT_EQ(rightHalf(), morning);
+}
+
 TEST_F(StatusLabelTest, ANoteIsASecondLineInAWideBar)
 {
     showBar(600);

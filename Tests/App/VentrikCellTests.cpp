@@ -301,6 +301,21 @@ TEST_F(VentrikCellTest, ValuesOfAllLengthsEndAtTheSamePlace)
     EXPECT_NEAR(end, 500, 4);
 }
 
+TEST_F(VentrikCellTest, AValueThatOnlyJustFitsEndsThereToo)
+{
+    const int width = boldWidth(name) + 60 + boldWidth(shortValue);
+    leaf(name, shortValue, width);
+    const int textWidth = QFontMetrics(font15(false)).size(Qt::TextSingleLine, shortValue).width();
+    ASSERT_LT(textWidth, boldWidth(shortValue));
+    EXPECT_EQ(cell->value()->x() + cell->value()->contentsRect().left() + textWidth, width);
+}
+
+TEST_F(VentrikCellTest, AValueThatGoesOnBeyondTheEdgeKeepsItsPlace)
+{
+    leaf(name, longValue, 300);
+    EXPECT_EQ(cell->value()->contentsRect().left(), 0);
+}
+
 TEST_F(VentrikCellTest, TheKeyboardFrameIsWholeAlsoWhereTheEdgeFades)
 {
     leaf(name, longValue, 300);

@@ -410,6 +410,19 @@ TEST_F(SaveScreenTest, FitsIntoANarrowWindow)
     }
 }
 
+TEST_F(SaveScreenTest, ARowsTextGivesWayToItsCheckMark)
+{
+    open(history());
+    EXPECT_EQ(row(0).textLabel().toolTip(), "");
+    showAt(stack, 200, 480);
+    EXPECT_EQ(row(0).textLabel().toolTip(), "Snapshot (2026-11-16 06:10:26 +0000)");
+}
+
+TEST_F(SaveScreenTest, AnEmptyTableSaysWhy)
+{
+    EXPECT_NE(open(PlistArray()).saveContentTable().placeholder(), "");
+}
+
 TEST_F(SaveScreenTest, ATouchOnTheBackgroundHidesTheKeyboard)
 {
     open(history());

@@ -7,7 +7,9 @@
 #include <QTimer>
 
 #include <array>
+#include <cstdio>
 #include <cstdlib>
+#include <utility>
 
 namespace ventrik
 {
@@ -71,9 +73,51 @@ class Typist : public QObject
     std::size_t _step = 0;
 };
 
+/// Somebody who reads: writes on standard error what the window says, each time it says something
+/// else, as "WIDTHxHEIGHT TITLE | STATUS | WHAT STANDS BESIDE IT".
+class WindowReader : public QObject
+{
+  public:
+    WindowReader()
+    {
+        connect(&_timer, &QTimer::timeout, this, [this] { read(); });
+        _timer.start(50);
+    }
+
+  private:
+    static QLabel* statusLabel(const QWidget& window)
+    {
+        for (QLabel* label : window.findChildren<QLabel*>())
+            if (label->isVisible() &&
+                (label->text().startsWith("Connecting") || label->text().startsWith("Updated ")))
+                return label;
+        return nullptr;
+    }
+
+    void read()
+    {
+        for (const QWidget* window : QApplication::topLevelWidgets()) {
+            const QLabel* status = window->isVisible() ? statusLabel(*window) : nullptr;
+            if (!status)
+                continue;
+            const QString line =
+                QStringLiteral("%1x%2 %3 | %4 | %5\n")
+                    .arg(window->width())
+                    .arg(window->height())
+                    .arg(window->windowTitle(), status->text(), status->accessibleDescription());
+            if (line != std::exchange(_last, line))
+                std::fputs(line.toUtf8().constData(), stderr);
+        }
+    }
+
+    QTimer _timer;
+    QString _last;
+};
+
 } // namespace
 
-/// The typist as an input device of the toolkit's, for a program that knows nothing of it.
+/// The typist or the reader as an input device of the toolkit's, for a program that knows nothing
+/// of it.
 class TypistPlugin : public QGenericPlugin
 {
     Q_OBJECT
@@ -82,6 +126,8 @@ class TypistPlugin : public QGenericPlugin
   public:
     QObject* create(const QString&, const QString& argument) override
     {
+        if (argument == "reads")
+            return new WindowReader;
         return new Typist(argument == "loses-display");
     }
 };

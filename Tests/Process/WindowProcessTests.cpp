@@ -5,6 +5,7 @@
 #include <csignal>
 #include <filesystem>
 #include <fstream>
+#include <regex>
 
 #include <fmt/format.h>
 
@@ -72,6 +73,17 @@ class WindowProcess : public ToolUsageFixture
         auto window = start("ventrik", {"--verbose"});
         EXPECT_TRUE(waitUntil([&] { return window->says(timerStarted); })) << window->errors();
         return window;
+    }
+    /// A window that somebody reads.
+    ProgramPointer startReadWindow(const Arguments& arguments)
+    {
+        environment.insert("QT_PLUGIN_PATH", VENTRIK_TEST_PLUGINS);
+        environment.insert("QT_QPA_GENERIC_PLUGINS", "typist:reads");
+        return start("ventrik", arguments);
+    }
+    static bool saysLine(const Program& program, const std::string& pattern)
+    {
+        return std::regex_search(program.errors(), std::regex(pattern));
     }
     std::string homeScreenPreferences() const
     {
@@ -158,6 +170,46 @@ TEST_F(WindowProcess, ResetsTheHomeScreenAlsoWhenTheDisplayGoesAway)
     const auto window = start("ventrik", {});
     EXPECT_EQ(window->waitForEnd(), 1) << window->errors();
     EXPECT_EQ(homeScreenPreferences(), "[General]\nHSShowGSMRSSI=false\n");
+}
+
+TEST_F(WindowProcess, SaysWhyTheChannelIsDownOnceTheServiceHasDied)
+{
+    const auto service = startScenario();
+    const auto window = startReadWindow({"--verbose"});
+    EXPECT_TRUE(waitUntil([&] { return window->says("Ventrik – LTE | Updated "); }))
+        << window->errors();
+    service->kill();
+    EXPECT_TRUE(waitUntil([&] {
+        return saysLine(*window, R"(Connecting\.\.\. \| last update [0-9:]{8} · no service)");
+    })) << window->errors();
+}
+
+TEST_F(WindowProcess, SaysThatAnotherViewerHoldsThePort)
+{
+    const auto service = startScenario();
+    const auto first = startWindow();
+    const auto second = startReadWindow({});
+    EXPECT_TRUE(waitUntil([&] { return second->says("another viewer holds the port"); }))
+        << second->errors();
+}
+
+TEST_F(WindowProcess, WritesTimesTheSameInEveryLanguage)
+{
+    const auto service = startScenario();
+    environment.insert("LC_ALL", "ar_EG.UTF-8");
+    const auto window = startReadWindow({});
+    EXPECT_TRUE(waitUntil([&] { return window->says("| Updated "); })) << window->errors();
+    EXPECT_TRUE(saysLine(*window, "Updated [0-9]{4}-[0-9]{2}-[0-9]{2} at [0-9:]{8}"))
+        << window->errors();
+}
+
+TEST_F(WindowProcess, KeepsTheSizeThatItIsGiven)
+{
+    const auto service = startScenario();
+    const auto window = startReadWindow({"--save-button", "--size", "200x480"});
+    EXPECT_TRUE(waitUntil([&] { return window->says("| Updated "); })) << window->errors();
+    EXPECT_EQ(count(window->errors(), " | "), 2 * count(window->errors(), "200x480 Ventrik"))
+        << window->errors();
 }
 
 TEST_F(WindowProcess, TellsTheSessionBusThatThePreferenceHasChanged)

@@ -1,6 +1,6 @@
 #include "Model/TreePrinter.h"
 
-#include <algorithm>
+#include "PropertyList/TerminalText.h"
 
 namespace ventrik
 {
@@ -8,21 +8,13 @@ namespace ventrik
 namespace
 {
 
-void appendClean(std::string& text, std::string_view part)
-{
-    std::ranges::transform(part, std::back_inserter(text), [](char character) {
-        const auto code = static_cast<unsigned char>(character);
-        return code < 0x20 || code == 0x7F ? ' ' : character;
-    });
-}
-
 void appendNode(std::string& text, const VentrikModelNode& node, std::size_t level)
 {
     text.append(2 * level, ' ');
-    appendClean(text, node.displayName());
+    appendTerminalText(text, node.displayName());
     if (node.value()) {
         text += ": ";
-        appendClean(text, *node.value());
+        appendTerminalText(text, *node.value());
     }
     text += '\n';
     if (node.childNodes())

@@ -7,9 +7,9 @@
 namespace ventrik
 {
 
-/// The tree as text: a line a node, children two blanks further in, leaves as "name: value". Line
-/// breaks and other control characters in names and values show as blanks, so that a line stays a
-/// line and a terminal obeys nothing that came from outside.
+/// The tree as text: a line a node, children two blanks further in, leaves as "name: value". Names
+/// and values show as `appendTerminalText` has them, so that a line stays a line and a terminal
+/// obeys nothing that came from outside.
 std::string printTree(const VentrikModelNode& root);
 
 } // namespace ventrik

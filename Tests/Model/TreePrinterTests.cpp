@@ -22,4 +22,15 @@ TEST(TreePrinter, ShowsControlCharactersAsBlanks)
               "Ventrik\n  a b: c [2Jd \n  \xc3\xa9: \xe2\x82\xac\n");
 }
 
+TEST(TreePrinter, LetsNothingFromOutsideReachTheTerminalUncleaned)
+{
+    const PlistValue object = PlistDictionary{{"a\xc2\x9b"
+                                               "2J",
+                                               "b\xe2\x80\xae"
+                                               "c\xff"}};
+    PathIndex index;
+    EXPECT_EQ(printTree(*VentrikModelNode::makeTreeFromObject(&object, index)),
+              "Ventrik\n  a 2J: b c\xef\xbf\xbd\n");
+}
+
 } // namespace ventrik

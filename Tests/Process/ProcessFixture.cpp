@@ -75,6 +75,17 @@ ProcessFixture::ProgramPointer ProcessFixture::start(const std::string& name,
     return std::make_unique<Program>(VENTRIK_PROGRAMS "/" + name, arguments, environment, output);
 }
 
+ProcessFixture::ProgramPointer ProcessFixture::startInShell(const std::string& name,
+                                                            const Arguments& arguments,
+                                                            const std::string& setup,
+                                                            const std::string& redirections) const
+{
+    Arguments all{"-c", setup + "\nexec \"$0\" \"$@\" " + redirections,
+                  VENTRIK_PROGRAMS "/" + name};
+    all.insert(all.end(), arguments.begin(), arguments.end());
+    return std::make_unique<Program>("/bin/sh", all, environment);
+}
+
 ProcessFixture::ProgramPointer ProcessFixture::startService(const Arguments& arguments) const
 {
     return startListening("ventrik-telephony", arguments);

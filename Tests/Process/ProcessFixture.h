@@ -35,6 +35,11 @@ class ProcessFixture : public testing::Test
     /// One of our programs.
     ProgramPointer start(const std::string& name, const Arguments& arguments,
                          Program::Output output = Program::Output::Kept) const;
+    /// One of our programs, in whose place a shell was before: it has run `setup`, and the program
+    /// has the redirections.
+    ProgramPointer startInShell(const std::string& name, const Arguments& arguments,
+                                const std::string& setup,
+                                const std::string& redirections = "") const;
     /// A telephony service, once it listens.
     ProgramPointer startService(const Arguments& arguments) const;
     ProgramPointer startScenario() const { return startService({"--technology", "lte"}); }

@@ -1,0 +1,80 @@
+#include "Tests/Process/ProcessFixture.h"
+
+#include <csignal>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+
+class EndSignal : public ProcessFixture
+{
+  protected:
+    ProgramPointer startSlowEnd()
+    {
+        auto program = start("slow-end", {});
+        EXPECT_TRUE(waitUntil([&] { return program->prints("running\n"); }));
+        return program;
+    }
+};
+
+} // namespace
+
+TEST_F(EndSignal, BelongsToAnotherOneThatIsPendingWithIt)
+{
+    const auto program = startSlowEnd();
+    program->send(SIGSTOP);
+    for (const int number : {SIGHUP, SIGTERM, SIGINT})
+        program->send(number);
+    program->send(SIGCONT);
+    EXPECT_EQ(program->waitForEnd(), 0);
+    EXPECT_EQ(program->output(), "running\nasked\nended\n");
+}
+
+TEST_F(EndSignal, BelongsToOneThatCameJustBefore)
+{
+    const auto program = startSlowEnd();
+    program->send(SIGHUP);
+    ASSERT_TRUE(waitUntil([&] { return program->prints("asked\n"); }));
+    program->send(SIGTERM);
+    program->send(SIGHUP);
+    EXPECT_EQ(program->waitForEnd(), 0);
+    EXPECT_EQ(program->output(), "running\nasked\nended\n");
+}
+
+TEST_F(EndSignal, ThatComesLaterEndsTheProcessAtOnce)
+{
+    const auto program = startSlowEnd();
+    program->send(SIGTERM);
+    ASSERT_TRUE(waitUntil([&] { return program->prints("asked\n"); }));
+    waitUntil([] { return false; }, 1500ms);
+    program->send(SIGTERM);
+    EXPECT_EQ(program->waitForEnd(), 128 + SIGTERM);
+    EXPECT_EQ(program->output(), "running\nasked\n");
+}
+
+TEST_F(EndSignal, ThatItWasStartedToIgnoreStaysIgnored)
+{
+    const auto program = startInShell("slow-end", {}, "trap '' HUP INT");
+    ASSERT_TRUE(waitUntil([&] { return program->prints("running\n"); }));
+    program->send(SIGHUP);
+    program->send(SIGINT);
+    EXPECT_FALSE(waitUntil([&] { return program->prints("asked\n"); }, 200ms));
+    program->send(SIGTERM);
+    EXPECT_EQ(program->waitForEnd(), 0);
+}
+
+TEST_F(EndSignal, OfATerminalDoesNotReachAServiceThatWasStartedWithoutHangups)
+{
+    const auto service = startInShell("ventrik-telephony", {"--technology", "lte"}, "trap '' HUP");
+    ASSERT_TRUE(waitUntil([&] { return !sockets().empty(); }));
+    service->send(SIGHUP);
+    EXPECT_FALSE(waitUntil([&] { return !service->isRunning(); }, 300ms));
+    service->send(SIGTERM);
+    EXPECT_EQ(service->waitForEnd(), 0) << service->errors();
+}
+
+} // namespace ventrik

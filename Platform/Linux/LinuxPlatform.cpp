@@ -13,7 +13,8 @@ LinuxPlatform::LinuxPlatform(const LinuxPlatformOptions& options)
       _telephony(_ports, _mainQueue),
       _resources(options.resourceDirectories.empty() ? LinuxResources::defaultDirectories()
                                                      : options.resourceDirectories,
-                 options.version)
+                 options.version),
+      _preferences(_log)
 {
 }
 

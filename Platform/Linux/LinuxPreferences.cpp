@@ -1,9 +1,16 @@
 #include "Platform/Linux/LinuxPreferences.h"
 
-#include <QDBusConnection>
-#include <QDBusMessage>
-#include <QFile>
+#include "Platform/Linux/SessionBus.h"
+#include "Platform/SystemLog.h"
+
+#include <cerrno>
+#include <cstring>
+#include <filesystem>
+
+#include <QDir>
 #include <QSettings>
+
+#include <unistd.h>
 
 namespace ventrik
 {
@@ -16,70 +23,86 @@ QString toQString(std::string_view text)
     return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
 }
 
-// Returns when the bus has everything that was sent before. The library writes from a thread of its
-// own, and a process that ends first takes along what is unwritten.
-void waitUntilSent(const QDBusConnection& bus)
+std::string fileOf(std::string_view domain)
 {
-    constexpr int longestWait = 1000; // milliseconds
-    bus.call(QDBusMessage::createMethodCall(
-                 QStringLiteral("org.freedesktop.DBus"), QStringLiteral("/org/freedesktop/DBus"),
-                 QStringLiteral("org.freedesktop.DBus.Peer"), QStringLiteral("Ping")),
-             QDBus::Block, longestWait);
+    QString configuration = qEnvironmentVariable("XDG_CONFIG_HOME");
+    if (!QDir::isAbsolutePath(configuration))
+        configuration = QDir::homePath() + "/.config";
+    return (configuration + '/' + toQString(domain) + ".conf").toStdString();
 }
 
-// Without an address the bus library would start a bus of its own, slowly, wherever there is a
-// display.
-bool hasSessionBus()
+// Opening a pipe or a device may wait for ever or do something, and writing would replace it.
+bool isTakenBySomethingElse(const std::string& file)
 {
-    if (!qEnvironmentVariableIsEmpty("DBUS_SESSION_BUS_ADDRESS"))
-        return true;
-    const QString runtimeDirectory = qEnvironmentVariable("XDG_RUNTIME_DIR");
-    return !runtimeDirectory.isEmpty() && QFile::exists(runtimeDirectory + "/bus");
+    std::error_code ignored;
+    const auto status = std::filesystem::status(file, ignored);
+    return std::filesystem::exists(status) && !std::filesystem::is_regular_file(status);
+}
+
+// The settings library tells that it failed, and not why.
+std::string reasonWhyNotWritten(const std::string& file, QSettings::Status status)
+{
+    if (status == QSettings::FormatError)
+        return "it is no preference file";
+    const std::string directory = std::filesystem::path(file).parent_path();
+    for (const std::string& place : {directory, file})
+        if (access(place.c_str(), W_OK) != 0 && (place == directory || errno != ENOENT))
+            return std::strerror(errno);
+    return "it cannot be replaced";
 }
 
 } // namespace
 
-LinuxPreferences::LinuxPreferences() = default;
+LinuxPreferences::LinuxPreferences(SystemLog& log) : _log(log) {}
 
 LinuxPreferences::~LinuxPreferences() = default;
 
 void LinuxPreferences::set(std::string_view domain, std::string_view key, bool value)
 {
-    settings(domain).setValue(toQString(key), value);
+    if (QSettings* current = settings(domain))
+        current->setValue(toQString(key), value);
 }
 
 bool LinuxPreferences::synchronize(std::string_view domain)
 {
-    QSettings& current = settings(domain);
-    current.sync();
-    return current.status() == QSettings::NoError;
+    QSettings* current = settings(domain);
+    if (!current) {
+        _log.error("The preference was not written: {}: it is no file", fileOf(domain));
+        return false;
+    }
+    current->sync();
+    if (current->status() == QSettings::NoError)
+        return true;
+    const std::string file = current->fileName().toStdString();
+    _log.error("The preference was not written: {}: {}", file,
+               reasonWhyNotWritten(file, current->status()));
+    return false;
 }
 
 void LinuxPreferences::postChanged(std::string_view domain, std::string_view key)
 {
-    if (!hasSessionBus())
+    constexpr std::chrono::milliseconds longestWait(800);
+    const auto address = sessionBusAddress();
+    if (!address)
         return;
-    const QDBusConnection bus = QDBusConnection::sessionBus();
-    if (!bus.isConnected())
-        return;
-    auto signal = QDBusMessage::createSignal(QStringLiteral("/org/ventrik/Preferences"),
-                                             QStringLiteral("org.ventrik.Preferences"),
-                                             QStringLiteral("Changed"));
-    signal << toQString(domain) << toQString(key);
-    bus.send(signal);
-    waitUntilSent(bus);
+    const BusSignal signal{"/org/ventrik/Preferences",
+                           "org.ventrik.Preferences",
+                           "Changed",
+                           {std::string(domain), std::string(key)}};
+    if (const auto reason = sendBusSignal(*address, signal, longestWait))
+        _log.error("The session bus was not told of the preference: {}", *reason);
 }
 
-QSettings& LinuxPreferences::settings(std::string_view domain)
+QSettings* LinuxPreferences::settings(std::string_view domain)
 {
-    auto found = _settings.find(domain);
-    if (found == _settings.end()) {
-        auto made = std::make_unique<QSettings>(QSettings::NativeFormat, QSettings::UserScope,
-                                                toQString(domain));
-        made->setFallbacksEnabled(false);
-        found = _settings.emplace(std::string(domain), std::move(made)).first;
-    }
-    return *found->second;
+    const auto found = _settings.find(domain);
+    if (found != _settings.end())
+        return found->second.get();
+    const std::string file = fileOf(domain);
+    if (isTakenBySomethingElse(file))
+        return nullptr;
+    auto made = std::make_unique<QSettings>(toQString(file), QSettings::NativeFormat);
+    return _settings.emplace(std::string(domain), std::move(made)).first->second.get();
 }
 
 } // namespace ventrik

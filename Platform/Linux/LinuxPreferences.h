@@ -11,22 +11,29 @@ class QSettings;
 namespace ventrik
 {
 
-/// Preferences as ini files: the domain D is $XDG_CONFIG_HOME/D.conf. The change notice is the
-/// session-bus signal org.ventrik.Preferences.Changed(domain, key) of /org/ventrik/Preferences.
+class SystemLog;
+
+/// Preferences as ini files: the domain D is $XDG_CONFIG_HOME/D.conf, below ~/.config where that is
+/// not set or not absolute. The change notice is the session-bus signal
+/// org.ventrik.Preferences.Changed(domain, key) of /org/ventrik/Preferences. What fails is logged.
 class LinuxPreferences : public Preferences
 {
   public:
-    LinuxPreferences();
+    explicit LinuxPreferences(SystemLog& log);
     ~LinuxPreferences() override;
 
     void set(std::string_view domain, std::string_view key, bool value) override;
+    /// Leaves alone what has the file's name and is none.
     bool synchronize(std::string_view domain) override;
-    /// Returns when the bus has the notice; does nothing where there is no session bus.
+    /// Returns when the bus has the notice, after less than a second in any case; does nothing
+    /// where there is no session bus.
     void postChanged(std::string_view domain, std::string_view key) override;
 
   private:
-    QSettings& settings(std::string_view domain);
+    /// Null where the file's name is taken by something else.
+    QSettings* settings(std::string_view domain);
 
+    SystemLog& _log;
     std::map<std::string, std::unique_ptr<QSettings>, std::less<>> _settings;
 };
 

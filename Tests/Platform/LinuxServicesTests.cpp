@@ -6,6 +6,8 @@
 #include <fstream>
 #include <iterator>
 
+#include <sys/stat.h>
+
 namespace ventrik
 {
 namespace
@@ -41,26 +43,61 @@ TEST(LinuxSystemLog, CopiesToStandardErrorUpToItsThreshold)
               fmt::format("ventrik-test[{}]: <4> shown 1\n", getpid()));
 }
 
-TEST(LinuxPreferences, WritesTheDomainsFile)
+class LinuxPreferencesTest : public ::testing::Test
 {
-    LinuxPreferences preferences;
+  protected:
+    CapturingSystemLog log;
+    LinuxPreferences preferences{log};
+};
+
+TEST_F(LinuxPreferencesTest, WritesTheDomainsFile)
+{
     preferences.set("org.ventrik.HomeScreen", "FieldTest", true);
     EXPECT_TRUE(preferences.synchronize("org.ventrik.HomeScreen"));
     EXPECT_EQ(contentsOf(configurationFile("org.ventrik.HomeScreen")),
               "[General]\nFieldTest=true\n");
 }
 
-TEST(LinuxPreferences, TellsThatADomainCannotBeWritten)
+TEST_F(LinuxPreferencesTest, LogsWhichFileCannotBeWrittenAndWhy)
 {
-    std::filesystem::create_directory(configurationFile("org.ventrik.Broken"));
-    LinuxPreferences preferences;
-    preferences.set("org.ventrik.Broken", "FieldTest", true);
-    EXPECT_FALSE(preferences.synchronize("org.ventrik.Broken"));
+    const std::string notADirectory = configurationFile("org.ventrik.HomeScreen");
+    std::ofstream(notADirectory) << "[General]\n";
+    const QByteArray usual = qgetenv("XDG_CONFIG_HOME");
+    qputenv("XDG_CONFIG_HOME", QByteArray::fromStdString(notADirectory));
+    preferences.set("org.ventrik.Lost", "FieldTest", true);
+    EXPECT_FALSE(preferences.synchronize("org.ventrik.Lost"));
+    qputenv("XDG_CONFIG_HOME", usual);
+    EXPECT_THAT(log.texts(LogPriority::error),
+                ElementsAre("The preference was not written: " + notADirectory +
+                            "/org.ventrik.Lost.conf: Not a directory"));
 }
 
-TEST(LinuxPreferences, PostsNothingWithoutABus)
+TEST_F(LinuxPreferencesTest, LeaveAloneWhatHasTheirNameAndIsNoFile)
 {
-    LinuxPreferences preferences;
+    const std::string pipe = configurationFile("org.ventrik.Pipe");
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    preferences.set("org.ventrik.Pipe", "FieldTest", true);
+    EXPECT_FALSE(preferences.synchronize("org.ventrik.Pipe"));
+    EXPECT_TRUE(std::filesystem::is_fifo(pipe));
+    EXPECT_THAT(log.texts(LogPriority::error),
+                ElementsAre("The preference was not written: " + pipe + ": it is no file"));
+}
+
+TEST_F(LinuxPreferencesTest, PassOverADirectoryThatIsNotAbsolute)
+{
+    const QTemporaryDir home;
+    const QByteArray usual = qgetenv("XDG_CONFIG_HOME");
+    qputenv("HOME", home.path().toUtf8());
+    qputenv("XDG_CONFIG_HOME", "relative");
+    preferences.set("org.ventrik.HomeScreen", "FieldTest", true);
+    EXPECT_TRUE(preferences.synchronize("org.ventrik.HomeScreen"));
+    qputenv("XDG_CONFIG_HOME", usual);
+    EXPECT_TRUE(std::filesystem::exists(home.path().toStdString() +
+                                        "/.config/org.ventrik.HomeScreen.conf"));
+}
+
+TEST_F(LinuxPreferencesTest, PostNothingWithoutABus)
+{
     EXPECT_LT(secondsOf([&] { preferences.postChanged("org.ventrik.HomeScreen", "FieldTest"); }),
               1.0);
 }

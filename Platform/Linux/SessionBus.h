@@ -1,0 +1,30 @@
+#pragma once
+
+#include <chrono>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace ventrik
+{
+
+struct BusSignal {
+    std::string path;
+    std::string interface;
+    std::string member;
+    std::vector<std::string> arguments;
+};
+
+/// Where the session bus is: $DBUS_SESSION_BUS_ADDRESS, else the runtime directory's socket; none
+/// when there is neither.
+std::optional<std::string> sessionBusAddress();
+
+/// Sends one signal on the bus (the sockets of an address "unix:..." are known) and returns when
+/// the bus has it, or else, after the time at the latest, with the reason in one line.
+///
+/// These are a few lines of the bus's protocol of our own, because the toolkit's library waits 90 s
+/// for a login, and then its thread holds up the process's end.
+std::optional<std::string> sendBusSignal(const std::string& address, const BusSignal& signal,
+                                         std::chrono::milliseconds longestWait);
+
+} // namespace ventrik

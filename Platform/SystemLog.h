@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdio>
 #include <string_view>
 #include <utility>
 
@@ -11,9 +12,13 @@ namespace ventrik
 /// Priorities as syslog(3) numbers them.
 namespace LogPriority
 {
+inline constexpr int emergency = 0;
+inline constexpr int alert = 1;
+inline constexpr int critical = 2;
 inline constexpr int error = 3;
 inline constexpr int warning = 4;
 inline constexpr int notice = 5;
+inline constexpr int info = 6;
 inline constexpr int debug = 7;
 } // namespace LogPriority
 
@@ -42,6 +47,14 @@ class SystemLog
     {
         log(LogPriority::warning, format, std::forward<Args>(args)...);
     }
+
+    /// Shows a line to whoever watches the program's console; it is no entry of the log.
+    virtual void showOnConsole(std::string_view line)
+    {
+        std::fwrite(line.data(), 1, line.size(), stderr);
+    }
+    /// Waits until all that was written is where it goes, for a bounded time; false when it is not.
+    virtual bool flush() { return true; }
 
   protected:
     explicit SystemLog(int threshold) : _threshold(threshold) {}

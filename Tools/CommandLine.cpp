@@ -1,10 +1,16 @@
 #include "Tools/CommandLine.h"
 
+#include "Platform/Linux/StandardStreams.h"
+#include "Platform/SystemLog.h"
+
+#include <algorithm>
+#include <cerrno>
 #include <cmath>
 #include <cstdlib>
 
 #include <fmt/format.h>
 #include <getopt.h>
+#include <unistd.h>
 
 namespace ventrik
 {
@@ -13,6 +19,16 @@ namespace
 {
 
 constexpr int wrongUsage = 2;
+
+struct LogLevel {
+    std::string_view name;
+    int priority;
+};
+constexpr LogLevel logLevels[] = {
+    {"emergency", LogPriority::emergency}, {"alert", LogPriority::alert},
+    {"critical", LogPriority::critical},   {"error", LogPriority::error},
+    {"warning", LogPriority::warning},     {"notice", LogPriority::notice},
+    {"info", LogPriority::info},           {"debug", LogPriority::debug}};
 
 } // namespace
 
@@ -40,8 +56,15 @@ std::vector<std::string> CommandLine::arguments() const
 
 void CommandLine::refuse(std::string_view reason) const
 {
-    fmt::print(stderr, "{}: {}; see --help\n", _program, reason);
+    complain(_program, fmt::format("{}; see --help", reason));
     std::exit(wrongUsage);
+}
+
+void CommandLine::tell(std::string_view text) const
+{
+    if (writeText(STDOUT_FILENO, text, Patience::Endless))
+        std::exit(EXIT_SUCCESS);
+    std::exit(tellOutputFailure(_program, "standard output", errno));
 }
 
 double CommandLine::positiveNumber(std::string_view option) const
@@ -53,10 +76,12 @@ double CommandLine::positiveNumber(std::string_view option) const
     return number;
 }
 
-void tell(std::string_view text)
+int CommandLine::logLevel() const
 {
-    fmt::print("{}", text);
-    std::exit(EXIT_SUCCESS);
+    const auto* level = std::ranges::find(logLevels, std::string_view(_value), &LogLevel::name);
+    if (level == std::end(logLevels))
+        refuse(fmt::format("there is no log level '{}'", _value));
+    return level->priority;
 }
 
 } // namespace ventrik

@@ -23,8 +23,13 @@ class CommandLine
     std::vector<std::string> arguments() const;
 
     [[noreturn]] void refuse(std::string_view reason) const;
+    /// Prints to standard output and ends the program, with success where that takes it: for --help
+    /// and --version.
+    [[noreturn]] void tell(std::string_view text) const;
     /// A positive number; anything else is refused under the option's name.
     double positiveNumber(std::string_view option) const;
+    /// The priority (see LogPriority) whose name the value is; anything else is refused.
+    int logLevel() const;
 
   private:
     std::string_view _program;
@@ -32,8 +37,5 @@ class CommandLine
     char** _argv;
     const char* _value = nullptr;
 };
-
-/// Prints to standard output and ends the program with success: for --help and --version.
-[[noreturn]] void tell(std::string_view text);
 
 } // namespace ventrik

@@ -6,6 +6,8 @@
 #include "Model/TreePrinter.h"
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxResources.h"
+#include "Platform/Linux/StandardStreams.h"
+#include "Tools/ConsoleSystemLog.h"
 #include "Tools/FileSystemLog.h"
 #include "Tools/Json.h"
 #include "Tools/OfflineDecoder.h"
@@ -32,9 +34,15 @@ constexpr std::size_t reserveSize = std::size_t{1} << 20;
 std::atomic<bool> interrupted = false;
 static_assert(std::atomic<bool>::is_always_lock_free);
 
+// Whoever reads the decoder's output sets its pace, here as for the result.
+void show(std::string_view text)
+{
+    writeText(STDERR_FILENO, text, Patience::Endless);
+}
+
 void complain(std::string_view text)
 {
-    fmt::print(stderr, "ventrik-decode: {}\n", text);
+    ventrik::complain("ventrik-decode", text, Patience::Endless);
 }
 
 /// How far the decoder has come, on standard error while that is a terminal.
@@ -44,14 +52,14 @@ class Progress
     ~Progress()
     {
         if (_shown)
-            fmt::print(stderr, "\r\033[K");
+            show("\r\033[K");
     }
 
     void count(std::size_t messages)
     {
         if (messages % interval != 0 || !isatty(STDERR_FILENO))
             return;
-        fmt::print(stderr, "\r{} messages", messages);
+        show(fmt::format("\r{} messages", messages));
         _shown = true;
     }
 
@@ -88,10 +96,10 @@ class Decoding
             complain(fault);
             status = DecodeStatus::badInput;
         }
-        if (std::fflush(_output) != 0 || std::ferror(_output)) {
-            complain(fmt::format("writing the result: {}", std::strerror(errno)));
-            status = DecodeStatus::badInput;
-        }
+        if (std::fflush(_output) != 0)
+            noteOutputError();
+        if (_outputError != 0)
+            status = tellOutputFailure("ventrik-decode", "writing the result", _outputError);
         if (!writeSnapshotFile())
             status = DecodeStatus::badInput;
         return interrupted ? DecodeStatus::interrupted : status;
@@ -118,7 +126,7 @@ class Decoding
     void readMessages()
     {
         Progress progress;
-        while (!interrupted && !std::ferror(_output)) {
+        while (!interrupted && _outputError == 0) {
             const auto message = _reader.next();
             if (!message) {
                 _failure = _reader.error();
@@ -141,8 +149,16 @@ class Decoding
 
     void write()
     {
-        std::fwrite(_text.data(), 1, _text.size(), _output);
+        if (std::fwrite(_text.data(), 1, _text.size(), _output) != _text.size())
+            noteOutputError();
         _text.clear();
+    }
+
+    // The first failure is the one to tell.
+    void noteOutputError()
+    {
+        if (_outputError == 0)
+            _outputError = errno;
     }
 
     void writeLine(const CapturedMessage& message)
@@ -198,6 +214,7 @@ class Decoding
     CaptureClock& _clock;
     CaptureTechnology _technology;
     std::FILE* _output;
+    int _outputError = 0;
     OfflineDecoder _decoder;
     std::size_t _packets = 0;
     std::string _text;
@@ -248,8 +265,9 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
 
 int decodeCapture(const DecodeOptions& options, std::FILE* output)
 try {
+    const int shownLevel = options.verbose ? options.logLevel : ConsoleSystemLog::showNothing;
     if (!options.systemLogFile) {
-        SilentSystemLog log;
+        ConsoleSystemLog log("ventrik-decode", shownLevel);
         return decodeWithLog(options, log, output);
     }
     std::string error;
@@ -258,7 +276,8 @@ try {
         complain(error);
         return DecodeStatus::badInput;
     }
-    const int status = decodeWithLog(options, *log, output);
+    ConsoleSystemLog both("ventrik-decode", shownLevel, log.get());
+    const int status = decodeWithLog(options, both, output);
     if (log->commit(error))
         return status;
     complain(error);

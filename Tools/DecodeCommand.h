@@ -1,6 +1,7 @@
 #pragma once
 
 #include "Capture/CaptureTechnology.h"
+#include "Platform/SystemLog.h"
 
 #include <cstdio>
 #include <optional>
@@ -21,6 +22,8 @@ struct DecodeOptions {
     std::string description;
     std::vector<std::string> resourceDirectories; ///< empty: the default ones
     std::string version;
+    bool verbose = false;              ///< shows the log and the decoders' console
+    int logLevel = LogPriority::debug; ///< the least urgent lines that are shown
 };
 
 /// Exit statuses of the offline decoder.

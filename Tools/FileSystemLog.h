@@ -34,14 +34,4 @@ class FileSystemLog : public SystemLog
     std::string _line;
 };
 
-/// A system log that nobody reads; its lines are never formatted.
-class SilentSystemLog : public SystemLog
-{
-  public:
-    SilentSystemLog() : SystemLog(-1) {}
-
-  protected:
-    void write(int, std::string_view) override {}
-};
-
 } // namespace ventrik

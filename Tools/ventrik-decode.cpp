@@ -1,3 +1,4 @@
+#include "Platform/Linux/StandardStreams.h"
 #include "Tools/CommandLine.h"
 #include "Tools/DecodeCommand.h"
 
@@ -5,6 +6,7 @@
 #include <filesystem>
 #include <map>
 
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <getopt.h>
 #include <unistd.h>
@@ -16,7 +18,8 @@ namespace
 
 constexpr const char* usage =
     "usage: ventrik-decode [--technology NAME] [--format text|json|jsonl] [--system-log FILE]\n"
-    "                      [--snapshot FILE] [--description TEXT] [--resources DIR] CAPTURE\n"
+    "                      [--snapshot FILE] [--description TEXT] [--resources DIR]\n"
+    "                      [--log-level LEVEL] [--verbose] CAPTURE\n"
     "\n"
     "Decodes a capture of log-channel messages (a pcap file; - for standard input) and prints the\n"
     "display that the viewer would show.\n"
@@ -28,9 +31,13 @@ constexpr const char* usage =
     "  --snapshot FILE     writes the snapshot that Save would write after the last message\n"
     "  --description TEXT  the snapshot's description\n"
     "  --resources DIR     takes the display templates from DIR\n"
+    "  --verbose           shows the system log on standard error, and what decoders tell\n"
+    "  --log-level LEVEL   the least urgent lines that --verbose shows: debug (default), info,\n"
+    "                      notice, warning, error, critical, alert or emergency\n"
     "  --help, --version\n"
     "\n"
-    "Exit status: 0 done, 1 the input cannot be read or is damaged, 2 wrong usage.\n";
+    "Exit status: 0 done, 1 the input cannot be read or is damaged or the result cannot be\n"
+    "written, 2 wrong usage.\n";
 
 CaptureTechnology technologyArgument(const CommandLine& line)
 {
@@ -81,10 +88,16 @@ void takeOption(int letter, const CommandLine& line, DecodeOptions& result)
     case 'r':
         result.resourceDirectories = {directoryArgument(line)};
         break;
+    case 'V':
+        result.verbose = true;
+        break;
+    case 'L':
+        result.logLevel = line.logLevel();
+        break;
     case 'h':
-        tell(usage);
+        line.tell(usage);
     default:
-        tell("ventrik-decode " VENTRIK_VERSION "\n");
+        line.tell("ventrik-decode " VENTRIK_VERSION "\n");
     }
 }
 
@@ -96,6 +109,8 @@ DecodeOptions parseArguments(int argc, char** argv)
                                      {"snapshot", required_argument, nullptr, 's'},
                                      {"description", required_argument, nullptr, 'd'},
                                      {"resources", required_argument, nullptr, 'r'},
+                                     {"verbose", no_argument, nullptr, 'V'},
+                                     {"log-level", required_argument, nullptr, 'L'},
                                      {"help", no_argument, nullptr, 'h'},
                                      {"version", no_argument, nullptr, 'v'},
                                      {}};
@@ -112,18 +127,24 @@ DecodeOptions parseArguments(int argc, char** argv)
 }
 
 // Standard output is for the result alone: whatever else is written there, the farewell of the
-// class index above all, goes to standard error.
-std::FILE* takeStandardOutput()
+// class index above all, goes to standard error where that is asked for, or else nowhere.
+std::FILE* takeStandardOutput(bool verbose)
 {
     const int descriptor = dup(STDOUT_FILENO);
     std::FILE* output = descriptor >= 0 ? fdopen(descriptor, "w") : nullptr;
-    dup2(STDERR_FILENO, STDOUT_FILENO);
+    dup2(verbose ? STDERR_FILENO : open("/dev/null", O_WRONLY), STDOUT_FILENO);
+    std::setvbuf(stdout, nullptr, _IOLBF, BUFSIZ); // so that it comes in its place
     return output;
 }
 
-// A second Ctrl+C ends at once. A read that waits for standard input is not taken up again.
+// A second Ctrl+C ends at once. A read that waits for standard input is not taken up again. In the
+// background the shell has the interrupt ignored, and so it stays.
 void endOnInterrupt()
 {
+    struct sigaction inherited = {};
+    sigaction(SIGINT, nullptr, &inherited);
+    if (inherited.sa_handler == SIG_IGN)
+        return;
     struct sigaction action = {};
     action.sa_handler = [](int) { interruptDecoding(); };
     action.sa_flags = static_cast<int>(SA_RESETHAND);
@@ -134,10 +155,11 @@ void endOnInterrupt()
 
 int main(int argc, char** argv)
 {
+    prepareStandardStreams();
     const DecodeOptions options = parseArguments(argc, argv);
-    std::FILE* output = takeStandardOutput();
+    std::FILE* output = takeStandardOutput(options.verbose);
     if (!output) {
-        fmt::print(stderr, "ventrik-decode: standard output is closed\n");
+        complain("ventrik-decode", "standard output is closed");
         return DecodeStatus::badInput;
     }
     endOnInterrupt();

@@ -1,4 +1,5 @@
 #include "Platform/Linux/LinuxPlatform.h"
+#include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
 #include "TelephonyService/ReplaySource.h"
 #include "TelephonyService/ScenarioCapture.h"
@@ -33,7 +34,9 @@ constexpr const char* usage =
     "  --replay CAPTURE   replays a capture with the pauses it was recorded with\n"
     "  --speed FACTOR     replays that much faster; max: as fast as the viewer takes\n"
     "  --loop             begins again at the capture's end\n"
-    "  --verbose          copies the system log to standard error\n"
+    "  --log-level LEVEL  the least urgent lines that go to the system log: debug, info, notice,\n"
+    "                     warning, error (default), critical, alert or emergency\n"
+    "  --verbose          copies every line of the log to standard error\n"
     "  --help, --version\n"
     "\n"
     "Ended by SIGTERM or SIGINT. Exit status: 0 ended so, 1 it could not start, 2 wrong usage.\n";
@@ -44,6 +47,7 @@ struct ServiceOptions {
     std::optional<std::string> captureToWrite;
     std::uint32_t messageCount = 10000;
     std::optional<ReplayOptions> replay;
+    int logLevel = LogPriority::error;
     bool verbose = false;
 };
 
@@ -108,13 +112,16 @@ void takeOption(int letter, const CommandLine& line, ServiceOptions& result,
     case 'l':
         replay.loop = replay.isAskedFor = true;
         break;
+    case 'L':
+        result.logLevel = line.logLevel();
+        break;
     case 'V':
         result.verbose = true;
         break;
     case 'h':
-        tell(usage);
+        line.tell(usage);
     default:
-        tell("ventrik-telephony " VENTRIK_VERSION "\n");
+        line.tell("ventrik-telephony " VENTRIK_VERSION "\n");
     }
 }
 
@@ -127,6 +134,7 @@ ServiceOptions parseArguments(int argc, char** argv)
                                      {"replay", required_argument, nullptr, 'r'},
                                      {"speed", required_argument, nullptr, 's'},
                                      {"loop", no_argument, nullptr, 'l'},
+                                     {"log-level", required_argument, nullptr, 'L'},
                                      {"verbose", no_argument, nullptr, 'V'},
                                      {"help", no_argument, nullptr, 'h'},
                                      {"version", no_argument, nullptr, 'v'},
@@ -180,7 +188,7 @@ std::optional<LogChannelContent> makeContent(const ServiceOptions& options, Syst
 
 int fail(std::string_view reason)
 {
-    fmt::print(stderr, "ventrik-telephony: {}\n", reason);
+    complain("ventrik-telephony", reason);
     return EXIT_FAILURE;
 }
 
@@ -198,6 +206,7 @@ int writeCapture(const ServiceOptions& options)
 
 int main(int argc, char** argv)
 {
+    prepareStandardStreams();
     const ServiceOptions options = parseArguments(argc, argv);
     if (options.captureToWrite)
         return writeCapture(options);
@@ -207,6 +216,7 @@ int main(int argc, char** argv)
     LinuxPlatformOptions platformOptions;
     platformOptions.programName = "ventrik-telephony";
     platformOptions.verbose = options.verbose;
+    platformOptions.logThreshold = options.logLevel;
     LinuxPlatform platform(platformOptions);
 
     std::string error;

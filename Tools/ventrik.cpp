@@ -2,6 +2,7 @@
 #include "Capture/CaptureTechnology.h"
 #include "Platform/Linux/DiagnosticLogs.h"
 #include "Platform/Linux/LinuxPlatform.h"
+#include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
 #include "Tools/CommandLine.h"
 #include "Tools/DemoDirectory.h"
@@ -27,7 +28,8 @@ namespace
 
 constexpr const char* usage =
     "usage: ventrik [--demo TECHNOLOGY] [--save-button] [--snapshot-directory DIR]\n"
-    "               [--size WIDTHxHEIGHT] [--no-animation] [--plain] [--verbose]\n"
+    "               [--size WIDTHxHEIGHT] [--no-animation] [--plain] [--log-level LEVEL]\n"
+    "               [--verbose]\n"
     "\n"
     "Shows what the baseband tells, as a tree of tables that is brought up to date every 2 s.\n"
     "\n"
@@ -37,7 +39,9 @@ constexpr const char* usage =
     "  --size WIDTHxHEIGHT       the window's size (default: that of the main screen)\n"
     "  --no-animation            every change shows at once\n"
     "  --plain                   no animation, and values that have changed are not tinted\n"
-    "  --verbose                 copies the system log to standard error\n"
+    "  --log-level LEVEL         the least urgent lines that go to the system log: debug, info,\n"
+    "                            notice, warning, error (default), critical, alert or emergency\n"
+    "  --verbose                 copies every line of the log to standard error\n"
     "  --help, --version\n"
     "\n"
     "Exit status: 0 ended, 1 there is no display or no demo service, 2 wrong usage.\n";
@@ -45,6 +49,7 @@ constexpr const char* usage =
 struct ViewerOptions {
     VentrikAppOptions app;
     std::string demoTechnology; // empty: no demo
+    int logLevel = LogPriority::error;
     bool verbose = false;
 };
 
@@ -84,6 +89,7 @@ ViewerOptions parseArguments(int argc, char** argv)
                                      {"save-button", no_argument, nullptr, 'b'},
                                      {"no-animation", no_argument, nullptr, 'n'},
                                      {"plain", no_argument, nullptr, 'p'},
+                                     {"log-level", required_argument, nullptr, 'L'},
                                      {"verbose", no_argument, nullptr, 'V'},
                                      {"help", no_argument, nullptr, 'h'},
                                      {"version", no_argument, nullptr, 'v'},
@@ -104,10 +110,12 @@ ViewerOptions parseArguments(int argc, char** argv)
             result.app.animation = false;
         else if (letter == 'p')
             result.app.animation = result.app.tintsChanges = false;
+        else if (letter == 'L')
+            result.logLevel = line.logLevel();
         else if (letter == 'V')
             result.verbose = true;
         else
-            tell(letter == 'h' ? usage : "ventrik " VENTRIK_VERSION "\n");
+            line.tell(letter == 'h' ? usage : "ventrik " VENTRIK_VERSION "\n");
     }
     if (!line.arguments().empty())
         line.refuse(fmt::format("what is '{}'?", line.arguments().front()));
@@ -116,7 +124,7 @@ ViewerOptions parseArguments(int argc, char** argv)
 
 void complain(std::string_view reason)
 {
-    fmt::print(stderr, "ventrik: {}\n", reason);
+    ventrik::complain("ventrik", reason);
 }
 
 bool hasDisplay()
@@ -150,14 +158,20 @@ void setWindowIcon(const Resources& resources)
         QApplication::setWindowIcon(QIcon(QString::fromStdString(*icon)));
 }
 
-VentrikApp* running = nullptr;
+struct Running {
+    VentrikApp& app;
+    SystemLog& log;
+};
+std::optional<Running> running;
 
 // The toolkit ends the process when the display goes away, as it may at the session's end. There is
 // nothing left to take down in order then, but the setting is undone all the same.
 void undoSettingAtExit()
 {
-    if (running)
-        running->_setGSMRSSI(false);
+    if (!running)
+        return;
+    running->app._setGSMRSSI(false);
+    running->log.flush();
 }
 
 int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
@@ -165,15 +179,16 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     LinuxPlatformOptions platformOptions;
     platformOptions.runtimeDirectory = runtimeDirectory;
     platformOptions.verbose = options.verbose;
+    platformOptions.logThreshold = options.logLevel;
     platformOptions.version = VENTRIK_VERSION;
     LinuxPlatform platform(platformOptions);
     setWindowIcon(platform.platform().resources);
     VentrikApp app(platform.platform(), options.app);
     app.applicationDidFinishLaunching();
-    running = &app;
+    running.emplace(app, platform.log());
     std::atexit(undoSettingAtExit);
     const int status = QApplication::exec();
-    running = nullptr;
+    running.reset();
     app.applicationWillTerminate();
     return status;
 }
@@ -194,6 +209,7 @@ int runDemo(const ViewerOptions& options, const DemoDirectory& directory)
 
 int main(int argc, char** argv)
 {
+    prepareStandardStreams();
     const ViewerOptions options = parseArguments(argc, argv);
     if (!hasDisplay()) {
         complain("there is no display; ventrik-watch needs none");

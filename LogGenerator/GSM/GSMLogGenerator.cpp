@@ -28,11 +28,11 @@ constexpr int notDeserializedLine = 90;
 }
 
 // Whatever was printed or logged so far must not be lost with the process.
-[[noreturn]] void endProcess(const AssertionFailure& failure)
+[[noreturn]] void endProcess(const AssertionFailure& failure, SystemLog& log)
 {
+    log.showOnConsole(fmt::format("{}\n", failure.what()));
+    log.flush();
     std::fflush(nullptr);
-    std::fprintf(stderr, "%s\n", failure.what());
-    std::fflush(stderr);
     std::abort();
 }
 
@@ -67,7 +67,7 @@ void GSMLogGenerator::updateState(PlistDictionary& state, ByteView data)
     } catch (const AssertionFailure& failure) {
         if (assertions() == AssertionPolicy::Throw)
             throw;
-        endProcess(failure);
+        endProcess(failure, log());
     }
 }
 

@@ -33,14 +33,38 @@ TEST(LinuxSystemLog, ShowsAnEntryAsOneLine)
     EXPECT_EQ(LinuxSystemLog::line("ventrik", 42, 5, "\n"), "ventrik[42]: <5> ");
 }
 
-TEST(LinuxSystemLog, CopiesToStandardErrorUpToItsThreshold)
+TEST(LinuxSystemLog, ShowsNothingThatATerminalWouldObey)
 {
-    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::StandardError, LogPriority::warning);
+    EXPECT_EQ(LinuxSystemLog::line("ventrik", 42, 3, "a\x1b[2J\xc2\x9b\xff"),
+              "ventrik[42]: <3> a [2J \xef\xbf\xbd");
+}
+
+TEST(LinuxSystemLog, CopiesEveryLineToStandardErrorWhateverItsThreshold)
+{
+    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::StandardError, LogPriority::emergency);
     ::testing::internal::CaptureStderr();
     log.warning("shown {}", 1);
-    log.log(LogPriority::notice, "hidden");
+    log.log(LogPriority::debug, "shown too");
+    EXPECT_TRUE(log.flush());
     EXPECT_EQ(::testing::internal::GetCapturedStderr(),
-              fmt::format("ventrik-test[{}]: <4> shown 1\n", getpid()));
+              fmt::format("ventrik-test[{0}]: <4> shown 1\nventrik-test[{0}]: <7> shown too\n",
+                          getpid()));
+}
+
+TEST(LinuxSystemLog, WithoutACopyFormatsNothingBelowItsThreshold)
+{
+    const LinuxSystemLog log("ventrik-test");
+    EXPECT_TRUE(log.isEnabled(LogPriority::error));
+    EXPECT_FALSE(log.isEnabled(LogPriority::warning));
+}
+
+TEST(LinuxSystemLog, ShowsTheConsolesLinesOnStandardErrorAlsoWithoutACopy)
+{
+    LinuxSystemLog log("ventrik-test");
+    ::testing::internal::CaptureStderr();
+    log.showOnConsole("hello\n");
+    EXPECT_TRUE(log.flush());
+    EXPECT_EQ(::testing::internal::GetCapturedStderr(), "hello\n");
 }
 
 class LinuxPreferencesTest : public ::testing::Test

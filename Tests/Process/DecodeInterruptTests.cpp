@@ -48,7 +48,20 @@ TEST_F(DecodeInterrupt, EndsItBetweenMessagesAndKeepsWhatWasDecoded)
     interruptIdle(*program);
     EXPECT_THAT(linesOf(program->output()),
                 ElementsAre(StartsWith(R"({"packet": 0, )"), StartsWith(R"({"packet": 1, )")));
-    EXPECT_EQ(program->errors(), "Deallocing ClassIndex\n");
+    EXPECT_THAT(program->errors(), IsEmpty());
+}
+
+TEST_F(DecodeInterrupt, LeavesItAloneWhereItWasStartedToIgnoreThat)
+{
+    const auto program = startInShell("ventrik-decode", withResources({"-"}), "trap '' INT");
+    program->write(cellCapture().bytes());
+    ASSERT_TRUE(waitUntil([&] {
+        return program->hasTakenInput() && program->statusField("Name") == "ventrik-decode" &&
+               program->statusField("State").starts_with("S");
+    }));
+    program->send(SIGINT);
+    program->closeInput();
+    EXPECT_EQ(program->waitForEnd(), 0) << program->errors();
 }
 
 } // namespace ventrik

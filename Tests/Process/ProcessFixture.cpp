@@ -7,6 +7,10 @@
 #include <filesystem>
 #include <fstream>
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 namespace ventrik
 {
 
@@ -84,6 +88,34 @@ ProcessFixture::ProgramPointer ProcessFixture::startInShell(const std::string& n
                   VENTRIK_PROGRAMS "/" + name};
     all.insert(all.end(), arguments.begin(), arguments.end());
     return std::make_unique<Program>("/bin/sh", all, environment);
+}
+
+std::string ProcessFixture::fullPipe()
+{
+    std::string pipe = path("full-pipe");
+    EXPECT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    _fullPipe = FileDescriptor(open(pipe.c_str(), O_RDWR | O_NONBLOCK | O_CLOEXEC));
+    const Bytes bytes(4096, '.');
+    while (::write(_fullPipe.get(), bytes.data(), bytes.size()) > 0) {
+    }
+    return pipe;
+}
+
+void ProcessFixture::useStuckSystemLog()
+{
+    useSystemLog("stuck");
+}
+
+void ProcessFixture::useSystemLogFile(const std::string& file)
+{
+    useSystemLog(file);
+}
+
+void ProcessFixture::useSystemLog(const std::string& behavior)
+{
+    environment.insert("LD_PRELOAD", VENTRIK_TEST_SYSTEM_LOG);
+    environment.insert("VENTRIK_TEST_SYSTEM_LOG", QString::fromStdString(behavior));
+    environment.insert("ASAN_OPTIONS", "verify_asan_link_order=0");
 }
 
 ProcessFixture::ProgramPointer ProcessFixture::startService(const Arguments& arguments) const

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Platform/Linux/Socket.h"
 #include "Tests/Process/Program.h"
 
 #include <memory>
@@ -40,6 +41,12 @@ class ProcessFixture : public testing::Test
     ProgramPointer startInShell(const std::string& name, const Arguments& arguments,
                                 const std::string& setup,
                                 const std::string& redirections = "") const;
+    /// A pipe that has a reader and takes not one byte more; it lasts as long as the test.
+    std::string fullPipe();
+    /// Has the log daemon be one that takes no lines; or one that writes each to this file, behind
+    /// its priority.
+    void useStuckSystemLog();
+    void useSystemLogFile(const std::string& file);
     /// A telephony service, once it listens.
     ProgramPointer startService(const Arguments& arguments) const;
     ProgramPointer startScenario() const { return startService({"--technology", "lte"}); }
@@ -51,9 +58,11 @@ class ProcessFixture : public testing::Test
     QProcessEnvironment environment;
 
   private:
+    void useSystemLog(const std::string& behavior);
     ProgramPointer startListening(const std::string& name, const Arguments& arguments) const;
 
     QTemporaryDir _directory{"/tmp/ventrik-process-XXXXXX"};
+    FileDescriptor _fullPipe;
 };
 
 } // namespace ventrik

@@ -33,11 +33,4 @@ TEST(FileSystemLog, TellsWhyAFileCannotBeMade)
     EXPECT_EQ(error, "/nowhere/log: No such file or directory");
 }
 
-TEST(SilentSystemLog, FormatsNothing)
-{
-    const SilentSystemLog log;
-    EXPECT_FALSE(log.isEnabled(0));
-    EXPECT_FALSE(log.isEnabled(16));
-}
-
 } // namespace ventrik

@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/UTRAN/RRC_State.h"
 
 #include <array>
-#include <cstdio>
 #include <optional>
 
 namespace ventrik
@@ -61,9 +60,8 @@ void RRC_State::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     const std::string_view label = stateLabel(state);
     show("State", label);
     // For whoever watches the console; it has never been a line of the system log.
-    const std::string line = fmt::format("Display Dict = {}, rrc mode = {} {}\n",
-                                         describe(sectionRef.dictionary()), state, label);
-    std::fputs(line.c_str(), stderr);
+    log().showOnConsole(fmt::format("Display Dict = {}, rrc mode = {} {}\n",
+                                    describe(sectionRef.dictionary()), state, label));
 }
 
 } // namespace ventrik

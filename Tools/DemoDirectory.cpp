@@ -63,7 +63,8 @@ DemoDirectory::DemoDirectory()
 bool DemoDirectory::make()
 {
     std::error_code error;
-    std::string name = std::filesystem::temp_directory_path(error) / "ventrik-XXXXXX";
+    const auto temporary = std::filesystem::temp_directory_path(error);
+    std::string name = (error ? "/tmp" : temporary) / "ventrik-XXXXXX";
     if (mkdtemp(name.data()) == nullptr)
         return false;
     _path = name;

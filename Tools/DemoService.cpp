@@ -1,6 +1,8 @@
 #include "Tools/DemoService.h"
 
 #include "Platform/Linux/PortDirectory.h"
+#include "Platform/Linux/StandardStreams.h"
+#include "Platform/Linux/TerminationSignals.h"
 #include "Platform/TelephonyConstants.h"
 
 #include <csignal>
@@ -20,11 +22,6 @@ namespace ventrik
 
 namespace
 {
-
-void complain(std::string_view reason)
-{
-    fmt::print(stderr, "ventrik: {}\n", reason);
-}
 
 // The service's last words, or how it ended where it had none.
 std::string lastWords(QProcess& process)
@@ -47,6 +44,9 @@ bool DemoService::start(const DemoDirectory& directory, const std::string& techn
     _process.setProcessEnvironment(environment);
     _process.setStandardOutputFile(QProcess::nullDevice());
     _process.setChildProcessModifier([parent = getpid()] {
+        // What a terminal sends, it sends to both; the service ends when this process says so.
+        for (const int number : {SIGINT, SIGHUP})
+            std::signal(number, SIG_IGN);
         // The signal mask is inherited; the service shall see its own signals.
         sigset_t none;
         sigemptyset(&none);
@@ -60,6 +60,9 @@ bool DemoService::start(const DemoDirectory& directory, const std::string& techn
     if (!waitUntilListening(directory.path()))
         return false;
     QObject::connect(&_process, &QProcess::finished, qApp, [this] {
+        // Who is told to end may have been told together with the service.
+        if (TerminationSignals::haveCome())
+            return;
         tellEnd();
         QCoreApplication::exit(EXIT_FAILURE);
     });
@@ -79,7 +82,7 @@ bool DemoService::waitUntilListening(const std::string& runtimeDirectory)
             return false;
         }
         if (elapsed.hasExpired(longestWait)) {
-            complain("the demo service does not come up");
+            complain("ventrik", "the demo service does not come up");
             return false;
         }
     }
@@ -88,7 +91,7 @@ bool DemoService::waitUntilListening(const std::string& runtimeDirectory)
 
 void DemoService::tellEnd()
 {
-    complain("the demo service ended: " + lastWords(_process));
+    complain("ventrik", "the demo service ended: " + lastWords(_process));
 }
 
 DemoService::~DemoService()

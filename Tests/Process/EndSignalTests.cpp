@@ -1,6 +1,7 @@
 #include "Tests/Process/ProcessFixture.h"
 
 #include <csignal>
+#include <filesystem>
 
 namespace ventrik
 {
@@ -50,7 +51,7 @@ TEST_F(EndSignal, ThatComesLaterEndsTheProcessAtOnce)
     const auto program = startSlowEnd();
     program->send(SIGTERM);
     ASSERT_TRUE(waitUntil([&] { return program->prints("asked\n"); }));
-    waitUntil([] { return false; }, 1500ms);
+    waitUntil([] { return false; }, 2000ms);
     program->send(SIGTERM);
     EXPECT_EQ(program->waitForEnd(), 128 + SIGTERM);
     EXPECT_EQ(program->output(), "running\nasked\n");
@@ -65,6 +66,21 @@ TEST_F(EndSignal, ThatItWasStartedToIgnoreStaysIgnored)
     EXPECT_FALSE(waitUntil([&] { return program->prints("asked\n"); }, 200ms));
     program->send(SIGTERM);
     EXPECT_EQ(program->waitForEnd(), 0);
+}
+
+TEST_F(EndSignal, OfATerminalEndsTheTreeThereAndItsServiceQuietly)
+{
+    std::filesystem::create_directories(path("temporary"));
+    environment.insert("TMPDIR", QString::fromStdString(path("temporary")));
+    for (const int number : {SIGINT, SIGTERM}) {
+        Program script("/usr/bin/setsid",
+                       {VENTRIK_SCRIPTS "/run-in-terminal", VENTRIK_PROGRAMS, "lte"}, environment);
+        ASSERT_TRUE(waitUntil([&] { return script.prints("Ventrik\n"); })) << script.errors();
+        EXPECT_EQ(kill(-script.processId(), number), 0);
+        EXPECT_EQ(script.waitForEnd(), number == SIGINT ? 0 : 128 + number);
+        EXPECT_THAT(script.errors(), testing::IsEmpty());
+        EXPECT_THAT(namesIn(path("temporary")), testing::IsEmpty());
+    }
 }
 
 TEST_F(EndSignal, OfATerminalDoesNotReachAServiceThatWasStartedWithoutHangups)

@@ -98,7 +98,8 @@ class Decoding
         }
         if (std::fflush(_output) != 0)
             noteOutputError();
-        if (_outputError != 0)
+        // An interrupted write is no failure of the output's.
+        if (_outputError != 0 && !(interrupted && _outputError == EINTR))
             status = tellOutputFailure("ventrik-decode", "writing the result", _outputError);
         if (!writeSnapshotFile())
             status = DecodeStatus::badInput;

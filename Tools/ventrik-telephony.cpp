@@ -225,7 +225,9 @@ int main(int argc, char** argv)
         return fail(error);
     TelephonyService service(platform.mainQueue(), platform.ports(), platform.log(),
                              std::move(*content));
-    if (!service.start(error))
+    if (!service.start(error)) {
+        platform.log().flush(); // what it says there comes first
         return fail(error);
+    }
     return QCoreApplication::exec();
 }

@@ -35,7 +35,7 @@ class SystemLogProcess : public DecodeFixture
         watch.send(SIGTERM);
         const auto asked = std::chrono::steady_clock::now();
         EXPECT_EQ(watch.waitForEnd(), 0);
-        EXPECT_THAT(std::chrono::steady_clock::now() - asked, Lt(isSanitized ? 4s : 2s));
+        EXPECT_THAT(std::chrono::steady_clock::now() - asked, Lt(isSanitized ? 6s : 3s));
         EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
     }
     /// The system log's lines of a viewer that has shown a tree.

@@ -23,12 +23,13 @@ TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
                                         {"--replay", "x.pcap", "--speed", "fast"},
                                         {"--technology", "lte", "--seed", "-x"},
                                         {"--technology", "lte", "more"},
+                                        {"--technology", "lte", "--log-level", "loud"},
                                         {"--unheard-of"}});
 }
 
 TEST_F(ToolUsage, WatchRefusesWhatIsWrong)
 {
-    expectRefused("ventrik-watch", {{"--unheard-of"}, {"more"}, {"--once=1"}});
+    expectRefused("ventrik-watch", {{"--unheard-of"}, {"more"}, {"--once=1"}, {"--log-level", ""}});
 }
 
 TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
@@ -39,6 +40,7 @@ TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
                                      {"--technology", "5g", "a.pcap"},
                                      {"--resources", path("missing"), "a.pcap"},
                                      {"--snapshot"},
+                                     {"--log-level", "3", "a.pcap"},
                                      {"--unheard-of", "a.pcap"}});
 }
 

@@ -46,7 +46,7 @@ class WindowEnd : public ProcessFixture
         window.send(SIGTERM);
         const auto asked = std::chrono::steady_clock::now();
         EXPECT_EQ(window.waitForEnd(), 0) << window.errors();
-        EXPECT_THAT(std::chrono::steady_clock::now() - asked, Lt(isSanitized ? 4s : 1500ms));
+        EXPECT_THAT(std::chrono::steady_clock::now() - asked, Lt(isSanitized ? 6s : 2500ms));
     }
     static void expectQuietEndOfDemo(Program& window, int number)
     {

@@ -279,7 +279,8 @@ TEST_F(WindowProcess, EndsOnACellMonitorMessageThatIsNoPropertyList)
 
 TEST_F(WindowProcess, RefusesWhatIsWrong)
 {
-    expectRefused("ventrik", {{"--unheard-of"}, {"more"}, {"--demo"}, {"--demo", "5g"}});
+    expectRefused("ventrik",
+                  {{"--unheard-of"}, {"more"}, {"--demo"}, {"--demo", "5g"}, {"--log-level"}});
 }
 
 TEST_F(WindowProcess, TellsItsUsageAndVersion)

@@ -15,7 +15,6 @@
 #include <array>
 #include <atomic>
 #include <cerrno>
-#include <cstring>
 #include <memory>
 #include <new>
 

@@ -185,7 +185,7 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     setWindowIcon(platform.platform().resources);
     VentrikApp app(platform.platform(), options.app);
     app.applicationDidFinishLaunching();
-    running.emplace(app, platform.log());
+    running.emplace(Running{app, platform.log()});
     std::atexit(undoSettingAtExit);
     const int status = QApplication::exec();
     running.reset();

@@ -19,11 +19,11 @@ struct BusSignal {
 /// when there is neither.
 std::optional<std::string> sessionBusAddress();
 
-/// Sends one signal on the bus (the sockets of an address "unix:..." are known) and returns when
-/// the bus has it, or else, after the time at the latest, with the reason in one line.
+/// Sends one signal on the bus of that address and returns when the bus has it, or else, after the
+/// time at the latest, with the reason in one line.
 ///
-/// These are a few lines of the bus's protocol of our own, because the toolkit's library waits 90 s
-/// for a login, and then its thread holds up the process's end.
+/// Not by the toolkit's library, which waits 90 s for a login and whose thread then holds up the
+/// process's end: this one never blocks by itself.
 std::optional<std::string> sendBusSignal(const std::string& address, const BusSignal& signal,
                                          std::chrono::milliseconds longestWait);
 

@@ -198,6 +198,24 @@ TEST_F(QuietStateTest, APaneThatIsOpenedTellsTheSame)
     EXPECT_EQ(note(topPane()), "last update 06:10:28 · no service");
 }
 
+TEST_F(QuietStateTest, AMissingTemplateIsToldInTheStatusLineAndInTheMiddle)
+{
+    fake.resources.remove("/res/LTE.plist");
+    launchAndShowData();
+    EXPECT_EQ(note(topPane()), "display template LTE.plist is missing");
+    EXPECT_EQ(emptyText(), "Display template LTE.plist is missing");
+    EXPECT_EQ(statusText(topPane()), "Updated 2026-11-16 at 06:10:28");
+}
+
+TEST_F(QuietStateTest, ABrokenTemplateIsToldWithItsFileAndReason)
+{
+    fake.resources.add("/res/LTE.plist", "<plist><dict>");
+    launchAndShowData();
+    const std::string start = "display template /res/LTE.plist: ";
+    EXPECT_EQ(note(topPane()).substr(0, start.size()), start);
+    EXPECT_GT(note(topPane()).size(), start.size());
+}
+
 TEST_F(QuietStateTest, TheWindowsTitleNamesTheTechnologyAndThePane)
 {
     loseService();

@@ -184,6 +184,16 @@ TEST_F(WindowProcess, SaysWhyTheChannelIsDownOnceTheServiceHasDied)
     })) << window->errors();
 }
 
+TEST_F(WindowProcess, SaysWhichTemplateIsBroken)
+{
+    const auto service = startScenario();
+    const std::string broken = writeFile("broken/LTE.plist", "<plist><dict>");
+    environment.insert("VENTRIK_RESOURCE_DIRECTORY", QString::fromStdString(path("broken")));
+    const auto window = startReadWindow({});
+    EXPECT_TRUE(waitUntil([&] { return window->says("display template " + broken + ": "); }))
+        << window->errors();
+}
+
 TEST_F(WindowProcess, SaysThatAnotherViewerHoldsThePort)
 {
     const auto service = startScenario();

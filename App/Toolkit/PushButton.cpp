@@ -1,6 +1,9 @@
 #include "App/Toolkit/PushButton.h"
 
 #include "App/Toolkit/Fonts.h"
+#include "App/Toolkit/TableRow.h"
+
+#include <QPainter>
 
 #include <algorithm>
 
@@ -39,6 +42,17 @@ QSize PushButton::sizeHint() const
 QSize PushButton::minimumSizeHint() const
 {
     return {widthWith(besideTextAtLeast), sizeHint().height()};
+}
+
+// The style's own mark is easily overlooked.
+void PushButton::paintEvent(QPaintEvent* event)
+{
+    QPushButton::paintEvent(event);
+    if (!hasFocus())
+        return;
+    QPainter painter(this);
+    painter.setRenderHint(QPainter::Antialiasing);
+    drawKeyboardFrame(painter, rect(), palette());
 }
 
 } // namespace ventrik

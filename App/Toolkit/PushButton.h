@@ -5,8 +5,8 @@
 namespace ventrik
 {
 
-/// A button for a finger that the keyboard can reach. In a narrow window it gives way down to its
-/// text.
+/// A button for a finger that the keyboard can reach and is seen at. In a narrow window it gives
+/// way down to its text.
 class PushButton : public QPushButton
 {
   public:
@@ -15,6 +15,9 @@ class PushButton : public QPushButton
 
     QSize sizeHint() const override;
     QSize minimumSizeHint() const override;
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
 
   private:
     int widthWith(int besideText) const;

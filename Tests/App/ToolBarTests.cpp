@@ -309,6 +309,18 @@ TEST(ToolBar, NewItemsWaitUntilAPressedButtonIsReleased)
     EXPECT_EQ(dynamic_cast<QPushButton&>(*bar.items()[1]).text(), "Second");
 }
 
+TEST(PushButton, HasAFrameWhileItHasTheKeyboard)
+{
+    PushButton button("Go");
+    const auto edge = [&button] { return button.grab().toImage().pixelColor(1, 16); };
+    const QColor frame = button.palette().color(QPalette::Highlight);
+    showAt(button, 80, 32);
+    button.clearFocus();
+    EXPECT_NE(edge(), frame);
+    button.setFocus();
+    EXPECT_EQ(edge(), frame);
+}
+
 TEST(ToolBar, TheKeyboardStaysAtItsPlace)
 {
     ToolBar bar;

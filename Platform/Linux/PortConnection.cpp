@@ -31,6 +31,7 @@ PortConnection::PortConnection(FileDescriptor socket, Peer peer, bool peerIsTrus
     _nextTurn.setSingleShot(true);
     QObject::connect(&_nextTurn, &QTimer::timeout, [this] { readTurn(); });
     _stall.setSingleShot(true);
+    _stall.setTimerType(Qt::PreciseTimer);
     QObject::connect(&_stall, &QTimer::timeout, [this] { checkStall(); });
 }
 

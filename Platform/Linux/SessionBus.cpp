@@ -104,7 +104,7 @@ std::optional<std::string> sendBusSignal(const std::string& address, const BusSi
         bus.waitUntilTaken();
         return std::nullopt;
     } catch (const std::system_error& error) {
-        return error.code().message();
+        return error.code() == std::errc::timed_out ? "it does not answer" : error.code().message();
     }
 }
 

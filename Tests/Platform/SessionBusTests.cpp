@@ -60,18 +60,18 @@ std::optional<std::string> failureOf(std::string_view words, std::chrono::millis
 
 TEST(SessionBus, ThatDoesNotAnswerIsNotWaitedForLongerThanThat)
 {
-    EXPECT_EQ(failureOf("", 20ms), "Connection timed out");
-    EXPECT_EQ(failureOf("OK ", 20ms), "Connection timed out");
+    EXPECT_EQ(failureOf("", 20ms), "it does not answer");
+    EXPECT_EQ(failureOf("OK ", 20ms), "it does not answer");
     // It accepts the login and says nothing more.
     EXPECT_EQ(failureOf("OK 0123456789abcdef0123456789abcdef\r\nAGREE_UNIX_FD\r\n", 20ms),
-              "Connection timed out");
+              "it does not answer");
 }
 
 TEST(SessionBus, ThatRefusesTheLoginIsGivenUp)
 {
     const auto failure = failureOf("REJECTED EXTERNAL\r\nERROR\r\nERROR\r\n", 20s);
     ASSERT_TRUE(failure);
-    EXPECT_NE(*failure, "Connection timed out");
+    EXPECT_NE(*failure, "it does not answer");
 }
 
 TEST(SessionBus, WithNoRoomForOneMoreConnectionIsNotWaitedFor)

@@ -86,6 +86,7 @@ class LyingService:
         print("lied", flush=True)
         self.times -= 1
         os.kill(os.getpid(), signal.SIGKILL if self.kind == "die" else signal.SIGSTOP)
+        time.sleep(0.05)  # the signal may come a little later than its call returns
 
     def listen(self, name):
         path = os.path.join(DIRECTORY, name)
@@ -97,6 +98,7 @@ class LyingService:
         if self.lies("port"):
             os.seteuid(65534)
         listener.listen(16)
+        os.seteuid(os.getuid())
         self.listeners[name] = listener
         return listener
 

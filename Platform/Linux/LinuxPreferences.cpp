@@ -1,5 +1,6 @@
 #include "Platform/Linux/LinuxPreferences.h"
 
+#include "Files/PrivateFile.h"
 #include "Platform/Linux/SessionBus.h"
 #include "Platform/SystemLog.h"
 
@@ -70,6 +71,8 @@ bool LinuxPreferences::synchronize(std::string_view domain)
         _log.error("The preference was not written: {}: it is no file", fileOf(domain));
         return false;
     }
+    // Where there is none and none can be made, the file cannot be written either.
+    makePrivateDirectories(std::filesystem::path(fileOf(domain)).parent_path());
     current->sync();
     if (current->status() == QSettings::NoError)
         return true;

@@ -82,6 +82,19 @@ TEST_F(LinuxPreferencesTest, WritesTheDomainsFile)
               "[General]\nFieldTest=true\n");
 }
 
+TEST_F(LinuxPreferencesTest, MakeTheirMissingDirectoriesPrivate)
+{
+    const QTemporaryDir home;
+    const std::string configuration = home.filePath("a/config").toStdString();
+    const QByteArray usual = qgetenv("XDG_CONFIG_HOME");
+    qputenv("XDG_CONFIG_HOME", QByteArray::fromStdString(configuration));
+    preferences.set("org.ventrik.Private", "FieldTest", true);
+    EXPECT_TRUE(preferences.synchronize("org.ventrik.Private"));
+    qputenv("XDG_CONFIG_HOME", usual);
+    EXPECT_EQ(std::filesystem::status(configuration).permissions(),
+              std::filesystem::perms::owner_all);
+}
+
 TEST_F(LinuxPreferencesTest, LogsWhichFileCannotBeWrittenAndWhy)
 {
     const std::string notADirectory = configurationFile("org.ventrik.HomeScreen");

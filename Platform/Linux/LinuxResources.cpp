@@ -29,7 +29,6 @@ std::vector<std::string> LinuxResources::defaultDirectories()
     const fs::path executable = fs::read_symlink("/proc/self/exe", error);
     if (!error)
         directories.push_back(executable.parent_path().parent_path() / "share" / "ventrik");
-    directories.emplace_back(VENTRIK_SOURCE_RESOURCE_DIRECTORY);
     return directories;
 }
 

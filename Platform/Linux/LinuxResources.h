@@ -17,8 +17,8 @@ class LinuxResources : public Resources
   public:
     LinuxResources(std::vector<std::string> directories, std::optional<std::string> version);
 
-    /// $VENTRIK_RESOURCE_DIRECTORY where set, the directory of the installation (../share/ventrik
-    /// of the executable), the one of the source tree.
+    /// $VENTRIK_RESOURCE_DIRECTORY where set, ../share/ventrik of the executable; in a build tree
+    /// that is a link to the templates of the source tree.
     static std::vector<std::string> defaultDirectories();
 
     std::optional<std::string> path(std::string_view name, std::string_view type) const override;

@@ -203,6 +203,14 @@ TEST(LinuxResources, LooksFirstWhereTheEnvironmentSays)
     EXPECT_THAT(LinuxResources::defaultDirectories().front(), HasSubstr("/share/ventrik"));
 }
 
+TEST(LinuxResources, FindsTheTemplatesOfTheSourceTreeFromTheBuildTree)
+{
+    qunsetenv("VENTRIK_RESOURCE_DIRECTORY");
+    const LinuxResources resources(LinuxResources::defaultDirectories(), std::nullopt);
+    EXPECT_THAT(resources.paths("plist"), ElementsAre(HasSubstr("C2KTemplate"), HasSubstr("LTE"),
+                                                      HasSubstr("Orbel_GSM"), HasSubstr("UTRAN")));
+}
+
 TEST(LinuxClock, KnowsTheZoneInForce)
 {
     qputenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3");

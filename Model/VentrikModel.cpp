@@ -159,10 +159,7 @@ void VentrikModel::localPortInvalidated()
 void VentrikModel::destroyPorts()
 {
     _connectedSince.reset();
-    if (_displayUpdateTimer) {
-        _displayUpdateTimer->stop();
-        _displayUpdateTimer.reset();
-    }
+    _displayUpdateTimer.reset();
     // The callbacks go first, so that tearing down never looks like a lost channel.
     if (_recvPort) {
         _recvPort->setInvalidationCallback({});

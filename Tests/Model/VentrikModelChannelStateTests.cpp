@@ -106,6 +106,12 @@ TEST_F(ChannelState, TellsThatTheTechnologyWasNotTold)
     expectFault(ChannelFault::NoAnswer);
 }
 
+TEST_F(ChannelState, TellsThatTheTechnologyWasAskedForAndNotAnswered)
+{
+    fake.ports.queueResult({PortError::success, std::nullopt});
+    expectFault(ChannelFault::NoAnswer);
+}
+
 TEST_F(ChannelState, TellsThatTheServiceWentBeforeItToldTheTechnology)
 {
     fake.ports.queueError(PortError::invalidPort);
@@ -137,6 +143,15 @@ TEST_F(ChannelState, IsToldOnceForTheSameFault)
     fake.telephony.setServiceAvailable(false);
     start();
     fake.mainQueue.advance(20s);
+    EXPECT_EQ(changes, 1);
+}
+
+TEST_F(ChannelState, IsNotToldWhereARestartOpensTheChannelAgainAtOnce)
+{
+    start();
+    model.restartMonitor();
+    fake.mainQueue.run();
+    EXPECT_TRUE(model.isConnected());
     EXPECT_EQ(changes, 1);
 }
 
@@ -200,9 +215,14 @@ TEST_F(ChannelState, KnowsTheTechnologyOnceItIsAnswered)
 TEST(ChannelFaultText, NamesEachFaultInAFewWords)
 {
     EXPECT_EQ(channelFaultText(ChannelFault::None), "");
-    EXPECT_EQ(channelFaultText(ChannelFault::NoService), "no service");
+    EXPECT_EQ(channelFaultText(ChannelFault::NoPort), "the viewer's port cannot be made");
     EXPECT_EQ(channelFaultText(ChannelFault::PortTaken), "another viewer holds the port");
+    EXPECT_EQ(channelFaultText(ChannelFault::NoService), "no service");
     EXPECT_EQ(channelFaultText(ChannelFault::NoAnswer), "the service does not answer");
+    EXPECT_EQ(channelFaultText(ChannelFault::BadAnswer), "the service's answer is not understood");
+    EXPECT_EQ(channelFaultText(ChannelFault::Refused), "the service refuses a channel");
+    EXPECT_EQ(channelFaultText(ChannelFault::NoTechnology),
+              "the service speaks no known technology");
 }
 
 TEST_F(ChannelState, IsAFaultAndNoCrashWhenThereIsNoPortToAskAt)

@@ -306,6 +306,27 @@ TEST_F(ConnectionTest, ARetryThatWaitsDoesNotOutliveTheModel)
     EXPECT_EQ(attempts(), 1U);
 }
 
+TEST_F(ConnectionTest, AModelThatGoesClosesAPortThatAnotherHoldsToo)
+{
+    std::shared_ptr<FakeLocalPort> held;
+    {
+        VentrikModel shortLived(fake.platform(), {});
+        shortLived.startMonitor();
+        held = fake.ports.localPort(logChannelLocalPortName);
+        ASSERT_TRUE(held->isValid());
+    }
+    EXPECT_FALSE(held->isValid());
+    EXPECT_FALSE(held->hasInvalidationCallback());
+}
+
+TEST_F(ConnectionTest, OnePortAloneIsNoConnection)
+{
+    fake.telephony.setServiceAvailable(false);
+    EXPECT_FALSE(model.createPorts());
+    EXPECT_TRUE(fake.ports.localPort(logChannelLocalPortName));
+    EXPECT_FALSE(model.isConnected());
+}
+
 TEST_F(ConnectionTest, DestroyingTheModelClosesItsPorts)
 {
     {

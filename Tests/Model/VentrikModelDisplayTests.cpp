@@ -147,6 +147,15 @@ TEST_F(DisplayTest, SaveContentsComeFromTheGenerator)
               PlistValue("DLF binary (198 bytes)"));
 }
 
+TEST_F(DisplayTest, TheFaultOfTheDisplayIsTheGenerators)
+{
+    EXPECT_EQ(model.displayFault(), "");
+    fake.resources.remove(fake.resources.path("LTE", "plist").value());
+    model.startMonitor();
+    arrive(cellInfo(301));
+    EXPECT_EQ(model.displayFault(), "display template LTE.plist is missing");
+}
+
 TEST_F(DisplayTest, ARedrawThatWaitsDoesNotOutliveTheModel)
 {
     int late = 0;

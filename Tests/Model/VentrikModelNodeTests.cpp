@@ -179,6 +179,7 @@ TEST_F(TreeTest, ANodeWithoutANameLeavesItsParentAtTheirPath)
 {
     treeOf(PlistDictionary{{"a", PlistDictionary{{"", "inner"}, {"/", "inner"}}}});
     EXPECT_EQ(nameAt("/a"), "a");
+    EXPECT_EQ(index.find("/a/"), nullptr);
 }
 
 TEST_F(TreeTest, ADeeperLookingNameAndADeeperNodeAreAtOnePathWhereTheLaterStays)
@@ -190,7 +191,7 @@ TEST_F(TreeTest, ADeeperLookingNameAndADeeperNodeAreAtOnePathWhereTheLaterStays)
 TEST_F(TreeTest, NothingIsFoundWhereThereIsNoNode)
 {
     treeOf(PlistDictionary{{"a/b", PlistDictionary{{"c", "v"}}}});
-    for (const char* path : {"", "a", "/a", "/a/b/", "/a/b/c/", "//a/b", "/a/b/d", "/b"})
+    for (const char* path : {"", "a", "/a", "/a/b/", "/a/b/c/", "//a/b", "/a/b/d", "/b", "xa/b"})
         EXPECT_EQ(index.find(path), nullptr) << path;
 }
 

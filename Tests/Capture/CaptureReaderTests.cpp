@@ -1,10 +1,12 @@
 #include "Capture/CaptureReader.h"
+#include "Tests/Capture/OpenFiles.h"
 #include "Tests/Capture/PcapBytes.h"
 #include "Tests/Support/TemporaryFile.h"
 
 #include <gmock/gmock.h>
 
 #include <algorithm>
+#include <limits>
 
 namespace ventrik
 {
@@ -26,6 +28,34 @@ Clock::TimePoint at(std::chrono::nanoseconds sinceEpoch)
 {
     return Clock::TimePoint(sinceEpoch);
 }
+
+/// A capture in the newer form of the format, which counts 64-bit times in units of its own: here
+/// in seconds. It holds one message of one byte.
+class SecondsCapture
+{
+  public:
+    explicit SecondsCapture(std::int64_t seconds)
+    {
+        const auto time = static_cast<std::uint64_t>(seconds);
+        const auto high = static_cast<std::uint32_t>(time >> 32);
+        const auto low = static_cast<std::uint32_t>(time);
+        const std::uint32_t words[] = {
+            0x0A0D0D0A, 28, 0x1A2B3C4D, 1,      0xFFFFFFFF, 0xFFFFFFFF, 28, // section header
+            1,          32, 150,        262144, 0x00010009, 0,          0,
+            32, // interface: resolution 10^0 s
+            6,          36, 0,          high,   low,        1,          1,
+            0x00000001, 36, // one message of one byte
+        };
+        std::ofstream stream(path(), std::ios::binary);
+        for (const std::uint32_t word : words)
+            for (unsigned shift = 0; shift < 32; shift += 8)
+                stream.put(static_cast<char>(word >> shift));
+    }
+    const std::string& path() const { return _file.path(); }
+
+  private:
+    TemporaryFile _file{"seconds.pcapng"};
+};
 
 } // namespace
 
@@ -108,25 +138,35 @@ TEST(CaptureReader, AMessageThatWasCutWhenCapturedIsDamage)
     EXPECT_THAT(reader.error(), testing::HasSubstr("cut short when it was captured (2 of 40"));
 }
 
-TEST(CaptureReader, AnAbsurdTimeIsDamage)
+TEST(CaptureReader, ATimeBefore1970OrAfter2255IsDamage)
 {
-    // The newer form of the format counts 64-bit times in units of its own: here in seconds.
-    constexpr std::uint32_t words[] = {
-        0x0A0D0D0A, 28, 0x1A2B3C4D, 1,          0xFFFFFFFF, 0xFFFFFFFF, 28, // section header
-        1,          32, 150,        262144,     0x00010009, 0,          0,
-        32, // interface: resolution 10^0 s
-        6,          36, 0,          0x7FFFFFFF, 0xFFFFFFFF, 1,          1,
-        0x00000001, 36, // one message of one byte
-    };
-    const TemporaryFile file("absurd.pcapng");
-    std::ofstream stream(file.path(), std::ios::binary);
-    for (const std::uint32_t word : words)
-        for (unsigned shift = 0; shift < 32; shift += 8)
-            stream.put(static_cast<char>(word >> shift));
-    stream.close();
-    auto reader = opened(file.path());
-    EXPECT_FALSE(reader.next());
-    EXPECT_THAT(reader.error(), testing::HasSubstr("message 0: its time"));
+    for (const std::int64_t seconds : {std::int64_t{-1}, std::int64_t{9'000'000'001},
+                                       std::numeric_limits<std::int64_t>::max()}) {
+        const SecondsCapture capture(seconds);
+        auto reader = opened(capture.path());
+        EXPECT_FALSE(reader.next()) << seconds;
+        EXPECT_THAT(reader.error(),
+                    testing::HasSubstr(fmt::format("message 0: its time, {} s", seconds)));
+    }
+}
+
+TEST(CaptureReader, TheFirstAndTheLastSecondAreInRange)
+{
+    for (const std::int64_t seconds : {std::int64_t{0}, std::int64_t{9'000'000'000}}) {
+        const SecondsCapture capture(seconds);
+        auto reader = opened(capture.path());
+        const auto message = reader.next();
+        ASSERT_TRUE(message) << reader.error();
+        EXPECT_EQ(message->time, at(std::chrono::seconds(seconds)));
+    }
+}
+
+TEST(CaptureReader, LeavesNoFileOpen)
+{
+    const PcapBytes capture(150);
+    const std::size_t before = openFileCount();
+    opened(capture.file());
+    EXPECT_EQ(openFileCount(), before);
 }
 
 TEST(CaptureReader, AnAbsurdLengthIsDamage)

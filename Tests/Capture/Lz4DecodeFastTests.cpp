@@ -73,4 +73,19 @@ TEST(Lz4DecodeFast, RefusesNothing)
     EXPECT_LT(lz4_decode_fast(&byte, 1, nullptr, 0), 0);
 }
 
+// One more than 32 bits can count: what is left of the size would be a whole block.
+TEST(Lz4DecodeFast, RefusesASourceThatIsTooLarge)
+{
+    Bytes destination(text.size());
+    EXPECT_LT(lz4_decode_fast(block.data(), (std::size_t{1} << 32) + block.size(),
+                              destination.data(), destination.size()),
+              0);
+}
+
+TEST(Lz4DecodeFast, TakesADestinationOfAnySize)
+{
+    Bytes destination(64);
+    EXPECT_EQ(lz4_decode_fast(block.data(), block.size(), destination.data(), SIZE_MAX), 14);
+}
+
 } // namespace ventrik

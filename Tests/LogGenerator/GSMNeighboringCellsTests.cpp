@@ -110,6 +110,14 @@ TEST_F(NeighboringCellsTest, TheBSICListNamesTheNeighborsItKnows)
     EXPECT_EQ(shown(2, "BSIC"), "255");
 }
 
+TEST_F(NeighboringCellsTest, TheBSICListIsAsLongAsItsCountSays)
+{
+    feed(bsicList({{512, 7}, {513, 8}}).u8(14, 1));
+    feed(measurements(2).u16(29, 512).u16(43, 513));
+    EXPECT_EQ(shown(0, "BSIC"), "7");
+    EXPECT_EQ(shown(1, "BSIC"), "(none)");
+}
+
 TEST_F(NeighboringCellsTest, TheBSICListAppliesFromTheNextMeasurements)
 {
     feed(measurements(1).u16(29, 40));

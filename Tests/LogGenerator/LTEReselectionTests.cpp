@@ -162,6 +162,13 @@ TEST_F(ReselectionCandidatesListTest, ACandidateNeedsItsTechnologyPart)
     }
 }
 
+TEST_F(ReselectionCandidatesListTest, ARecordOf21BytesHasNoCandidates)
+{
+    rows.append("row");
+    feed(PacketBuilder(0xB186).size(21));
+    EXPECT_TRUE(rows.empty());
+}
+
 TEST_F(ReselectionCandidatesListTest, ARecordOf20BytesLeavesTheListAsItWas)
 {
     rows.append("row");

@@ -78,6 +78,30 @@ TEST(PeriodPackets, OfAnySizeMakeWayAsAWhole)
     EXPECT_EQ(kept.front(), dropped % 256);
 }
 
+TEST(PeriodPackets, OfAnEarlierPeriodDoNotMakeWayAgain)
+{
+    PeriodPackets packets;
+    packets.append(packet(3 * mebibyte, 200));
+    packets.take();
+    for (std::size_t i = 0; i < 65; ++i)
+        packets.append(packet(mebibyte, i));
+    EXPECT_EQ(packets.droppedCount(), 1U);
+    const Bytes kept = packets.take();
+    ASSERT_EQ(kept.size(), 64 * mebibyte);
+    EXPECT_EQ(kept.front(), 1);
+}
+
+// The history keeps them for long.
+TEST(PeriodPackets, ThatAreTakenHoldNoRoomOfThoseThatMadeWay)
+{
+    PeriodPackets packets;
+    packets.append(packet(64 * mebibyte, 1));
+    packets.append(packet(1000, 2));
+    const Bytes kept = packets.take();
+    EXPECT_EQ(kept, packet(1000, 2));
+    EXPECT_LE(kept.capacity(), 2000U);
+}
+
 TEST(PeriodPackets, ThatAreSmallTakeLittleMoreThanTheirBytes)
 {
     const auto before = mallinfo2().uordblks + mallinfo2().hblkhd;

@@ -87,6 +87,7 @@ TEST_F(TreeTest, SortingIsCaseSensitive)
 TEST_F(TreeTest, ASortedKeyWithTwoSeparatorsKeepsItsText)
 {
     EXPECT_EQ(treeOf(PlistDictionary{{"a;b;c", "1"}, {"_sorted", ""}}), "  a;b;c: 1\n");
+    EXPECT_EQ(treeOf(PlistDictionary{{"a;;c", "1"}, {"_sorted", ""}}), "  a;;c: 1\n");
 }
 
 TEST_F(TreeTest, OfTwoSortedKeysWithOneLabelTheIndexKeepsTheLater)

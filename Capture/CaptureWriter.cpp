@@ -37,7 +37,8 @@ std::optional<CaptureWriter> CaptureWriter::create(const std::string& path,
     std::unique_ptr<pcap, Closer> handle(
         pcap_open_dead(technology.linkType, static_cast<int>(maximumMessageSize)));
     // The library closes the stream that it writes to, hence one of its own.
-    std::FILE* stream = ::fdopen(::dup(::fileno(file->stream())), "w");
+    const int descriptor = ::dup(::fileno(file->stream()));
+    std::FILE* stream = descriptor < 0 ? nullptr : ::fdopen(descriptor, "w");
     std::unique_ptr<pcap_dumper, Closer> dumper(stream ? pcap_dump_fopen(handle.get(), stream)
                                                        : nullptr);
     if (!dumper) {

@@ -81,20 +81,20 @@ class TreeBuilder
     {
         // Arrays in an array are walked under its lock. Each lock within a lock would leave a level
         // behind, and the levels of a lock are finite.
-        std::optional<ArrayLock::Scope> locked;
-        if (_arraysAround == 0)
-            locked.emplace();
-        ++_arraysAround;
+        const bool isOutermost = !_locked;
+        if (isOutermost)
+            _locked.emplace();
         VentrikModelNode::Children children;
         children.reserve(array.size());
         for (const PlistValue& element : array)
             children.push_back(buildChild(fmt::format("{}", children.size()), element, place));
-        --_arraysAround;
+        if (isOutermost)
+            _locked.reset();
         return children;
     }
 
     PathIndex& _index;
-    int _arraysAround = 0;
+    std::optional<ArrayLock::Scope> _locked; // while an array is walked
 };
 
 } // namespace

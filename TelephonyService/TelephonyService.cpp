@@ -22,6 +22,16 @@ PlistDictionary refusal(int code)
             {TelephonyProtocol::errorCodeKey, code}};
 }
 
+std::string channelPortPrefix()
+{
+    return fmt::format("{}.LogChannel.", telephonyServicePortName);
+}
+
+bool isOwnPort(const std::string& name)
+{
+    return name == telephonyServicePortName || name.starts_with(channelPortPrefix());
+}
+
 } // namespace
 
 TelephonyService::TelephonyService(MainQueue& queue, MessagePorts& ports, SystemLog& log,
@@ -81,7 +91,7 @@ PlistDictionary TelephonyService::openChannel(const PortMessage& message)
 PlistDictionary TelephonyService::openChannelFor(const std::string& clientPortName)
 {
     // What we streamed to a port of ours would come back to us as commands.
-    if (clientPortName.starts_with(telephonyServicePortName)) {
+    if (isOwnPort(clientPortName)) {
         _log.error("Refused a log channel for {}: that is a port of the service", clientPortName);
         return refusal(EINVAL);
     }
@@ -106,11 +116,11 @@ PlistDictionary TelephonyService::openChannelFor(const std::string& clientPortNa
         });
     });
     auto stream = std::make_unique<LogChannel>(_queue, _log, _content, std::move(clientPort));
-    auto creation = _ports.createLocalPort(
-        fmt::format("{}.LogChannel.{}", telephonyServicePortName, number), PortSenders::SameUser,
-        [channel = stream.get()](const PortMessage& message) {
-            return channel->handleCommand(message.data);
-        });
+    auto creation = _ports.createLocalPort(fmt::format("{}{}", channelPortPrefix(), number),
+                                           PortSenders::SameUser,
+                                           [channel = stream.get()](const PortMessage& message) {
+                                               return channel->handleCommand(message.data);
+                                           });
     if (!creation.port || creation.alreadyExists) {
         _log.error("Refused a log channel for {}: {}", clientPortName, creation.error);
         return refusal(EADDRINUSE);

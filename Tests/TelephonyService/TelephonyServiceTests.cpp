@@ -151,6 +151,13 @@ TEST_F(TelephonyServiceTest, RefusesAClientThatNamesAPortOfTheService)
     EXPECT_EQ(service->channelCount(), 1U);
 }
 
+TEST_F(TelephonyServiceTest, TakesAClientWhoseNameOnlyBeginsLikeItsOwn)
+{
+    const std::string name = std::string(telephonyServicePortName) + "Viewer";
+    fake.ports.listen(name);
+    EXPECT_EQ(errorCode(openChannel(name)), 0);
+}
+
 TEST_F(TelephonyServiceTest, RefusesRequestsItDoesNotUnderstand)
 {
     EXPECT_EQ(errorCode(ask(telephonyServicePortName, Bytes{'x'})), EINVAL);

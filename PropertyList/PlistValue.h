@@ -1,12 +1,13 @@
 #pragma once
 
+#include "PropertyList/Bytes.h"
+
 #include <concepts>
 #include <cstddef>
 #include <cstdint>
 #include <limits>
 #include <memory>
 #include <optional>
-#include <span>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -16,9 +17,6 @@
 
 namespace ventrik
 {
-
-using Bytes = std::vector<std::uint8_t>;
-using ByteView = std::span<const std::uint8_t>;
 
 class PlistValue;
 

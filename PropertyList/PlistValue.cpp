@@ -120,6 +120,7 @@ PlistDictionary::PlistDictionary(
     std::initializer_list<std::pair<std::string_view, PlistValue>> entries)
     : PlistDictionary()
 {
+    reserve(entries.size());
     for (const auto& [key, value] : entries)
         set(key, value);
 }
@@ -139,6 +140,21 @@ PlistValue* PlistDictionary::find(std::string_view key)
 {
     const auto place = _storage->place(key);
     return place ? &_storage->entries[*place].value : nullptr;
+}
+
+std::optional<std::size_t> PlistDictionary::placeOf(std::string_view key) const
+{
+    return _storage->place(key);
+}
+
+PlistDictionary::Entry* PlistDictionary::entryAt(std::size_t place)
+{
+    return place < size() ? &_storage->entries[place] : nullptr;
+}
+
+const PlistDictionary::Entry* PlistDictionary::entryAt(std::size_t place) const
+{
+    return place < size() ? &_storage->entries[place] : nullptr;
 }
 
 void PlistDictionary::set(std::string_view key, PlistValue value)
@@ -169,6 +185,13 @@ void PlistDictionary::clear()
 {
     _storage->entries.clear();
     _storage->places.clear();
+}
+
+void PlistDictionary::reserve(std::size_t count)
+{
+    _storage->entries.reserve(count);
+    if (count > linearSearchLimit)
+        _storage->places.reserve(count);
 }
 
 const PlistDictionary::Entry* PlistDictionary::begin() const

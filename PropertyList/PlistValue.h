@@ -98,10 +98,20 @@ class PlistDictionary
     const PlistValue* find(std::string_view key) const;
     PlistValue* find(std::string_view key);
 
+    /// The key's place in the order. It stays that of the key until a key before it is removed, so
+    /// a caller that keeps it gets at the entry without a search: `entryAt`, then look at its key.
+    std::optional<std::size_t> placeOf(std::string_view key) const;
+    /// The entry at the place, or null past the end. Valid until the dictionary changes; its key
+    /// must stay as it is.
+    Entry* entryAt(std::size_t place);
+    const Entry* entryAt(std::size_t place) const;
+
     /// Replaces the key's value in its place, or adds the key at the end.
     void set(std::string_view key, PlistValue value);
     bool remove(std::string_view key);
     void clear();
+    /// Makes room for that many entries, so that adding them moves none.
+    void reserve(std::size_t count);
 
     const Entry* begin() const;
     const Entry* end() const;

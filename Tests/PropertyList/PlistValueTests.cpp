@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <limits>
+#include <utility>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -160,6 +161,58 @@ TEST(PlistDictionary, IsEmptyAndUsableAfterClear)
     EXPECT_FALSE(dictionary.contains(numberedKey(1)));
     dictionary.set("new", 1);
     EXPECT_THAT(keysOf(dictionary), testing::ElementsAre("new"));
+}
+
+TEST(PlistDictionary, TellsThePlaceOfAKeyAmongFewAndAmongMany)
+{
+    for (const int count : {3, 40}) {
+        const PlistDictionary dictionary = numberedDictionary(count);
+        EXPECT_EQ(dictionary.placeOf(numberedKey(2)), 2U);
+        EXPECT_EQ(dictionary.placeOf(numberedKey(count - 1)), static_cast<std::size_t>(count - 1));
+        EXPECT_EQ(dictionary.placeOf(numberedKey(count)), std::nullopt);
+    }
+}
+
+TEST(PlistDictionary, KeepsThePlaceOfAKeyWhileOthersAreSetAndRemovedAfterIt)
+{
+    PlistDictionary dictionary = numberedDictionary(20);
+    const auto place = dictionary.placeOf(numberedKey(5));
+    dictionary.set(numberedKey(0), "new");
+    dictionary.set(numberedKey(20), "more");
+    dictionary.remove(numberedKey(6));
+    EXPECT_EQ(dictionary.placeOf(numberedKey(5)), place);
+    dictionary.remove(numberedKey(4));
+    EXPECT_EQ(dictionary.placeOf(numberedKey(5)), *place - 1);
+}
+
+TEST(PlistDictionary, GivesTheEntryAtAPlaceForChange)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}};
+    PlistDictionary::Entry* entry = dictionary.entryAt(1);
+    ASSERT_NE(entry, nullptr);
+    EXPECT_EQ(entry->key, "b");
+    entry->value = 3;
+    EXPECT_EQ(*dictionary.find("b"), PlistValue(3));
+}
+
+TEST(PlistDictionary, HasNoEntryPastTheEnd)
+{
+    PlistDictionary dictionary{{"a", 1}};
+    EXPECT_EQ(dictionary.entryAt(1), nullptr);
+    EXPECT_EQ(std::as_const(dictionary).entryAt(1), nullptr);
+    EXPECT_EQ(PlistDictionary().entryAt(0), nullptr);
+}
+
+TEST(PlistDictionary, MovesNoEntryWhileReservedRoomIsFilled)
+{
+    PlistDictionary dictionary;
+    dictionary.reserve(40);
+    dictionary.set(numberedKey(0), 0);
+    const PlistDictionary::Entry* first = dictionary.begin();
+    for (int i = 1; i < 40; ++i)
+        dictionary.set(numberedKey(i), i);
+    EXPECT_EQ(dictionary.begin(), first);
+    EXPECT_EQ(dictionary, numberedDictionary(40));
 }
 
 TEST(PlistDictionary, IsEqualInAnyOrder)

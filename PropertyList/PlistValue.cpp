@@ -68,6 +68,17 @@ void PlistArray::removeFirst(std::size_t count)
     _values->erase(first, first + static_cast<std::ptrdiff_t>(std::min(count, size())));
 }
 
+void PlistArray::replace(std::size_t index, PlistValue value)
+{
+    _values->at(index) = std::move(value);
+}
+
+void PlistArray::truncate(std::size_t count)
+{
+    if (count < size())
+        _values->erase(_values->begin() + static_cast<std::ptrdiff_t>(count), _values->end());
+}
+
 void PlistArray::clear()
 {
     _values->clear();
@@ -92,6 +103,7 @@ struct PlistDictionary::Storage {
     std::vector<Entry> entries;
     // Key to place in `entries`; kept only once there are more than `linearSearchLimit` of them.
     std::unordered_map<std::string, std::size_t, KeyHash, std::equal_to<>> places;
+    std::size_t removals = 0;
 
     std::optional<std::size_t> place(std::string_view key) const
     {
@@ -147,6 +159,11 @@ std::optional<std::size_t> PlistDictionary::placeOf(std::string_view key) const
     return _storage->place(key);
 }
 
+std::size_t PlistDictionary::removalCount() const
+{
+    return _storage->removals;
+}
+
 PlistDictionary::Entry* PlistDictionary::entryAt(std::size_t place)
 {
     return place < size() ? &_storage->entries[place] : nullptr;
@@ -163,7 +180,8 @@ void PlistDictionary::set(std::string_view key, PlistValue value)
         *existing = std::move(value);
         return;
     }
-    auto& [entries, places] = *_storage;
+    auto& entries = _storage->entries;
+    auto& places = _storage->places;
     entries.push_back({std::string(key), std::move(value)});
     if (!places.empty())
         places.emplace(key, entries.size() - 1);
@@ -177,14 +195,26 @@ bool PlistDictionary::remove(std::string_view key)
     if (!place)
         return false;
     _storage->entries.erase(_storage->entries.begin() + static_cast<std::ptrdiff_t>(*place));
+    ++_storage->removals;
     _storage->rebuildPlaces();
     return true;
+}
+
+void PlistDictionary::truncate(std::size_t count)
+{
+    if (count >= size())
+        return;
+    auto& entries = _storage->entries;
+    entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(count), entries.end());
+    ++_storage->removals;
+    _storage->rebuildPlaces();
 }
 
 void PlistDictionary::clear()
 {
     _storage->entries.clear();
     _storage->places.clear();
+    ++_storage->removals;
 }
 
 void PlistDictionary::reserve(std::size_t count)

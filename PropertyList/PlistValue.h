@@ -63,7 +63,11 @@ class PlistArray
     const PlistValue* end() const;
 
     void append(PlistValue value);
+    /// Puts the value in the place of the one at the index, which must be below the size.
+    void replace(std::size_t index, PlistValue value);
     void removeFirst(std::size_t count);
+    /// Removes what stands behind the first so many.
+    void truncate(std::size_t count);
     void clear();
     void reserve(std::size_t count);
 
@@ -101,6 +105,8 @@ class PlistDictionary
     /// The key's place in the order. It stays that of the key until a key before it is removed, so
     /// a caller that keeps it gets at the entry without a search: `entryAt`, then look at its key.
     std::optional<std::size_t> placeOf(std::string_view key) const;
+    /// How often entries were removed. While it stays, each key is where it was.
+    std::size_t removalCount() const;
     /// The entry at the place, or null past the end. Valid until the dictionary changes; its key
     /// must stay as it is.
     Entry* entryAt(std::size_t place);
@@ -109,6 +115,8 @@ class PlistDictionary
     /// Replaces the key's value in its place, or adds the key at the end.
     void set(std::string_view key, PlistValue value);
     bool remove(std::string_view key);
+    /// Removes the entries behind the first so many.
+    void truncate(std::size_t count);
     void clear();
     /// Makes room for that many entries, so that adding them moves none.
     void reserve(std::size_t count);

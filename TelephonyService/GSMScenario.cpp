@@ -1,7 +1,9 @@
 #include "TelephonyService/GSMScenario.h"
 
+#include "Packets/GSMRecords.h"
+#include "Packets/RecordWriter.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
-#include "TelephonyService/PacketBuilder.h"
 
 #include <algorithm>
 #include <cmath>
@@ -118,9 +120,10 @@ std::uint8_t withoutSign(double dBm)
     return byteOf(-dBm);
 }
 
-std::uint16_t signedWord(double value)
+// Levels of the receiver and the transmitter stand in tenths of a dB above this one less 51.2 dB.
+std::int64_t rawPower(double level, double zero)
 {
-    return static_cast<std::uint16_t>(std::lround(value));
+    return std::lround(10.0 * (level - zero) - 512.0);
 }
 
 // Energies stand in steps of a 524288th of the carrier's.
@@ -200,34 +203,35 @@ void GSMScenario::reportServingPLMN()
 {
     const bool isOnUMTS = _ride.isOnUMTS();
     constexpr std::uint8_t bothServices = 3;
-    report(
-        PacketBuilder(0x7135)
-            .u8(13, isOnUMTS ? 0 : 1)
-            .u8(14, _ride.phase() == Phase::cellSelection ? 0 : bothServices)
-            .u8(15, 0x62) // 262, 07
-            .u8(16, 0xF2)
-            .u8(17, 0x70)
-            .u16BigEndian(18, isOnUMTS ? _ride.umtsCell().locationAreaCode
-                                       : _ride.gsmCell().locationAreaCode)
-            .u8(20, isOnUMTS ? _ride.umtsCell().routingAreaCode : _ride.gsmCell().routingAreaCode)
-            .size(32));
+    report(RecordWriter(GSMRecords::servingPLMN)
+               .set("Network Operating Mode", isOnUMTS ? 0 : 1)
+               .set("Service Type", _ride.phase() == Phase::cellSelection ? 0 : bothServices)
+               // 262, 07: the low nibble comes first, and a filler stands for the third digit.
+               .set("Mobile Country Code", 0x262)
+               .set("Mobile Network Code", 0x70F)
+               .set("Location Area Code",
+                    isOnUMTS ? _ride.umtsCell().locationAreaCode : _ride.gsmCell().locationAreaCode)
+               .set("Routing Area Code",
+                    isOnUMTS ? _ride.umtsCell().routingAreaCode : _ride.gsmCell().routingAreaCode));
 }
 
 // Entries lie over each other by half, so the networks are two whose digits allow it: 262, 26 and
 // 262, 203. Behind the last one stand its other three bytes.
 void GSMScenario::reportEquivalentPLMNs()
 {
-    report(PacketBuilder(0x7150).u8(16, 2).bytes(17, Bytes{2, 0, 6, 2, 2, 6, 0, 2, 3}));
+    RecordWriter record(GSMRecords::equivalentPLMNs);
+    for (const std::int64_t digits : {0x060202060002, 0x030200060202})
+        record.add(GSMRecords::equivalentPLMNList).set("digits", digits);
+    report(record);
 }
 
 void GSMScenario::reportRegistration()
 {
     constexpr std::uint8_t idle = 1;
     constexpr std::uint8_t registering = 2;
-    report(PacketBuilder(0x7132)
-               .u8(13, _ride.phase() == Phase::cellSelection ? registering : idle)
-               .u8(14, 0)
-               .size(16));
+    report(RecordWriter(GSMRecords::registration)
+               .set("MM Service State", _ride.phase() == Phase::cellSelection ? registering : idle)
+               .set("PLMN Sel Mod", 0));
 }
 
 void GSMScenario::reportMobilityManagement()
@@ -235,38 +239,37 @@ void GSMScenario::reportMobilityManagement()
     const bool isRegistered = _ride.phase() != Phase::cellSelection;
     constexpr std::uint8_t mmNormalService = 8;
     constexpr std::uint8_t mmUpdateNeeded = 5;
-    report(PacketBuilder(0x7131)
-               .u8(13, mmStateIn(_ride.phase()))
-               .u8(14, isRegistered ? mmNormalService : mmUpdateNeeded)
-               .u8(15, isRegistered ? 0 : 1));
+    report(RecordWriter(GSMRecords::mmState)
+               .set("MM State", mmStateIn(_ride.phase()))
+               .set("MM Sub State", isRegistered ? mmNormalService : mmUpdateNeeded)
+               .set("LU Reject Cause", isRegistered ? 0 : 1));
     constexpr std::uint8_t gmmNormalService = 0;
     constexpr std::uint8_t gmmAttachNeeded = 2;
-    report(PacketBuilder(0x7130)
-               .u8(13, gmmStateIn(_ride.phase()))
-               .u8(14, isRegistered ? gmmNormalService : gmmAttachNeeded)
-               .u8(15, isRegistered ? 0 : 1));
+    report(RecordWriter(GSMRecords::gmmState)
+               .set("MM State", gmmStateIn(_ride.phase()))
+               .set("MM Sub State", isRegistered ? gmmNormalService : gmmAttachNeeded)
+               .set("Attach Reject Cause", isRegistered ? 0 : 1));
 }
 
 void GSMScenario::reportGSMState()
 {
     const bool isInCall = _ride.phase() == Phase::call;
     const bool isVoice = isInCall || _ride.phase() == Phase::callSetup;
-    report(PacketBuilder(0x512C)
-               .u8(13, rrStateIn(_ride.phase()))
-               .u8(14, isVoice ? 2 : 1)
-               .u8(15, 0)
-               .u8(16, isVoice ? 0 : 1));
-    report(PacketBuilder(0x5072).u8(19, isInCall ? 1 : 0));
+    report(RecordWriter(GSMRecords::rrState)
+               .set("RR State", rrStateIn(_ride.phase()))
+               .set("RR Sub State", isVoice ? 2 : 1)
+               .set("RR Status", 0)
+               .set("RR Mode", isVoice ? 0 : 1));
+    report(RecordWriter(GSMRecords::dtx).set("DTX Used", isInCall ? 1 : 0));
 }
 
 void GSMScenario::reportGSMCell()
 {
     const GSMRideCell& cell = _ride.gsmCell();
-    report(PacketBuilder(0x5134)
-               .u16(13, cell.arfcn)
-               .u16(15, cell.bsic)
-               .u16(17, cell.cellIdentity)
-               .size(26));
+    report(RecordWriter(GSMRecords::cellIdentity)
+               .set("ARFCN", cell.arfcn)
+               .set("BSIC", cell.bsic)
+               .set("Cell ID", cell.cellIdentity));
 }
 
 // What the cell broadcasts about packet data.
@@ -274,15 +277,22 @@ void GSMScenario::reportPacketInformation()
 {
     constexpr std::uint8_t untold = 255;
     constexpr std::uint8_t everyPriority = 7;
-    report(PacketBuilder(0x51F4).u8(14, 0));
-    report(PacketBuilder(0x51F5)
-               .u8(13, _ride.gsmCell().locationAreaCode == 4711 ? untold : 1)
-               .u8(14, everyPriority)
-               .u8(15, 0)
-               .size(18));
-    report(PacketBuilder(0x51F6).u8(15, 0).u8(16, 4).u8(17, 0).size(24));
-    report(PacketBuilder(0x51FB).u8(13, 0).size(34));
-    report(PacketBuilder(0x51FD).u8(13, 0).u8(14, 4).u8(15, 2).u8(16, 0).u8(33, 1).size(35));
+    report(RecordWriter(GSMRecords::si13).set("SI13 Position", 0));
+    report(RecordWriter(GSMRecords::packetOptions)
+               .set("PFC Supported", _ride.gsmCell().locationAreaCode == 4711 ? untold : 1)
+               .set("Priority Access Threshold", everyPriority)
+               .set("Network Control Order", 0));
+    report(RecordWriter(GSMRecords::cellOptions)
+               .set("T3192", 0)
+               .set("DRX Timer Max", 4)
+               .set("Access Burst Type", 0));
+    report(RecordWriter(GSMRecords::broadcastChannel).set("PBCCH Present", 0));
+    report(RecordWriter(GSMRecords::measurementOrder)
+               .set("Packet PSI Status", 0)
+               .set("Count LR", 4)
+               .set("Count HR", 2)
+               .set("Ext Measurement Order", 0)
+               .set("Packet SI Status", 1));
 }
 
 // On a dedicated channel the two words are the qualities of the link, else the cell's criteria.
@@ -294,66 +304,56 @@ void GSMScenario::reportIdleMeasurements()
     const bool isOnDedicatedChannel = _ride.phase() == Phase::call;
     const double criterion = std::max(0.0, level - lowestLevel);
     const unsigned quality = _ride.receiveQuality();
-    const auto neighbors = _ride.gsmNeighbors();
-    PacketBuilder packet(0x5137);
-    packet.u8(15, withoutSign(level))
-        .u32(16, isOnDedicatedChannel ? quality : byteOf(criterion))
-        .u32(20, isOnDedicatedChannel ? quality : byteOf(criterion + reselectionOffset))
-        .u8(26, 1)
-        .u8(28, static_cast<std::uint8_t>(neighbors.size()));
-    std::size_t offset = 29;
-    for (const GSMRideCell* cell : neighbors) {
+    RecordWriter record(GSMRecords::idleMeasurements);
+    record.set("RSSI", withoutSign(level))
+        .set("Rx Quality Full", isOnDedicatedChannel ? quality : byteOf(criterion))
+        .set("Rx Quality Sub",
+             isOnDedicatedChannel ? quality : byteOf(criterion + reselectionOffset))
+        .set("Cell Reselect Hysteresis", 1);
+    for (const GSMRideCell* cell : _ride.gsmNeighbors()) {
         const double neighborLevel = _ride.rssi(*cell);
-        packet.u16(offset, cell->arfcn)
-            .u8(offset + 2, withoutSign(neighborLevel))
-            .u32(offset + 3, byteOf(std::max(0.0, neighborLevel - lowestLevel)));
-        offset += 14;
-        packet.size(offset);
+        record.add(GSMRecords::idleNeighbors)
+            .set("ARFCN", cell->arfcn)
+            .set("RSSI", withoutSign(neighborLevel))
+            .set("C1 Value", byteOf(std::max(0.0, neighborLevel - lowestLevel)));
     }
-    report(std::move(packet));
+    report(record);
 }
 
 void GSMScenario::reportBSICs()
 {
-    const auto neighbors = _ride.gsmNeighbors();
-    PacketBuilder packet(0x51FF);
-    packet.u8(14, static_cast<std::uint8_t>(neighbors.size()));
-    std::size_t offset = 15;
-    for (const GSMRideCell* cell : neighbors) {
-        packet.u16(offset, cell->arfcn).u8(offset + 2, cell->bsic).u8(offset + 3, 0);
-        offset += 4;
-    }
-    report(std::move(packet));
+    RecordWriter record(GSMRecords::bsicList);
+    for (const GSMRideCell* cell : _ride.gsmNeighbors())
+        record.add(GSMRecords::bsics).set("ARFCN", cell->arfcn).set("BSIC", cell->bsic);
+    report(record);
 }
 
 // The call hops over four frequencies beside the cell's own.
 void GSMScenario::reportDedicatedChannel()
 {
-    constexpr std::uint8_t frequencyCount = 4;
-    PacketBuilder allocation(0x51F8);
-    allocation.u8(13, 23).u8(14, frequencyCount);
-    for (std::uint8_t i = 0; i < frequencyCount; ++i)
-        allocation.u16(15 + std::size_t{2} * i, static_cast<std::uint16_t>(80 + 3 * i));
-    report(std::move(allocation));
-    report(PacketBuilder(0x5076).u16(13, 80).size(17));
+    RecordWriter allocation(GSMRecords::mobileAllocation);
+    allocation.set("HSN", 23);
+    for (const int frequency : {80, 83, 86, 89})
+        allocation.add(GSMRecords::frequencies).set("", frequency);
+    report(allocation);
+    report(RecordWriter(GSMRecords::dedicatedChannel).set("ARFCN", 80));
 }
 
 void GSMScenario::reportUMTSState()
 {
-    report(PacketBuilder(0x4125).u8(13, rrcStateIn(_ride.phase())));
+    report(RecordWriter(GSMRecords::rrcState).set("RRC State", rrcStateIn(_ride.phase())));
 }
 
 void GSMScenario::reportUMTSCell()
 {
     constexpr std::uint16_t duplexSpacing = 950; // channels of 200 kHz: 190 MHz
     const UMTSRideCell& cell = _ride.umtsCell();
-    report(PacketBuilder(0x4127)
-               .u32(13, cell.uarfcn - std::uint32_t{duplexSpacing})
-               .u32(17, cell.uarfcn)
-               .u32(21, cell.cellIdentity)
-               .u16(25, cell.uraId)
-               .size(29));
-    report(PacketBuilder(0x4157).u8(13, 1).size(19));
+    report(RecordWriter(GSMRecords::umtsCell)
+               .set("Uplink Frequency", cell.uarfcn - duplexSpacing)
+               .set("Downlink Frequency", cell.uarfcn)
+               .set("Cell ID", cell.cellIdentity)
+               .set("URA ID", cell.uraId));
+    report(RecordWriter(GSMRecords::security).set("Ciphering", 1));
 }
 
 // The phone combines the cells that come in nearly as well as the best one.
@@ -366,30 +366,28 @@ void GSMScenario::reportCellEnergies()
     std::erase_if(cells, [&](const UMTSRideCell* cell) { return cell->uarfcn != serving.uarfcn; });
     cells.insert(cells.begin(), &serving);
 
-    PacketBuilder packet(0x417A);
-    packet.u16(13, signedWord(10.0 * (_ride.carrierPower() + 106.0) - 512.0))
-        .u8(15, static_cast<std::uint8_t>(cells.size()));
-    const std::size_t energies = 16 + 15 * cells.size();
-    for (std::size_t i = 0; i < cells.size(); ++i) {
-        const UMTSRideCell& cell = *cells[i];
-        const bool isActive = _ride.rscp(cell) > _ride.rscp(serving) - activeMargin;
-        packet.bits(16 + 15 * i + 7, 0, 13, cell.scramblingCode)
-            .bits(16 + 15 * i + 8, 5, 3, isActive ? active : monitored)
-            .u32(energies + 44 * i + 32, rawEnergy(_ride.ecno(cell)));
+    RecordWriter record(GSMRecords::cellList);
+    record.set("receive AGC", rawPower(_ride.carrierPower(), -106.0));
+    for (const UMTSRideCell* cell : cells) {
+        const bool isActive = _ride.rscp(*cell) > _ride.rscp(serving) - activeMargin;
+        record.add(GSMRecords::listedCells)
+            .set("scrambling code", cell->scramblingCode)
+            .set("set type", isActive ? active : monitored);
     }
-    report(packet.size(energies + 44 * cells.size()));
+    for (const UMTSRideCell* cell : cells)
+        record.add(GSMRecords::energies).set("first Ec/Io", rawEnergy(_ride.ecno(*cell)));
+    report(record);
 }
 
 void GSMScenario::reportTransmitPower()
 {
-    constexpr std::uint8_t sampleCount = 5;
-    PacketBuilder packet(0x4031);
-    packet.u8(14, sampleCount).size(16 + 14 * std::size_t{sampleCount});
-    for (std::uint8_t i = 0; i < sampleCount; ++i) {
+    constexpr int sampleCount = 5;
+    RecordWriter record(GSMRecords::transmitPower);
+    for (int i = 0; i < sampleCount; ++i) {
         const double power = _ride.transmitPower() + i % 3 - 1; // the loop steps up and down
-        packet.u16(16 + std::size_t{14} * i + 4, signedWord(10.0 * (power + 70.0) - 512.0));
+        record.add(GSMRecords::powerSamples).set("power", rawPower(power, -70.0));
     }
-    report(std::move(packet));
+    report(record);
 }
 
 // Either list begins at the same place, so a record holds one: cells of the own technology while
@@ -397,52 +395,49 @@ void GSMScenario::reportTransmitPower()
 void GSMScenario::reportRankedCells()
 {
     constexpr int stepsOnOwnTechnology = 100;
-    PacketBuilder packet(0x4005);
-    std::size_t offset = 15;
+    RecordWriter record(GSMRecords::rankedCells);
     if (_ride.phase() == Phase::umtsCamping && _ride.stepsInPhase() > stepsOnOwnTechnology) {
-        const auto cells = _ride.gsmNeighbors();
-        packet.u8(14, static_cast<std::uint8_t>(cells.size()));
-        for (const GSMRideCell* cell : cells) {
+        for (const GSMRideCell* cell : _ride.gsmNeighbors()) {
             const double level = _ride.rssi(*cell);
-            packet.u16(offset, cell->arfcn)
-                .u16(offset + 2, cell->bsic)
-                .u8(offset + 4, signedByteOf(level))
-                .u16(offset + 5, signedWord(level));
-            offset += 7;
+            record.add(GSMRecords::rankedGSMCells)
+                .set("ARFCN", cell->arfcn)
+                .set("BSIC", cell->bsic)
+                .level("RSSI", level)
+                .level("Ranking Value", level);
         }
     } else {
         auto cells = _ride.umtsNeighbors();
         cells.insert(cells.begin(), &_ride.umtsCell());
-        packet.u8(13, static_cast<std::uint8_t>(cells.size()));
         for (const UMTSRideCell* cell : cells) {
             const double level = _ride.rscp(*cell);
-            packet.u16(offset, cell->uarfcn)
-                .u16(offset + 2, cell->scramblingCode)
-                .u8(offset + 4, signedByteOf(level + 21))
-                .u16(offset + 5, signedWord(level))
-                .u8(offset + 7, signedByteOf(2.0 * _ride.ecno(*cell)))
-                .u16(offset + 8, signedWord(level));
-            offset += 10;
+            record.add(GSMRecords::rankedUMTSCells)
+                .set("Downlink Frequency", cell->uarfcn)
+                .set("Scrambling Code", cell->scramblingCode)
+                .level("RSCP", level)
+                .level("Rank Cell RSCP", level)
+                .level("Energy Per Chip", _ride.ecno(*cell))
+                .level("Ranking Value", level);
         }
     }
-    report(packet.size(offset));
+    report(record);
 }
 
 void GSMScenario::reportBlockErrors()
 {
     constexpr std::uint32_t blocksInWindow = 100;
     const double errors = blocksInWindow * _ride.blockErrorRate();
-    PacketBuilder packet(0x4116);
-    packet.u8(13, transportChannelCount).u16(14, blocksInWindow);
+    RecordWriter record(GSMRecords::blockErrors);
+    record.set("Window Size", blocksInWindow);
     for (std::size_t i = 0; i < transportChannelCount; ++i) {
         BlockCounter& blocks = _blocks.at(i);
         blocks.received += blocksInWindow;
         blocks.inError += byteOf(errors / static_cast<double>(i + 1));
-        packet.u8(16 + 9 * i, static_cast<std::uint8_t>(i + 1))
-            .u32(17 + 9 * i, blocks.received)
-            .u32(21 + 9 * i, blocks.inError);
+        record.add(GSMRecords::transportChannels)
+            .set("Transport Channel ID", static_cast<std::int64_t>(i + 1))
+            .set("CRC Received", blocks.received)
+            .set("CRC Received in Error", blocks.inError);
     }
-    report(std::move(packet));
+    report(record);
 }
 
 // Each report counts anew: 100 sub-frames of 2 ms, dealt to the processes in turn.
@@ -452,28 +447,27 @@ void GSMScenario::reportHSDPA()
     constexpr std::uint32_t bitsInBlock = 7168;
     constexpr unsigned dualCarrier = 2;
     const bool isDual = _ride.phase() == Phase::dualCarrierHSDPA;
-    PacketBuilder packet(0x4221);
-    packet.u8(13, 1)
-        .bits(14, 0, 10, subFrames)
-        .bits(15, 2, 2, isDual ? dualCarrier : 0)
-        .u8(16, harqProcessCount)
-        .u8(17, isDual ? harqProcessCount : 0);
-    const auto putProcesses = [&](std::size_t offset, unsigned share) {
-        for (std::size_t i = 0; i < harqProcessCount; ++i, offset += 9) {
+    RecordWriter record(GSMRecords::hsdpa);
+    record.set("Version", 1)
+        .set("Sub Frames", subFrames)
+        .set("Carrier Info", isDual ? dualCarrier : 0);
+    const auto addProcesses = [&](const List& processes, unsigned share) {
+        for (std::size_t i = 0; i < harqProcessCount; ++i) {
             const auto blocks =
                 static_cast<std::uint16_t>(subFrames / harqProcessCount + i % share);
             const auto errors = std::min<std::uint16_t>(
                 blocks, byteOf(blocks * _ride.blockErrorRate() + static_cast<double>(i % 2)));
-            packet.u8(offset, static_cast<std::uint8_t>(i))
-                .u32(offset + 1, bitsInBlock * (blocks - std::uint32_t{errors}))
-                .u16(offset + 5, blocks)
-                .u16(offset + 7, errors);
+            record.add(processes)
+                .set("Process ID", static_cast<std::int64_t>(i))
+                .set("No Rx Bits", bitsInBlock * (blocks - std::uint32_t{errors}))
+                .set("New Tx", blocks)
+                .set("Block Errors", errors);
         }
     };
-    putProcesses(18, 2);
+    addProcesses(GSMRecords::primaryProcesses, 2);
     if (isDual)
-        putProcesses(18 + 162 * harqProcessCount, 3);
-    report(std::move(packet));
+        addProcesses(GSMRecords::secondaryProcesses, 3);
+    report(record);
 }
 
 void GSMScenario::reportCellMonitor()
@@ -505,7 +499,7 @@ void GSMScenario::reportCellMonitor()
         addUMTS(*cell, false);
     for (const GSMRideCell* cell : _ride.gsmNeighbors())
         addGSM(*cell, false);
-    reportPropertyList(0xFF0001, cells);
+    reportPropertyList(SharedRecords::cellMonitor.logCode, cells);
 }
 
 } // namespace ventrik

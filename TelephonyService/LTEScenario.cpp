@@ -1,10 +1,13 @@
 #include "TelephonyService/LTEScenario.h"
 
+#include "Packets/LTERecords.h"
+#include "Packets/RecordWriter.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
-#include "TelephonyService/PacketBuilder.h"
 
 #include <algorithm>
 #include <cmath>
+#include <span>
 
 namespace ventrik
 {
@@ -16,6 +19,7 @@ constexpr std::uint64_t cellMonitorSteps = 60;  // every 3 s
 constexpr std::uint64_t idleNeighborSteps = 10; // every 0.5 s while idle
 constexpr std::uint64_t reselectionSteps = 40;  // every 2 s while idle
 constexpr int qrxlevmin = -124;                 // dBm
+constexpr int maximumPower = 23;                // dBm
 constexpr double detectableRsrp = -118;         // dBm
 constexpr double measurableMargin = 26;         // dB below the serving cell
 
@@ -63,22 +67,22 @@ void LTEScenario::reportNewCell()
 void LTEScenario::reportCellInfo()
 {
     const LTECell& cell = _drive.servingCell();
-    report(PacketBuilder(0xB0C2)
-               .u8(13, 2)
-               .u16(14, cell.physicalCellId)
-               .u16(16, cell.downlinkEarfcn)
-               .u16(18, cell.uplinkEarfcn)
-               .u8(20, cell.resourceBlocks)
-               .u8(21, cell.resourceBlocks)
-               .u32(22, cell.cellIdentity)
-               .u16(26, cell.trackingAreaCode)
-               .u32(28, cell.band)
-               .size(38));
+    report(RecordWriter(LTERecords::cellInfo)
+               .set("version", 2)
+               .set("Physical Cell ID", cell.physicalCellId)
+               .set("Download Frequency", cell.downlinkEarfcn)
+               .set("Upload Frequency", cell.uplinkEarfcn)
+               .set("Download Bandwidth", cell.resourceBlocks)
+               .set("Upload Bandwidth", cell.resourceBlocks)
+               .set("Cell Identity", cell.cellIdentity)
+               .set("Tracking Area Code", cell.trackingAreaCode)
+               .set("Freq Band Indicator", cell.band));
 }
 
 void LTEScenario::reportAntennaCount()
 {
-    report(PacketBuilder(0xB0C1).u8(20, _drive.servingCell().antennas).size(22));
+    report(RecordWriter(LTERecords::antennaCount)
+               .set("Num Tx Antennas", _drive.servingCell().antennas));
 }
 
 void LTEScenario::reportIdleMeasurement()
@@ -89,38 +93,37 @@ void LTEScenario::reportIdleMeasurement()
     const double measuredRsrq = _drive.rsrq(cell, measured);
     const double averageRsrq = _drive.rsrq(cell, average);
     const double srxlev = average - qrxlevmin;
-    report(PacketBuilder(0xB17F)
-               .u8(13, 3)
-               .u16(17, cell.downlinkEarfcn)
-               .bits(19, 0, 9, cell.physicalCellId)
-               .bits(19, 9, 4, cell.layerPriority)
-               .bits(21, 0, 9, rawLevel(measured, -140, 0.25, 9))
-               .bits(22, 1, 9, rawLevel(average, -140, 0.25, 9))
-               .bits(23, 2, 7, rawLevel(measuredRsrq, -30, 0.25, 7))
-               .bits(24, 1, 7, rawLevel(averageRsrq, -30, 0.25, 7))
-               .bits(25, 0, 9, rawLevel(_drive.rssi(cell, measured, measuredRsrq), -140, 0.5, 9))
-               .bits(26, 1, 6, (qrxlevmin + 140) / 2)
-               .bits(26, 7, 7, 23 + 30)
-               .bits(27, 6, 6, 23 + 30)
-               .bits(29, 0, 7, rawLevel(srxlev, -30, 1, 7))
-               .bits(29, 7, 6, srxlev < 0 ? 1 : 0)
-               .bits(30, 5, 6, 62 / 2)
-               .bits(31, 3, 6, 10 / 2)
-               .bits(32, 1, 1, average < -100 ? 1 : 0)
-               .bits(32, 2, 4, average < -100 ? 3 : 1)
-               .size(33));
+    report(RecordWriter(LTERecords::servingCellMeasurement)
+               .set("Version", 3)
+               .set("E-ARFCN", cell.downlinkEarfcn)
+               .set("Physical Cell ID", cell.physicalCellId)
+               .set("Serving Layer Priority", cell.layerPriority)
+               .level("Measured RSRP", measured)
+               .level("Average RSRP", average)
+               .level("Measured RSRQ", measuredRsrq)
+               .level("Average RSRQ", averageRsrq)
+               .level("Measured RSSI", _drive.rssi(cell, measured, measuredRsrq))
+               .level("Qrxlevmin", qrxlevmin)
+               .level("P_Max", maximumPower)
+               .level("Max UE Tx Power", maximumPower)
+               .level("Srxlev", srxlev)
+               .set("Num of Consecutive DRX Cycles of S < 0", srxlev < 0 ? 1 : 0)
+               .level("S Intra Search", 62)
+               .level("S Non Intra Search", 10)
+               .set("Measurement Rules Updated", average < -100 ? 1 : 0)
+               .set("Measurement Rules", average < -100 ? 3 : 1));
 }
 
 void LTEScenario::reportConnectedMeasurement()
 {
     const LTECell& serving = _drive.servingCell();
     const double rsrp = _drive.averageRsrp(serving);
-    PacketBuilder packet(0xB179);
-    packet.u16(17, serving.downlinkEarfcn)
-        .u16(19, serving.physicalCellId)
-        .u16(21, static_cast<std::uint16_t>(step() * 50 % 10240))
-        .u16(23, rawLevel(rsrp, -140, 0.25, 16))
-        .u16(25, rawLevel(_drive.rsrq(serving, rsrp), -20, 0.125, 16));
+    RecordWriter record(LTERecords::connectedMode);
+    record.set("E-ARFCN", serving.downlinkEarfcn)
+        .set("Serving Physical Cell ID", serving.physicalCellId)
+        .set("Subframe Number", static_cast<std::int64_t>(step() * 50 % 10240))
+        .level("Serving Filtered RSRP", rsrp)
+        .level("Serving Filtered RSRQ", _drive.rsrq(serving, rsrp));
 
     // What is much weaker than the serving cell is noticed, but not measured.
     auto neighbours = neighborsOfServingCell();
@@ -128,21 +131,17 @@ void LTEScenario::reportConnectedMeasurement()
         std::stable_partition(neighbours.begin(), neighbours.end(), [&](const LTECell* cell) {
             return _drive.averageRsrp(*cell) > rsrp - measurableMargin;
         });
-    const auto measured = static_cast<std::size_t>(firstWeak - neighbours.begin());
-    const std::size_t detected = neighbours.size() - measured;
-    packet.u8(27, static_cast<std::uint8_t>(measured)).u8(28, static_cast<std::uint8_t>(detected));
-    std::size_t offset = 29;
-    for (std::size_t i = 0; i < measured; ++i, offset += 6) {
-        const double level = _drive.averageRsrp(*neighbours[i]);
-        packet.u16(offset, neighbours[i]->physicalCellId)
-            .u16(offset + 2, rawLevel(level, -140, 0.25, 16))
-            .u16(offset + 4, rawLevel(_drive.rsrq(*neighbours[i], level), -20, 0.125, 16));
+    for (const LTECell* cell : std::span(neighbours.begin(), firstWeak)) {
+        const double level = _drive.averageRsrp(*cell);
+        record.add(LTERecords::measuredNeighbors)
+            .set("Physical Cell ID", cell->physicalCellId)
+            .level("Filtered RSRP", level)
+            .level("Filtered RSRQ", _drive.rsrq(*cell, level));
     }
-    for (std::size_t i = measured; i < neighbours.size(); ++i, offset += 2)
-        packet.u16(offset, neighbours[i]->physicalCellId);
-    report(std::move(packet));
+    for (const LTECell* cell : std::span(firstWeak, neighbours.end()))
+        record.add(LTERecords::detectedCells).set("Physical Cell ID", cell->physicalCellId);
+    report(record);
 }
-
 std::vector<const LTECell*> LTEScenario::neighborsOfServingCell() const
 {
     const LTECell& serving = _drive.servingCell();
@@ -159,31 +158,27 @@ void LTEScenario::reportIdleNeighbors()
     const auto neighbours = neighborsOfServingCell();
     if (neighbours.empty())
         return; // the record holds one cell at least
-    PacketBuilder packet(0xB180);
-    packet.u8(13, 2)
-        .u16(17, _drive.servingCell().downlinkEarfcn)
-        .bits(19, 0, 6, (qrxlevmin + 140) / 2)
-        .bits(19, 6, 5, static_cast<std::uint32_t>(neighbours.size() - 1));
-    std::size_t offset = 21;
+    RecordWriter record(LTERecords::idleNeighbors);
+    record.set("Version", 2)
+        .set("E-ARFCN", _drive.servingCell().downlinkEarfcn)
+        .level("Qrxlevmin", qrxlevmin);
     for (const LTECell* cell : neighbours) {
         const double measured = _drive.measuredRsrp(*cell);
         const double average = _drive.averageRsrp(*cell);
         const double measuredRsrq = _drive.rsrq(*cell, measured);
-        packet.bits(offset, 0, 9, cell->physicalCellId)
-            .bits(offset + 1, 1, 8,
-                  rawLevel(_drive.rssi(*cell, measured, measuredRsrq), -140, 0.5, 8))
-            .bits(offset + 2, 1, 9, rawLevel(measured, -140, 0.5, 9))
-            .bits(offset + 4, 0, 9, rawLevel(average, -140, 0.5, 9))
-            .bits(offset + 5, 1, 7, rawLevel(measuredRsrq, -30, 0.25, 7))
-            .bits(offset + 6, 0, 7, rawLevel(_drive.rsrq(*cell, average), -30, 0.25, 7))
-            .bits(offset + 6, 7, 7, rawLevel(average - qrxlevmin, -30, 1, 7))
-            .u16(offset + 8, static_cast<std::uint16_t>(cell->physicalCellId % 40))
-            .bits(offset + 12, 0, 11, static_cast<std::uint32_t>(step() % 1024))
-            .bits(offset + 12, 11, 19, static_cast<std::uint32_t>(cell->position))
-            .u32(offset + 16, 0);
-        offset += 20;
+        record.add(LTERecords::idleNeighborCells)
+            .set("Physical Cell ID", cell->physicalCellId)
+            .level("Measured RSSI", _drive.rssi(*cell, measured, measuredRsrq))
+            .level("Measured RSRP", measured)
+            .level("Average RSRP", average)
+            .level("Measured RSRQ", measuredRsrq)
+            .level("Average RSRQ", _drive.rsrq(*cell, average))
+            .level("Srxlev", average - qrxlevmin)
+            .set("Frequency Offset", cell->physicalCellId % 40)
+            .set("Ant 0 Frame Offset", static_cast<std::int64_t>(step() % 1024))
+            .set("Ant 0 Sample Offset", static_cast<std::int64_t>(cell->position));
     }
-    report(std::move(packet));
+    report(record);
 }
 
 // One candidate: they lie 4 bytes apart, so only the last one's technology part is its own.
@@ -194,16 +189,16 @@ void LTEScenario::reportReselectionCandidates()
     const auto candidate = std::ranges::max_element(cells, {}, [&](const LTECell& cell) {
         return &cell == &serving ? -999.0 : _drive.averageRsrp(cell);
     });
-    report(PacketBuilder(0xB186)
-               .u8(13, 1)
-               .u16(15, serving.downlinkEarfcn)
-               .u16(17, serving.physicalCellId)
-               .u16(19, 1)
-               .u16(21, candidate->layerPriority)
-               .u16(23, 0)
-               .u16(25, candidate->downlinkEarfcn)
-               .bits(27, 7, 9, candidate->physicalCellId)
-               .size(29));
+    RecordWriter record(LTERecords::reselection);
+    record.set("Version", 1)
+        .set("Serving EARFCN", serving.downlinkEarfcn)
+        .set("Serving Cell ID", serving.physicalCellId);
+    const FieldWriter writer = record.add(LTERecords::candidates);
+    writer.set("Candidate Priority", candidate->layerPriority).set("Candidate RAT Type", 0);
+    writer.with(LTERecords::lteCandidateFields)
+        .set("E ARFCN", candidate->downlinkEarfcn)
+        .set("Cell ID", candidate->physicalCellId);
+    report(record);
 }
 
 void LTEScenario::reportCellMonitor()
@@ -221,7 +216,7 @@ void LTEScenario::reportCellMonitor()
         entry.set(kQXCellMonitorUARFCN, cell.downlinkEarfcn);
         cells.append(entry);
     }
-    reportPropertyList(0xFF0001, cells);
+    reportPropertyList(SharedRecords::cellMonitor.logCode, cells);
 }
 
 } // namespace ventrik

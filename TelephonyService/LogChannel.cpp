@@ -1,5 +1,6 @@
 #include "TelephonyService/LogChannel.h"
 
+#include "Packets/LogPacket.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 
@@ -11,7 +12,6 @@ namespace
 
 constexpr std::int32_t messageId = 0;
 constexpr RemotePort::Seconds noWaiting{0};
-constexpr std::uint64_t extraCodeBase = 0xFF0000;
 constexpr int ticksBetweenReports = 20;
 // How much an unpaced source may send in one go, before other channels have their turn, and when
 // its next turn comes.
@@ -27,14 +27,9 @@ Bytes serialized(const PlistValue& value)
 // The effective log code of a packet that is long enough to have one.
 std::optional<std::uint64_t> codeOf(ByteView message)
 {
-    constexpr std::uint8_t prefixMark = 0x81;
-    constexpr std::uint8_t extraCodeType = 255;
-    if (message.size() >= 2 && message[0] == prefixMark)
-        message = message.subspan(2);
-    if (message.size() < 5)
-        return std::nullopt;
-    const std::uint64_t code = message[3] | std::uint64_t{message[4]} << 8;
-    return message[0] == extraCodeType ? code | extraCodeBase : code;
+    const ByteView packet = stripPrefix(message);
+    return hasLogCode(packet) ? std::optional<std::uint64_t>(effectiveLogCode(LogPacket(packet)))
+                              : std::nullopt;
 }
 
 void collectCodes(const PlistDictionary& command, std::string_view key, std::uint64_t base,

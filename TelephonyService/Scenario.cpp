@@ -1,8 +1,10 @@
 #include "TelephonyService/Scenario.h"
 
+#include "Packets/PacketBuilder.h"
+#include "Packets/RecordWriter.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
 #include "PropertyList/PropertyListWriter.h"
-#include "TelephonyService/PacketBuilder.h"
 
 #include <algorithm>
 #include <cmath>
@@ -33,10 +35,15 @@ void Scenario::report(PacketBuilder packet)
     _messages.push_back({due, packet.build()});
 }
 
+void Scenario::report(const RecordWriter& record)
+{
+    report(record.packet());
+}
+
 void Scenario::reportSimFiles(std::string_view accessTechnology)
 {
     reportPropertyList(
-        0xFF0000,
+        SharedRecords::simFiles.logCode,
         PlistDictionary{{"kSimFile_ICCID", "89490200001234567890"},
                         {"kSimFile_MSISDN", "+491701234567"},
                         {"kSimFile_MBDN", "+491703311"},
@@ -66,7 +73,7 @@ void Scenario::reportPdpContexts(bool isConnected)
                                         {"Type", "IPv4v6"},
                                         {"Address", "192.0.2.17"},
                                         {"QCI", "9"}});
-    reportPropertyList(0xFF0002, contexts);
+    reportPropertyList(SharedRecords::pdpContexts.logCode, contexts);
 }
 
 void Scenario::reportPropertyList(std::uint32_t logCode, const PlistValue& root)
@@ -81,15 +88,15 @@ void Scenario::reportBarePropertyList(const PlistValue& root)
     _messages.push_back({_step * stepDuration, Bytes(text.begin(), text.end())});
 }
 
-std::uint16_t rawLevel(double level, double floor, double step, unsigned bits)
+std::uint16_t rawOf(double value, unsigned bits)
 {
     const double top = static_cast<double>((1U << bits) - 1);
-    return static_cast<std::uint16_t>(std::clamp(std::round((level - floor) / step), 0.0, top));
+    return static_cast<std::uint16_t>(std::clamp(std::round(value), 0.0, top));
 }
 
 std::uint8_t byteOf(double value)
 {
-    return static_cast<std::uint8_t>(rawLevel(value, 0, 1, 8));
+    return static_cast<std::uint8_t>(rawOf(value, 8));
 }
 
 std::uint8_t signedByteOf(double value)

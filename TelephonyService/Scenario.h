@@ -10,6 +10,7 @@ namespace ventrik
 {
 
 class PacketBuilder;
+class RecordWriter;
 
 /// What the scenarios of all technologies have in common: steps of equal length, each of which
 /// reports some packets; and the SIM's files and packet data contexts, which are the phone's own.
@@ -27,6 +28,7 @@ class Scenario : public MessageSource
 
     /// Sends a packet at the time of this step; now and then one with the transport prefix.
     void report(PacketBuilder packet);
+    void report(const RecordWriter& record);
     /// Sends a packet that carries a property list.
     void reportPropertyList(std::uint32_t logCode, const PlistValue& root);
     /// Sends a property list as it is, without a packet around it.
@@ -45,8 +47,8 @@ class Scenario : public MessageSource
     std::deque<TimedMessage> _messages;
 };
 
-/// A level as a record carries it: steps above a floor, cut to what so many bits hold.
-std::uint16_t rawLevel(double level, double floor, double step, unsigned bits);
+/// A number as so many bits carry it, rounded and cut to what they hold.
+std::uint16_t rawOf(double value, unsigned bits);
 
 /// A whole number as a byte carries it, cut to what that holds.
 std::uint8_t byteOf(double value);

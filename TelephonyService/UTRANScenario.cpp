@@ -1,7 +1,9 @@
 #include "TelephonyService/UTRANScenario.h"
 
+#include "Packets/RecordWriter.h"
+#include "Packets/SharedRecords.h"
+#include "Packets/UTRANRecords.h"
 #include "Platform/TelephonyConstants.h"
-#include "TelephonyService/PacketBuilder.h"
 
 #include <algorithm>
 
@@ -16,6 +18,8 @@ constexpr std::uint64_t gsmNeighborSteps = 20;  // every 1 s
 constexpr std::uint64_t callNeighborSteps = 10; // every 0.5 s in a call
 constexpr std::uint64_t stateSteps = 40;        // every 2 s
 constexpr double detectableRscp = -112;         // dBm
+constexpr double lowestRscp = -120;             // dBm, as the record counts
+constexpr double rscpStep = 0.25;               // dB
 constexpr double detectableRssi = -105;         // dBm
 constexpr double jointDetectionMargin = 12;     // dB below the serving cell
 
@@ -95,20 +99,19 @@ void UTRANScenario::reportRegularly()
 
 void UTRANScenario::reportState()
 {
-    report(PacketBuilder(0xD0E0).u8(13, 1).u8(14, static_cast<std::uint8_t>(_walk.state())));
+    report(RecordWriter(UTRANRecords::rrcState)
+               .set("validity", 1)
+               .set("State", static_cast<std::int64_t>(_walk.state())));
 }
 
 void UTRANScenario::reportCellInfo()
 {
     const UTRANCell& cell = _walk.servingCell();
-    report(PacketBuilder(0xD0E2)
-               .u8(14, 0)
-               .u8(15, cell.uraId)
-               .u16(17, cell.uarfcn)
-               .u16(19, cell.uarfcn)
-               .u32(21, cell.cellIdentity)
-               .u8(25, 0)
-               .size(26));
+    report(RecordWriter(UTRANRecords::cellInfo)
+               .set("URA ID", cell.uraId)
+               .set("Uplink UARFCN", cell.uarfcn)
+               .set("Downlink UARFCN", cell.uarfcn)
+               .set("Cell ID", cell.cellIdentity));
 }
 
 std::vector<const UTRANCell*> UTRANScenario::neighbors() const
@@ -136,61 +139,57 @@ void UTRANScenario::reportNeighbors()
     auto cells = neighbors();
     if (isInCall())
         cells.insert(cells.begin(), &serving);
-    PacketBuilder packet(0xD00A);
-    packet.bits(16, 1, 7, static_cast<std::uint32_t>(cells.size())).size(168);
-    std::size_t offset = 168;
+    RecordWriter record(UTRANRecords::neighborMeasurements);
+    record.begin(UTRANRecords::neighbors);
     for (const UTRANCell* cell : cells) {
         const double level = _walk.rscp(*cell);
         const bool isJoint =
             cell->uarfcn == serving.uarfcn && level > _walk.rscp(serving) - jointDetectionMargin;
-        packet.bits(offset, 0, 14, cell->uarfcn)
-            .bits(offset + 1, 6, 7, cell->parameterId)
-            .bits(offset + 2, 5, 8, rawLevel(level, -120, 0.25, 8))
-            .bits(offset + 3, 5, 2, statusOf(*cell, serving))
-            .bits(offset + 3, 7, 1, isJoint ? 1 : 0);
-        offset += 16;
-        packet.size(offset);
+        record.add(UTRANRecords::neighbors)
+            .set("UARFCN", cell->uarfcn)
+            .set("Cell ID", cell->parameterId)
+            .set("Filter RSCP", rawOf((level - lowestRscp) / rscpStep, 8))
+            .set("Status", statusOf(*cell, serving))
+            .set("inJDCS", isJoint ? 1 : 0);
     }
-    report(std::move(packet));
+    report(record);
 }
 
 void UTRANScenario::reportGsmNeighbors()
 {
-    const auto cells = gsmNeighbors();
-    PacketBuilder packet(0xD00E);
-    packet.u8(16, static_cast<std::uint8_t>(cells.size()));
-    std::size_t offset = 17;
-    for (const GSMCell* cell : cells) {
-        packet.bits(offset, 0, 14, cell->cellIdentity)
-            .bits(offset + 1, 6, 1, cell->isHighBand ? 1 : 0)
-            .bits(offset + 1, 7, 1, 1)
-            .u8(offset + 2, cell->ncc)
-            .u8(offset + 3, cell->bcc)
-            .u16(offset + 4, cell->arfcn)
-            .u16(offset + 6, static_cast<std::uint16_t>(static_cast<int>(_walk.rssi(*cell))));
-        offset += 8;
-    }
-    report(std::move(packet));
+    RecordWriter record(UTRANRecords::gsmNeighborMeasurements);
+    for (const GSMCell* cell : gsmNeighbors())
+        record.add(UTRANRecords::gsmNeighbors)
+            .set("Cell ID", cell->cellIdentity)
+            .set("Band Indicator", cell->isHighBand ? 1 : 0)
+            .set("BSIC Valid", 1)
+            .set("NCC", cell->ncc)
+            .set("BCC", cell->bcc)
+            .set("ARFCN", cell->arfcn)
+            .set("RSSI", static_cast<int>(_walk.rssi(*cell)));
+    report(record);
 }
 
 void UTRANScenario::reportTransportChannels()
 {
     const auto [transport, composite] = channelsIn(_walk.state());
-    PacketBuilder packet(0xD00C);
-    packet.size(17).bits(14, 6, 6, transport).bits(15, 4, 4, composite);
+    RecordWriter record(UTRANRecords::transportChannelMeasurement);
     for (unsigned i = 0; i < transport; ++i)
-        packet.u8(17 + 2 * i, static_cast<std::uint8_t>(i + 1))
-            .u8(18 + 2 * i, byteOf(_walk.blockErrorRate(i)));
+        record.add(UTRANRecords::transportChannels)
+            .set("TRCH ID", i + 1)
+            .set("TRCH BLER Measurement", byteOf(_walk.blockErrorRate(i)));
 
     constexpr unsigned firstDownlinkSlot = 4;
-    std::size_t offset = 289 + 34 * std::size_t{transport};
-    for (unsigned i = 0; i < composite; ++i, offset += 8) {
-        packet.u8(offset, static_cast<std::uint8_t>(i + 1))
-            .u8(offset + 1, static_cast<std::uint8_t>(firstDownlinkSlot + i));
+    for (unsigned i = 0; i < composite; ++i) {
+        std::int64_t ratios = 0;
         for (unsigned slot = 0; slot < UTRANWalk::slotCount; ++slot)
-            packet.u8(offset + 2 + slot, byteOf(_walk.signalToInterference(slot + i)));
+            ratios |= std::int64_t{byteOf(_walk.signalToInterference(slot + i))} << (8 * slot);
+        record.add(UTRANRecords::compositeChannels)
+            .set("CCTRCH ID", i + 1)
+            .set("TSNUM", firstDownlinkSlot + i)
+            .set("SIR", ratios);
     }
-    report(std::move(packet));
+    report(record);
 }
 
 void UTRANScenario::reportCellMonitor()
@@ -214,7 +213,7 @@ void UTRANScenario::reportCellMonitor()
         entry.set(kQXCellMonitorARFCN, cell->arfcn);
         cells.append(entry);
     }
-    reportPropertyList(0xFF0001, cells);
+    reportPropertyList(SharedRecords::cellMonitor.logCode, cells);
 }
 
 } // namespace ventrik

@@ -2,7 +2,7 @@
 
 #include "LogGenerator/C2K/C2KOutput.h"
 #include "LogGenerator/C2K/PilotGroup.h"
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 
 namespace ventrik
 {

@@ -8,7 +8,7 @@
 #include "LogGenerator/C2K/OneXServingSystem.h"
 #include "LogGenerator/C2K/OneXStatus.h"
 #include "LogGenerator/C2K/OneXTrafficFER.h"
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 
 #include <algorithm>
 #include <array>

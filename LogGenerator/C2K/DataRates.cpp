@@ -1,7 +1,7 @@
 #include "LogGenerator/C2K/DataRates.h"
 
 #include "LogGenerator/C2K/C2KOutput.h"
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 
 #include <array>
 

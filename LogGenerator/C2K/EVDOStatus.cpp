@@ -3,7 +3,7 @@
 #include "LogGenerator/C2K/BandClass.h"
 #include "LogGenerator/C2K/C2KOutput.h"
 #include "LogGenerator/Orbel/Labels.h"
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 #include "LogGenerator/Orbel/ValueText.h"
 
 #include <array>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 #include "Platform/SystemLog.h"
 
 #include <optional>

@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/Base.h"
 
 #include "LogGenerator/Orbel/ArrayLock.h"
-#include "LogGenerator/Orbel/ValueText.h"
 #include "Platform/TelephonyConstants.h"
 
 #include <algorithm>
@@ -30,6 +29,11 @@ constexpr std::array<EcnoStep, 33> ecnoSteps{{
 
 } // namespace
 
+Base::Base(SystemLog& log, const SectionTable& table)
+    : _log(log), _table(table), _records(table.shownRecords()), _versions(_records.size())
+{
+}
+
 void Base::initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDictionary)
 {
     classDictionary[getSectionName()] = this;
@@ -39,7 +43,38 @@ void Base::initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDi
 void Base::updateSectionRef(const PlistValue& container)
 {
     sectionRef = WeakContainer(container);
+    _fields.forgetAll();
+    _rows.forgetAll();
+    _keyedRows.clear();
     log().warning("{}", getSectionName());
+}
+
+void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
+{
+    _log.log(_table.tracePriority, "{}", _table.trace.empty() ? _table.name : _table.trace);
+    const auto shown = std::ranges::find(
+        _records, logCode, [](const ShownRecord& known) { return known.record->logCode; });
+    if (shown == _records.end()) {
+        if (_table.unknownCode == UnknownCode::Reported)
+            logUnknownMessage(logCode);
+        return;
+    }
+    const Record& record = *shown->record;
+    if (packet.size() < record.minimumSize && !_table.decodesShortRecords)
+        return;
+    if (record.version)
+        _versions[static_cast<std::size_t>(shown - _records.begin())] =
+            static_cast<std::uint8_t>(numberAt(packet, *record.version));
+    _current = &record;
+    decode(*shown, packet);
+}
+
+std::vector<std::uint32_t> Base::getLogCodeArray() const
+{
+    std::vector<std::uint32_t> codes;
+    for (const ShownRecord& shown : _records)
+        codes.push_back(shown.record->logCode);
+    return codes;
 }
 
 void Base::updateLogCodeDict(CodeDictionary& codeDictionary)
@@ -72,71 +107,152 @@ std::int16_t Base::lookUpECNO(std::uint32_t rawValue)
     return step == ecnoSteps.end() ? std::int16_t{0} : step->value;
 }
 
-void Base::show(std::string_view key, PlistValue value) const
+std::optional<ValueOrigin> Base::originOf(std::string_view key) const
 {
-    if (auto dictionary = sectionRef.dictionary())
-        dictionary->set(key, std::move(value));
+    return withVersion(_fields.originOf(key));
 }
 
-void Base::withdraw(std::string_view key) const
+std::optional<ValueOrigin> Base::originOf(std::string_view listKey, std::size_t row,
+                                          std::string_view key) const
+{
+    const RowList* rows = rowsUnder(listKey);
+    return rows ? withVersion(rows->originOf(row, key)) : std::nullopt;
+}
+
+void Base::decode(const ShownRecord& shown, const LogPacket& packet)
+{
+    showFields(shown, packet);
+    for (const auto& [list, isKeptWhileEmpty] : shown.lists) {
+        if (!list || (isKeptWhileEmpty && list->elementsOf(packet).count == 0))
+            continue;
+        if (list->key.empty())
+            showRows(*shown.record, *list, packet);
+        else
+            showKeyedRows(*shown.record, *list, packet);
+    }
+    if (shown.cells)
+        showMonitoredCells(shown, packet);
+    if (shown.emptiesRows)
+        rewriteRows(*shown.record);
+}
+
+void Base::show(const Field& field, std::int64_t raw)
+{
+    if (auto dictionary = beginFields())
+        _fields.show(*dictionary, field, raw);
+}
+
+void Base::showNumber(const Field& field, double number)
+{
+    if (auto dictionary = beginFields())
+        _fields.showNumber(*dictionary, field, number);
+}
+
+void Base::showValue(std::string_view key, PlistValue value)
+{
+    if (auto dictionary = beginFields())
+        _fields.showValue(*dictionary, key, std::move(value));
+}
+
+void Base::showFields(const ShownRecord& shown, const LogPacket& packet)
+{
+    if (shown.fields.empty())
+        return;
+    if (!shown.superseded.empty())
+        withdraw(shown.superseded);
+    if (auto dictionary = beginFields())
+        _fields.show(*dictionary, shown.fields, packet);
+}
+
+void Base::withdraw(std::string_view key)
 {
     if (auto dictionary = sectionRef.dictionary())
         dictionary->remove(key);
 }
 
-std::optional<PlistArray> Base::getCellArray(const LogPacket& packet) const
+std::optional<PlistDictionary> Base::beginFields()
 {
-    auto cells = parseCellMonitorArray(packet, log());
-    if (!cells)
-        log().error("Failed to get Cell Array\n");
-    return cells;
+    auto dictionary = sectionRef.dictionary();
+    if (dictionary)
+        _fields.begin(*dictionary, _current);
+    return dictionary;
 }
 
-void Base::showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
-                          std::string_view nameInLog) const
+RowList::Rewrite Base::rewriteRows(const Record& record)
 {
-    for (const CellField& field : fields) {
-        if (const auto number = cellNumber(cell, field.cellKey))
-            show(field.displayKey, decimal(*number));
-        else
-            log().error("{}: Failed to retrieve {}\n", nameInLog, field.nameInLog);
-    }
+    return {_rows, sectionRef.array(), record};
 }
 
-void Base::showNeighborCells(const LogPacket& packet, std::string_view technology,
-                             std::span<const CellRowField> fields, std::string_view nameInLog) const
+void Base::showRows(const Record& record, const List& list, const LogPacket& packet)
 {
-    clearRows();
-    const auto cells = getCellArray(packet);
-    if (!cells)
+    rewriteRows(record).showElements(list, packet);
+}
+
+void Base::showKeyedRows(const Record& record, const List& list, const LogPacket& packet)
+{
+    auto dictionary = sectionRef.dictionary();
+    if (!dictionary)
         return;
-    PlistArray rows;
-    for (const PlistValue& element : *cells) {
-        const PlistDictionary* cell = element.dictionary();
-        if (!cell || !isCell(*cell, technology, kQXCellMonitorCellTypeNeighbor))
-            continue;
-        PlistDictionary row;
-        for (const CellRowField& field : fields) {
-            if (const auto number = cellNumber(*cell, field.cellKey))
-                row.set(field.rowKey, field.text(*number));
-            else
-                log().error("{}: Failed to retrieve {}\n", nameInLog, field.rowKey);
-        }
-        rows.append(row);
+    auto keyed = std::ranges::find(_keyedRows, list.key, &KeyedRows::key);
+    if (keyed == _keyedRows.end())
+        keyed = _keyedRows.insert(keyed, {list.key, {}, {}});
+    keyed->array = RowList::Rewrite(keyed->rows, keyed->array, record, RowList::Containers::Copied)
+                       .showElements(list, packet);
+    const PlistValue* present = dictionary->find(list.key);
+    if (!present || !present->array() || !present->array()->isSameContainer(keyed->array))
+        dictionary->set(list.key, keyed->array);
+}
+
+void Base::showMonitoredCells(const ShownRecord& shown, const LogPacket& packet)
+{
+    const MonitoredCells& monitored = *shown.cells;
+    const bool areNeighbors = monitored.kind == MonitoredCells::Kind::Neighbors;
+    const auto cells = parseCellMonitorArray(packet, _log);
+    if (!cells) {
+        _log.error("Failed to get Cell Array\n");
+        if (areNeighbors)
+            rewriteRows(*shown.record);
+        return;
     }
-    showRows(rows);
+    if (areNeighbors)
+        return showNeighbors(shown, *cells);
+    const PlistDictionary* serving = servingCell(*cells, monitored.technologies);
+    if (!serving)
+        return;
+    for (const CellField& field : monitored.fields)
+        if (const auto number = cellFieldNumber(*serving, field, monitored.nameInLog, _log))
+            show(field.field, *number);
 }
 
-void Base::clearRows() const
+void Base::showNeighbors(const ShownRecord& shown, const PlistArray& cells)
 {
-    if (auto list = sectionRef.array())
-        clearElementsInArray(*list);
+    const MonitoredCells& monitored = *shown.cells;
+    RowList::Rewrite rows = rewriteRows(*shown.record);
+    for (const PlistValue& element : cells) {
+        const PlistDictionary* cell = element.dictionary();
+        if (!cell || !isCell(*cell, monitored.technologies, kQXCellMonitorCellTypeNeighbor))
+            continue;
+        rows.nextRow();
+        for (const CellField& field : monitored.fields)
+            if (const auto number = cellFieldNumber(*cell, field, monitored.nameInLog, _log))
+                rows.show(field.field, *number);
+    }
 }
 
-void Base::showRows(const PlistArray& rows) const
+const RowList* Base::rowsUnder(std::string_view listKey) const
 {
-    if (auto list = sectionRef.array())
-        replaceArray(*list, rows);
+    if (listKey.empty())
+        return &_rows;
+    const auto keyed = std::ranges::find(_keyedRows, listKey, &KeyedRows::key);
+    return keyed == _keyedRows.end() ? nullptr : &keyed->rows;
+}
+
+std::optional<ValueOrigin> Base::withVersion(std::optional<ValueOrigin> origin) const
+{
+    for (std::size_t i = 0; origin && i < _records.size(); ++i)
+        if (_records[i].record == origin->record && origin->record->version)
+            origin->version = _versions[i];
+    return origin;
 }
 
 void Base::logUnknownMessage(std::uint32_t logCode) const

@@ -1,15 +1,17 @@
 #pragma once
 
-#include "LogGenerator/Orbel/CellMonitorArray.h"
 #include "LogGenerator/Orbel/CodeDictionary.h"
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "LogGenerator/Orbel/RowList.h"
+#include "LogGenerator/Orbel/SectionTable.h"
+#include "LogGenerator/Orbel/ShownFields.h"
+#include "Packets/LogPacket.h"
 #include "Platform/SystemLog.h"
 #include "PropertyList/PlistValue.h"
 
 #include <cstdint>
+#include <list>
 #include <optional>
 #include <span>
-#include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
@@ -26,26 +28,29 @@ using ClassDictionary = std::unordered_map<std::string_view, Base*>;
 /// generator binds it to its container in the display object; each packet of its codes then updates
 /// the container. A section never creates or removes its container, and writes to nothing while it
 /// has none. Values are strings; a key keeps its last value until a new one can be formed.
+///
+/// Its table says what it shows. A subclass adds what a record decides beyond that.
 class Base
 {
   public:
-    explicit Base(SystemLog& log) : _log(log) {}
+    /// The table must outlive the section.
+    Base(SystemLog& log, const SectionTable& table);
     virtual ~Base() = default;
     Base(const Base&) = delete;
     Base& operator=(const Base&) = delete;
 
-    /// Registers the section under its name and for its codes. A member, because both are virtual.
+    /// Registers the section under its name and for its codes.
     void initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDictionary);
 
     /// Binds the section to its container, a dictionary or an array, without keeping that alive.
     void updateSectionRef(const PlistValue& container);
 
     /// Decodes one packet, its transport prefix removed.
-    virtual void updateWithData(const LogPacket& packet, std::uint32_t logCode) = 0;
+    void updateWithData(const LogPacket& packet, std::uint32_t logCode);
     /// A constant; also the section's key in the display template.
-    virtual std::string_view getSectionName() const = 0;
+    std::string_view getSectionName() const { return _table.name; }
     /// The effective log codes that the section wants; may be empty.
-    virtual std::vector<std::uint32_t> getLogCodeArray() const = 0;
+    std::vector<std::uint32_t> getLogCodeArray() const;
 
     void updateLogCodeDict(CodeDictionary& codeDictionary);
 
@@ -56,36 +61,67 @@ class Base
     /// Ec/Io in whole dB for a raw energy; 0 where the raw value is out of range.
     static std::int16_t lookUpECNO(std::uint32_t rawValue);
 
+    /// Where the value under a key of the section's dictionary comes from; none where no field of a
+    /// record shows there.
+    std::optional<ValueOrigin> originOf(std::string_view key) const;
+    /// The same for a row of the section's list, or of the one under a key of its dictionary.
+    std::optional<ValueOrigin> originOf(std::string_view listKey, std::size_t row,
+                                        std::string_view key) const;
+
   protected:
+    /// Decodes a packet of the record, which is long enough: shows what the table says.
+    virtual void decode(const ShownRecord& shown, const LogPacket& packet);
+
     SystemLog& log() const { return _log; }
 
-    /// Stores a value under a key of the section's dictionary.
-    void show(std::string_view key, PlistValue value) const;
-    /// Removes a key from the section's dictionary.
-    void withdraw(std::string_view key) const;
+    // Each shows a value in the section's dictionary. Keys are constants.
+    void show(const Field& field, std::int64_t raw);
+    void showNumber(const Field& field, double number);
+    void showValue(std::string_view key, PlistValue value);
 
-    /// The cells of a cell-monitor packet; none, with two error lines, when there is no such array.
-    std::optional<PlistArray> getCellArray(const LogPacket& packet) const;
-    /// Shows each number that the cell has; reports each other one in a line that begins with the
-    /// given name, and leaves its key as it was.
-    void showCellFields(const PlistDictionary& cell, std::span<const CellField> fields,
-                        std::string_view nameInLog) const;
-    /// Puts a row for each neighbour cell of the technology in the place of the section's list. A
-    /// packet without a cell array empties it. A number that a cell lacks is reported in a line
-    /// that begins with the given name.
-    void showNeighborCells(const LogPacket& packet, std::string_view technology,
-                           std::span<const CellRowField> fields, std::string_view nameInLog) const;
-    /// Empties the section's list.
-    void clearRows() const;
-    /// Puts the rows in the place of the section's list.
-    void showRows(const PlistArray& rows) const;
+    /// Begins to write the section's list anew. Where it has none, the rows go nowhere.
+    RowList::Rewrite rewriteRows(const Record& record);
+    /// Writes the elements of a record's list as the section's rows.
+    void showRows(const Record& record, const List& list, const LogPacket& packet);
 
     void logUnknownMessage(std::uint32_t logCode) const;
 
     WeakContainer sectionRef;
 
   private:
+    /// A list under a key of the section's dictionary.
+    struct KeyedRows {
+        std::string_view key;
+        PlistArray array;
+        RowList rows;
+    };
+
+    /// The section's dictionary, for the fields of the record that is being decoded.
+    std::optional<PlistDictionary> beginFields();
+    void withdraw(std::string_view key);
+    void showFields(const ShownRecord& shown, const LogPacket& packet);
+    void showKeyedRows(const Record& record, const List& list, const LogPacket& packet);
+    void showMonitoredCells(const ShownRecord& shown, const LogPacket& packet);
+    void showNeighbors(const ShownRecord& shown, const PlistArray& cells);
+    const RowList* rowsUnder(std::string_view listKey) const;
+    std::optional<ValueOrigin> withVersion(std::optional<ValueOrigin> origin) const;
+
     SystemLog& _log;
+    const SectionTable& _table;
+    std::span<const ShownRecord> _records;
+    const Record* _current = nullptr; // which is being decoded
+    ShownFields _fields;
+    RowList _rows;
+    std::list<KeyedRows> _keyedRows;
+    std::vector<std::uint8_t> _versions; // of the last packet of each of the table's records
+};
+
+/// A section that only shows what its table says.
+template <const SectionTable& table>
+class TableSection : public Base
+{
+  public:
+    explicit TableSection(SystemLog& log) : Base(log, table) {}
 };
 
 } // namespace ventrik

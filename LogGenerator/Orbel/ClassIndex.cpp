@@ -28,10 +28,4 @@ void ClassIndex::status() const
     _log.warning("String = {}", 0);
 }
 
-void ClassIndex::createSections(std::initializer_list<Base*> sections)
-{
-    for (Base* section : sections)
-        section->initWithDict(classDict, codeDictionary);
-}
-
 } // namespace ventrik

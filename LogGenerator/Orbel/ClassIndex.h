@@ -2,14 +2,16 @@
 
 #include "LogGenerator/Orbel/Base.h"
 
-#include <initializer_list>
+#include <memory>
+#include <utility>
+#include <vector>
 
 namespace ventrik
 {
 
 /// The routing table of one technology: its sections by name, and by log code in the order in which
-/// sections that share a code see a packet. A subclass holds the sections as members and registers
-/// them in their fixed order; the table never changes afterwards.
+/// sections that share a code see a packet. A subclass lists its sections once, as members that are
+/// added in their fixed order; the table never changes afterwards.
 class ClassIndex
 {
   public:
@@ -30,12 +32,20 @@ class ClassIndex
     void status() const;
 
   protected:
-    void createSections(std::initializer_list<Base*> sections);
+    /// Creates a section, which the index owns, and registers it.
+    template <typename Section, typename... Args>
+    Base& add(Args&&... args)
+    {
+        _sections.push_back(std::make_unique<Section>(_log, std::forward<Args>(args)...));
+        _sections.back()->initWithDict(classDict, codeDictionary);
+        return *_sections.back();
+    }
 
   private:
     SystemLog& _log;
     ClassDictionary classDict;
     CodeDictionary codeDictionary;
+    std::vector<std::unique_ptr<Base>> _sections;
 };
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/PDPContextList.h"
 
 #include "LogGenerator/Orbel/UnparsableDataException.h"
+#include "Packets/SharedRecords.h"
 
 namespace ventrik
 {
@@ -8,32 +9,28 @@ namespace ventrik
 namespace
 {
 
-constexpr std::uint32_t pdpContextsLogCode = 0xFF0002;
+// PDP data is parsed whatever the code that it came with.
+constexpr SectionTable table{
+    .name = "PDP Context Info",
+    .trace = "PDPContextList",
+    .records = {{{.record = &SharedRecords::pdpContexts}}},
+    .unknownCode = UnknownCode::Ignored,
+};
 
 } // namespace
 
-std::string_view PDPContextList::getSectionName() const
-{
-    return "PDP Context Info";
-}
+PDPContextList::PDPContextList(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> PDPContextList::getLogCodeArray() const
+void PDPContextList::decode(const ShownRecord&, const LogPacket& packet)
 {
-    return {pdpContextsLogCode};
-}
-
-// PDP contexts, extra code 2
-//   13 a serialised property list: an array, its elements the rows as they are
-void PDPContextList::updateWithData(const LogPacket& packet, std::uint32_t)
-{
-    log().warning("PDPContextList");
     const PropertyListReading& reading = packet.propertyList();
     if (!reading) {
         log().error("PDP context data could not be constructed");
         throw UnparsableDataException();
     }
-    if (const PlistArray* contexts = reading.value->array())
-        showRows(*contexts);
+    auto list = sectionRef.array();
+    if (list && reading.value->array())
+        replaceArray(*list, *reading.value->array());
 }
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/SimInfo.h"
 
 #include "LogGenerator/Orbel/UnparsableDataException.h"
+#include "Packets/SharedRecords.h"
 
 #include <array>
 
@@ -10,7 +11,12 @@ namespace ventrik
 namespace
 {
 
-constexpr std::uint32_t simFilesLogCode = 0xFF0000;
+constexpr SectionTable table{
+    .name = "SIM Info",
+    .trace = "SimInfo",
+    .records = {{{.record = &SharedRecords::simFiles}}},
+    .unknownCode = UnknownCode::Ignored,
+};
 
 struct SimFile {
     std::string_view file;
@@ -36,23 +42,10 @@ constexpr std::array<SimFile, 14> simFiles{{
 
 } // namespace
 
-std::string_view SimInfo::getSectionName() const
-{
-    return "SIM Info";
-}
+SimInfo::SimInfo(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> SimInfo::getLogCodeArray() const
+void SimInfo::decode(const ShownRecord&, const LogPacket& packet)
 {
-    return {simFilesLogCode};
-}
-
-// SIM files, extra code 0
-//   13 a serialised property list: a dictionary of kSimFile_... keys
-void SimInfo::updateWithData(const LogPacket& packet, std::uint32_t logCode)
-{
-    log().warning("SimInfo");
-    if (logCode != simFilesLogCode)
-        return;
     const PropertyListReading& reading = packet.propertyList();
     const PlistDictionary* files = reading ? reading.value->dictionary() : nullptr;
     if (!files) {
@@ -61,7 +54,7 @@ void SimInfo::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     }
     for (const auto& [file, displayKey] : simFiles)
         if (const PlistValue* contents = files->find(file))
-            show(displayKey, *contents);
+            showValue(displayKey, *contents);
 }
 
 } // namespace ventrik

@@ -1,4 +1,5 @@
 #include "LogGenerator/Orbel/Base.h"
+#include "Packets/ShownNumbers.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 #include "Tests/Support/ArrayLockHolder.h"
 
@@ -8,35 +9,43 @@ namespace ventrik
 namespace
 {
 
-class NamedSection : public Base
-{
-  public:
-    NamedSection(SystemLog& log, std::string_view name, std::vector<std::uint32_t> codes)
-        : Base(log), _name(name), _codes(std::move(codes))
-    {
-    }
-    void updateWithData(const LogPacket&, std::uint32_t logCode) override
-    {
-        logUnknownMessage(logCode);
-    }
-    std::string_view getSectionName() const override { return _name; }
-    std::vector<std::uint32_t> getLogCodeArray() const override { return _codes; }
+constexpr std::array<Field, 2> levelFields{{{"RSSI", i8(13), wholeDbm()}, {"Quality", u8(14)}}};
+constexpr std::array<Field, 1> otherFields{{{"RSSI", u8(13)}}};
+constexpr Record levels{0xD0E0, "Levels", 15, {levelFields}, {}, u8(15)};
+constexpr Record others{0xFF0001, "Others", 14, {otherFields}};
 
-    using Base::show;
-    using Base::withdraw;
-
-  private:
-    std::string_view _name;
-    std::vector<std::uint32_t> _codes;
+constexpr SectionTable cellsTable{
+    .name = "Cells",
+    .records = {{{&levels, levelFields},
+                 {.record = &others, .fields = otherFields, .superseded = "Quality"}}},
 };
+constexpr SectionTable secondTable{.name = "Second", .records = {{{&others, otherFields}}}};
+constexpr SectionTable twiceTable{.name = "Twice", .records = {{{&levels}, {&levels}}}};
+constexpr SectionTable oddTable{.name = "Rate {} %d"};
+constexpr SectionTable quietTable{
+    .name = "Quiet", .records = {{{&levels}}}, .unknownCode = UnknownCode::Ignored};
+constexpr SectionTable anySizeTable{
+    .name = "Any size", .records = {{{&levels, levelFields}}}, .decodesShortRecords = true};
+
+using CellsSection = TableSection<cellsTable>;
 
 class BaseTest : public testing::Test
 {
   protected:
+    void feed(const PacketBuilder& builder)
+    {
+        const Bytes packet = builder.build();
+        section.updateWithData(LogPacket(packet), effectiveLogCode(LogPacket(packet)));
+    }
+    static PacketBuilder levelsOf(std::uint8_t rssi, std::uint8_t quality)
+    {
+        return PacketBuilder(0xD0E0).u8(13, rssi).u8(14, quality);
+    }
+
     CapturingSystemLog log;
     ClassDictionary classDictionary;
     CodeDictionary codeDictionary;
-    NamedSection section{log, "Cells", {0xD0E0, 0xFF0001}};
+    CellsSection section{log};
 };
 
 struct EcnoRow {
@@ -75,7 +84,7 @@ TEST_F(BaseTest, RegistrationLogsTheNumberOfCodes)
 
 TEST_F(BaseTest, SectionsThatShareACodeAreKeptInOrder)
 {
-    NamedSection second(log, "Second", {0xFF0001});
+    TableSection<secondTable> second(log);
     section.initWithDict(classDictionary, codeDictionary);
     second.initWithDict(classDictionary, codeDictionary);
     EXPECT_THAT(*codeDictionary.subscribers(0xFF0001), testing::ElementsAre(&section, &second));
@@ -83,34 +92,134 @@ TEST_F(BaseTest, SectionsThatShareACodeAreKeptInOrder)
 
 TEST_F(BaseTest, ACodeListedTwiceIsRegisteredTwice)
 {
-    NamedSection twice(log, "Twice", {7, 7});
+    TableSection<twiceTable> twice(log);
     twice.updateLogCodeDict(codeDictionary);
-    EXPECT_EQ(codeDictionary.subscribers(7)->size(), 2U);
-    EXPECT_THAT(codeDictionary.keys(), testing::ElementsAre("7"));
+    EXPECT_EQ(codeDictionary.subscribers(0xD0E0)->size(), 2U);
+    EXPECT_THAT(codeDictionary.keys(), testing::ElementsAre("53472"));
 }
 
 TEST_F(BaseTest, BindingLogsTheSectionNameAsItStands)
 {
-    NamedSection odd(log, "Rate {} %d", {});
+    TableSection<oddTable> odd(log);
     odd.updateSectionRef(PlistDictionary());
     EXPECT_THAT(log.lines(), testing::ElementsAre(CapturingSystemLog::Line{4, "Rate {} %d"}));
 }
 
 TEST_F(BaseTest, WritesGoNowhereBeforeBinding)
 {
-    section.show("RSSI", "-70");
-    section.withdraw("RSSI");
-    EXPECT_TRUE(log.lines().empty());
+    feed(levelsOf(0xBA, 1));
+    EXPECT_THAT(log.texts(), testing::ElementsAre("Cells"));
 }
 
-TEST_F(BaseTest, WritesGoToTheBoundDictionary)
+TEST_F(BaseTest, ShowsTheFieldsOfARecordInTheBoundDictionary)
 {
     PlistDictionary values{{"RSSI", "-"}};
     section.updateSectionRef(values);
-    section.show("RSSI", "-70");
-    EXPECT_EQ(textAt(values, {"RSSI"}), "-70");
-    section.withdraw("RSSI");
-    EXPECT_FALSE(values.contains("RSSI"));
+    feed(levelsOf(0xBA, 3)); // -70
+    EXPECT_EQ(textAt(values, {"RSSI"}), "-70 dBm");
+    EXPECT_EQ(textAt(values, {"Quality"}), "3");
+}
+
+TEST_F(BaseTest, ARecordWithdrawsTheKeyThatItSupersedes)
+{
+    PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(0xBA, 3));
+    feed(PacketBuilder(0xFF0001).u8(13, 5));
+    EXPECT_EQ(values, (PlistDictionary{{"RSSI", "5"}}));
+    feed(levelsOf(0xBA, 3));
+    EXPECT_EQ(values, (PlistDictionary{{"RSSI", "-70 dBm"}, {"Quality", "3"}}));
+}
+
+TEST_F(BaseTest, AShortRecordChangesNothing)
+{
+    PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(0xBA, 3).size(14));
+    EXPECT_TRUE(values.empty());
+}
+
+TEST_F(BaseTest, ASectionThatDecodesShortRecordsReadsMissingBytesAsZero)
+{
+    PlistDictionary values;
+    TableSection<anySizeTable> anySize(log);
+    anySize.updateSectionRef(values);
+    const Bytes packet = PacketBuilder(0xD0E0).u8(13, 7).build();
+    anySize.updateWithData(LogPacket(packet), 0xD0E0);
+    EXPECT_EQ(values, (PlistDictionary{{"RSSI", "7 dBm"}, {"Quality", "0"}}));
+}
+
+// Whoever changes the display behind the section's back sees what it stores.
+TEST_F(BaseTest, AnUnchangedNumberIsNotStoredAgain)
+{
+    PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(1, 3));
+    values.set("RSSI", "mine");
+    feed(levelsOf(1, 4));
+    EXPECT_EQ(values, (PlistDictionary{{"RSSI", "mine"}, {"Quality", "4"}}));
+    feed(levelsOf(2, 4));
+    EXPECT_EQ(textAt(values, {"RSSI"}), "2 dBm");
+}
+
+TEST_F(BaseTest, AnotherRecordOfTheSameKeyMakesTheFieldShowAgain)
+{
+    PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(5, 3));
+    feed(PacketBuilder(0xFF0001).u8(13, 5));
+    EXPECT_EQ(textAt(values, {"RSSI"}), "5");
+    feed(levelsOf(5, 3));
+    EXPECT_EQ(textAt(values, {"RSSI"}), "5 dBm");
+}
+
+TEST_F(BaseTest, ANewContainerShowsEverythingAgain)
+{
+    const PlistDictionary first;
+    section.updateSectionRef(first);
+    feed(levelsOf(5, 3));
+    PlistDictionary second{{"RSSI", "-"}, {"Quality", "-"}};
+    section.updateSectionRef(second);
+    feed(levelsOf(5, 3));
+    EXPECT_EQ(second, (PlistDictionary{{"RSSI", "5 dBm"}, {"Quality", "3"}}));
+}
+
+TEST_F(BaseTest, AContainerThatLostItsEntriesShowsThemAgain)
+{
+    PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(5, 3));
+    values.clear();
+    feed(levelsOf(5, 3));
+    EXPECT_EQ(values, (PlistDictionary{{"RSSI", "5 dBm"}, {"Quality", "3"}}));
+}
+
+TEST_F(BaseTest, TellsWhereAValueComesFrom)
+{
+    const PlistDictionary values;
+    section.updateSectionRef(values);
+    EXPECT_FALSE(section.originOf("RSSI"));
+    feed(levelsOf(0xBA, 3).u8(15, 9));
+    const auto origin = section.originOf("RSSI");
+    ASSERT_TRUE(origin);
+    EXPECT_EQ(origin->record->logCode, 0xD0E0U);
+    EXPECT_EQ(origin->version, 9);
+    EXPECT_EQ(origin->firstByte(), 13U);
+    EXPECT_EQ(origin->field->place.bytes(), 1U);
+    EXPECT_EQ(origin->raw, -70);
+    EXPECT_EQ(origin->number(), -70.0);
+    EXPECT_EQ(origin->field->shown.unit, "dBm");
+}
+
+TEST_F(BaseTest, TheOriginIsThatOfTheRecordThatWroteLast)
+{
+    const PlistDictionary values;
+    section.updateSectionRef(values);
+    feed(levelsOf(5, 3));
+    feed(PacketBuilder(0xFF0001).u8(13, 5));
+    EXPECT_EQ(section.originOf("RSSI")->record->logCode, 0xFF0001U);
+    EXPECT_FALSE(section.originOf("RSSI")->version);
+    EXPECT_FALSE(section.originOf("Quality"));
 }
 
 TEST_F(BaseTest, WritesGoNowhereOnceTheDisplayIsGone)
@@ -119,7 +228,7 @@ TEST_F(BaseTest, WritesGoNowhereOnceTheDisplayIsGone)
         const PlistDictionary values;
         section.updateSectionRef(values);
     }
-    section.show("RSSI", "-70");
+    feed(levelsOf(5, 3));
     PlistDictionary next;
     section.updateSectionRef(next);
     EXPECT_TRUE(next.empty());
@@ -142,8 +251,16 @@ TEST_F(BaseTest, ClearElementsEmptiesTheArray)
 TEST_F(BaseTest, AnUnknownMessageIsLoggedWithItsCodeAsASignedNumber)
 {
     section.updateWithData(LogPacket({}), 0xFFFFFFFF);
-    EXPECT_THAT(log.lines(), testing::ElementsAre(CapturingSystemLog::Line{
-                                 3, "Received an unknown log message: -1"}));
+    EXPECT_THAT(log.lines(), testing::ElementsAre(CapturingSystemLog::Line{4, "Cells"},
+                                                  CapturingSystemLog::Line{
+                                                      3, "Received an unknown log message: -1"}));
+}
+
+TEST_F(BaseTest, AnUnknownMessageIsPassedOverWhereTheTableSaysSo)
+{
+    TableSection<quietTable> quiet(log);
+    quiet.updateWithData(LogPacket({}), 0x1234);
+    EXPECT_THAT(log.texts(), testing::ElementsAre("Quiet"));
 }
 
 TEST(LookUpECNO, GivesEachRowsValueAtBothItsEnds)

@@ -1,4 +1,4 @@
-#include "LogGenerator/Orbel/GSM/BLER.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 

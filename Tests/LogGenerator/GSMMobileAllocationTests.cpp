@@ -1,4 +1,4 @@
-#include "LogGenerator/Orbel/GSM/MobileAllocation.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

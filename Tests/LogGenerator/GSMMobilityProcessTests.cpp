@@ -1,6 +1,4 @@
-#include "LogGenerator/Orbel/GSM/ProcessCO.h"
-#include "LogGenerator/Orbel/GSM/ProcessCS.h"
-#include "LogGenerator/Orbel/GSM/ProcessPS.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

@@ -1,6 +1,7 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "LogGenerator/Orbel/GSM/NeighboringCells.h"
-#include "LogGenerator/Orbel/GSM/UMTSSet.h"
+#include "Packets/SharedRecords.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
@@ -37,7 +38,7 @@ class NeighborListTest : public ListSectionFixture<Section>
     }
     void monitor(const PlistValue& root)
     {
-        this->feed(propertyListPacket(cellMonitorLogCode, root));
+        this->feed(propertyListPacket(SharedRecords::cellMonitor.logCode, root));
     }
     /// Trace and complaint, in the order in which they are written.
     static std::vector<Line> complaint()
@@ -69,7 +70,7 @@ TYPED_TEST(NeighborListTest, AnArrayWithoutNeighborsEmptiesTheList)
 
 TYPED_TEST(NeighborListTest, DataThatDoesNotParseEmptiesTheList)
 {
-    this->feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
+    this->feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
     EXPECT_TRUE(this->rows.empty());
     EXPECT_EQ(this->log.lines(), this->complaint());
 }

@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
 #include "LogGenerator/Orbel/GSM/NeighboringCells.h"
+#include "Packets/SharedRecords.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/ElementField.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
@@ -52,7 +53,10 @@ PlistDictionary neighbor(std::int32_t arfcn, std::int32_t rssi)
 class NeighboringCellsTest : public ListSectionFixture<NeighboringCells>
 {
   protected:
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 constexpr ElementField fields[] = {

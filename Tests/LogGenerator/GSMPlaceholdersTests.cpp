@@ -1,11 +1,4 @@
-#include "LogGenerator/Orbel/GSM/CellChangeCounters.h"
-#include "LogGenerator/Orbel/GSM/CodingScheme.h"
-#include "LogGenerator/Orbel/GSM/DetectedSet.h"
-#include "LogGenerator/Orbel/GSM/MonitoredSet.h"
-#include "LogGenerator/Orbel/GSM/NonRankedGSMSet.h"
-#include "LogGenerator/Orbel/GSM/NonRankedUMTSSet.h"
-#include "LogGenerator/Orbel/GSM/UMTSRRMeasurement.h"
-#include "LogGenerator/Orbel/GSM/VirtualActiveSet.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

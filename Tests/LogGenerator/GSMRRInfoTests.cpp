@@ -1,4 +1,4 @@
-#include "LogGenerator/Orbel/GSM/GSMRRInfo.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
 #include "Tests/LogGenerator/RecordFixture.h"
 
 namespace ventrik

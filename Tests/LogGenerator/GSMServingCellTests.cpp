@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
-#include "LogGenerator/Orbel/GSM/GSMServingCell.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
+#include "Packets/SharedRecords.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/RecordFixture.h"
 
@@ -26,7 +27,10 @@ class GSMServingCellTest : public RecordFixture<GSMServingCell>
         result.set(kQXCellMonitorARFCN, arfcn);
         return result;
     }
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 constexpr RecordSize sizes[] = {{0x5134, 26}, {0x5137, 29}, {0x5076, 17}};
@@ -125,8 +129,8 @@ TEST_F(GSMServingCellTest, CellMonitorReportsEachMissingNumberAndTriesTheNext)
 TEST_F(GSMServingCellTest, CellMonitorThatDoesNotParseChangesNothing)
 {
     values.set("ARFCN", "62");
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    feed(propertyListPacket(cellMonitorLogCode, cell(1, 1))); // no array
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
+    feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cell(1, 1))); // no array
     EXPECT_EQ(values, (PlistDictionary{{"ARFCN", "62"}}));
     const Line trace{4, "GSMServingCell"};
     const Line unparsed{3, "Cell Info Array data could not be constructed"};

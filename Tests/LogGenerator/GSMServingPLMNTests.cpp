@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
-#include "LogGenerator/Orbel/GSM/ServingPLMN.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
@@ -41,7 +42,10 @@ class ServingPLMNTest : public SectionFixture<ServingPLMN>
         result.set(kQXCellMonitorLAC, 4711);
         return result;
     }
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 struct LabelRow {
@@ -245,8 +249,8 @@ TEST_F(ServingPLMNTest, TheRecordThatCameLastIsShown)
 
 TEST_F(ServingPLMNTest, CellMonitorThatDoesNotParseIsReportedTwice)
 {
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    feed(propertyListPacket(cellMonitorLogCode, servingCell(262))); // no array
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
+    feed(propertyListPacket(SharedRecords::cellMonitor.logCode, servingCell(262))); // no array
     EXPECT_TRUE(values.empty());
     const Line trace{4, "Serving PLMN"};
     const Line unparsed{3, "Cell Info Array data could not be constructed"};

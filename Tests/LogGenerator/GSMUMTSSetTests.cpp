@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
-#include "LogGenerator/Orbel/GSM/UMTSSet.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
+#include "LogGenerator/Orbel/GSM/GSMSections.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/ElementField.h"
@@ -58,7 +59,10 @@ PlistDictionary neighbor(std::int32_t code)
 class UMTSSetTest : public ListSectionFixture<UMTSSet>
 {
   protected:
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 } // namespace

@@ -2,7 +2,7 @@
 
 #include "LogGenerator/LogGenerator.h"
 #include "LogGenerator/Orbel/Base.h"
-#include "TelephonyService/PacketBuilder.h"
+#include "Packets/PacketBuilder.h"
 #include "Tests/Support/FakePlatform.h"
 
 #include <gmock/gmock.h>

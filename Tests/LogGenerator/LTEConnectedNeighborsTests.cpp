@@ -1,4 +1,4 @@
-#include "LogGenerator/Orbel/LTE/DetectedCells.h"
+#include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/MeasuredNeighborCells.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 

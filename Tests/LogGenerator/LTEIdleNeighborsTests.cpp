@@ -1,5 +1,5 @@
+#include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/NeighborCellsList.h"
-#include "LogGenerator/Orbel/LTE/NeighborMeasurementMisc.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

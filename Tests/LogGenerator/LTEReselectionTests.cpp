@@ -1,5 +1,5 @@
+#include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/ReselectionCandidatesList.h"
-#include "LogGenerator/Orbel/LTE/ReselectionCandidatesMisc.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
 #include "LogGenerator/Orbel/LTE/LTEServingCellInfo.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
@@ -43,7 +44,10 @@ class LTEServingCellInfoTest : public SectionFixture<LTEServingCellInfo>
         result.set(kQXCellMonitorUARFCN, 3050);
         return result;
     }
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 struct BandwidthRow {
@@ -200,7 +204,7 @@ TEST_F(LTEServingCellInfoTest, CellMonitorKeepsTheValueOfANumberThatIsMissing)
 
 TEST_F(LTEServingCellInfoTest, CellMonitorThatDoesNotParseIsReportedTwice)
 {
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
     EXPECT_THAT(log.lines(), ElementsAre(Line{4, "LTE Serving Cell Info"},
                                          Line{3, "Cell Info Array data could not be constructed"},
                                          Line{3, "Failed to get Cell Array\n"}));

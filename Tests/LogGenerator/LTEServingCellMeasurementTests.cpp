@@ -1,4 +1,4 @@
-#include "LogGenerator/Orbel/LTE/ServingCellMeasurement.h"
+#include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

@@ -10,43 +10,40 @@ namespace
 
 using testing::ElementsAre;
 
+constexpr Record first{0x1000, "First", 0};
+constexpr Record both{0x2000, "Both", 0};
+constexpr Record extra{0xFF0000, "Extra", 0};
+constexpr SectionTable firstTable{.name = "First", .records = {{{&first}, {&both}, {&extra}}}};
+constexpr SectionTable secondTable{.name = "Second", .records = {{{&both}}}};
+
 // Notes every packet that reaches it, and shows the last one's size.
 class NotingSection : public Base
 {
   public:
-    NotingSection(SystemLog& log, std::string_view name, std::vector<std::uint32_t> codes,
-                  std::vector<std::string>& notes)
-        : Base(log), _name(name), _codes(std::move(codes)), _notes(notes)
+    NotingSection(SystemLog& log, const SectionTable& table, std::vector<std::string>& notes)
+        : Base(log, table), _notes(notes)
     {
     }
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override
-    {
-        _notes.push_back(fmt::format("{} {:X} {}", _name, logCode, packet.size()));
-        show("Size", fmt::format("{}", packet.size()));
-    }
-    std::string_view getSectionName() const override { return _name; }
-    std::vector<std::uint32_t> getLogCodeArray() const override { return _codes; }
 
   private:
-    std::string_view _name;
-    std::vector<std::uint32_t> _codes;
+    void decode(const ShownRecord& shown, const LogPacket& packet) override
+    {
+        _notes.push_back(
+            fmt::format("{} {:X} {}", getSectionName(), shown.record->logCode, packet.size()));
+        showValue("Size", fmt::format("{}", packet.size()));
+    }
+
     std::vector<std::string>& _notes;
 };
 
 class NotingIndex : public ClassIndex
 {
   public:
-    NotingIndex(SystemLog& log, std::vector<std::string>& notes)
-        : ClassIndex(log),
-          _first(log, "First", {0x1000, 0x2000, 0xFF0000}, notes),
-          _second(log, "Second", {0x2000}, notes)
+    NotingIndex(SystemLog& log, std::vector<std::string>& notes) : ClassIndex(log)
     {
-        createSections({&_first, &_second});
+        add<NotingSection>(firstTable, notes);
+        add<NotingSection>(secondTable, notes);
     }
-
-  private:
-    NotingSection _first;
-    NotingSection _second;
 };
 
 class NotingGenerator : public OrbelLogGenerator2

@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
 #include "LogGenerator/Orbel/GSM/UMTSRRInfo.h"
+#include "Packets/SharedRecords.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/RecordFixture.h"
 
@@ -40,7 +41,10 @@ class UMTSRRInfoTest : public RecordFixture<UMTSRRInfo>
         result.set(kQXCellMonitorSCN, 300);
         return result;
     }
-    void monitor(PlistArray cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(PlistArray cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 // As the C library prints the quotient of 0 by 0 on this machine.
@@ -213,8 +217,8 @@ TEST_F(UMTSRRInfoTest, CellMonitorReportsEachMissingNumberAndTriesTheNext)
 TEST_F(UMTSRRInfoTest, CellMonitorThatDoesNotParseChangesNothing)
 {
     values.set("UARFCN", "10700");
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    feed(propertyListPacket(cellMonitorLogCode, cell(1))); // no array
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
+    feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cell(1))); // no array
     EXPECT_EQ(values, (PlistDictionary{{"UARFCN", "10700"}}));
     const Line trace{4, "UMTSRRInfo"};
     const Line unparsed{3, "Cell Info Array data could not be constructed"};

@@ -1,5 +1,4 @@
-#include "LogGenerator/Orbel/UTRAN/GSMNeighbhorMeasurements.h"
-#include "LogGenerator/Orbel/UTRAN/UTRANNeighbhorMeasurements.h"
+#include "LogGenerator/Orbel/UTRAN/UTRANSections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik
@@ -82,7 +81,11 @@ const CellRow gsmCellRows[] = {
 PlistArray gsmRows(const PacketBuilder& builder)
 {
     const Bytes packet = builder.build();
-    return gsmNeighborRows(LogPacket(packet));
+    RowList list;
+    PlistArray rows;
+    RowList::Rewrite(list, rows, UTRANRecords::gsmNeighborMeasurements)
+        .showElements(UTRANRecords::gsmNeighbors, LogPacket(packet));
+    return rows;
 }
 
 } // namespace

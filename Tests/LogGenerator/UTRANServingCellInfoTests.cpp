@@ -1,5 +1,6 @@
-#include "LogGenerator/Orbel/CellMonitorArray.h"
+#include "LogGenerator/Orbel/CellMonitor.h"
 #include "LogGenerator/Orbel/UTRAN/UTRANServingCellInfo.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/CellEntry.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
@@ -33,7 +34,10 @@ class UTRANServingCellInfoTest : public SectionFixture<UTRANServingCellInfo>
         result.set(kQXCellMonitorUARFCN, 10054);
         return result;
     }
-    void monitor(const PlistArray& cells) { feed(propertyListPacket(cellMonitorLogCode, cells)); }
+    void monitor(const PlistArray& cells)
+    {
+        feed(propertyListPacket(SharedRecords::cellMonitor.logCode, cells));
+    }
 };
 
 struct FieldRow {
@@ -250,9 +254,9 @@ TEST_F(UTRANServingCellInfoTest, AnEmptyCellListChangesNothing)
 
 TEST_F(UTRANServingCellInfoTest, AListThatDoesNotParseIsReportedOnce)
 {
-    feed(PacketBuilder(cellMonitorLogCode).u8(13, 'x'));
-    feed(PacketBuilder(cellMonitorLogCode));
-    feed(propertyListPacket(cellMonitorLogCode, fullServingCell()));
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode).u8(13, 'x'));
+    feed(PacketBuilder(SharedRecords::cellMonitor.logCode));
+    feed(propertyListPacket(SharedRecords::cellMonitor.logCode, fullServingCell()));
     EXPECT_TRUE(values.empty());
     EXPECT_THAT(log.texts(3), ElementsAre("Cell Info Array data could not be constructed",
                                           "Cell Info Array data could not be constructed",
@@ -263,9 +267,10 @@ TEST_F(UTRANServingCellInfoTest, WithoutAContainerPacketsAreHarmless)
 {
     UTRANServingCellInfo unbound(log);
     const Bytes info = cellInfo().build();
-    const Bytes cells = propertyListPacket(cellMonitorLogCode, PlistArray{fullServingCell()});
+    const Bytes cells =
+        propertyListPacket(SharedRecords::cellMonitor.logCode, PlistArray{fullServingCell()});
     unbound.updateWithData(LogPacket(info), 0xD0E2);
-    unbound.updateWithData(LogPacket(cells), cellMonitorLogCode);
+    unbound.updateWithData(LogPacket(cells), SharedRecords::cellMonitor.logCode);
     EXPECT_TRUE(values.empty());
 }
 

@@ -1,5 +1,5 @@
 #include "LogGenerator/Orbel/UTRAN/CCTRCHSIRMeasurement.h"
-#include "LogGenerator/Orbel/UTRAN/TRCHBLERMeasurement.h"
+#include "LogGenerator/Orbel/UTRAN/UTRANSections.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

@@ -2,7 +2,7 @@
 
 #include "Model/VentrikModel.h"
 #include "Platform/TelephonyConstants.h"
-#include "TelephonyService/PacketBuilder.h"
+#include "Packets/PacketBuilder.h"
 #include "Tests/Support/FakePlatform.h"
 
 #include <gmock/gmock.h>

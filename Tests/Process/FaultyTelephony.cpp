@@ -7,7 +7,7 @@
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 #include "TelephonyService/LTEScenario.h"
-#include "TelephonyService/PacketBuilder.h"
+#include "Packets/PacketBuilder.h"
 #include "TelephonyService/TelephonyService.h"
 
 #include <QCoreApplication>

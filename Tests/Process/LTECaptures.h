@@ -1,6 +1,6 @@
 #pragma once
 
-#include "TelephonyService/PacketBuilder.h"
+#include "Packets/PacketBuilder.h"
 #include "Tests/Capture/PcapBytes.h"
 
 namespace ventrik

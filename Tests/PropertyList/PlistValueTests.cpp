@@ -250,4 +250,43 @@ TEST(WeakContainer, RefersToNothingForOtherValues)
     EXPECT_FALSE(weak.dictionary());
 }
 
+TEST(PlistDictionary, CountsHowOftenEntriesWereRemoved)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}, {"c", 3}};
+    dictionary.set("b", 4);
+    EXPECT_FALSE(dictionary.remove("d"));
+    dictionary.truncate(3);
+    EXPECT_EQ(dictionary.removalCount(), 0U);
+    dictionary.remove("a");
+    EXPECT_EQ(dictionary.removalCount(), 1U);
+    dictionary.truncate(1);
+    EXPECT_EQ(dictionary.removalCount(), 2U);
+    dictionary.clear();
+    EXPECT_EQ(dictionary.removalCount(), 3U);
+}
+
+TEST(PlistDictionary, TruncatingRemovesTheEntriesBehindTheFirstOnes)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}, {"c", 3}};
+    dictionary.truncate(1);
+    EXPECT_EQ(dictionary, (PlistDictionary{{"a", 1}}));
+    EXPECT_FALSE(dictionary.contains("b"));
+}
+
+TEST(PlistArray, TruncatingRemovesTheValuesBehindTheFirstOnes)
+{
+    PlistArray array{"a", "b", "c"};
+    array.truncate(5);
+    EXPECT_EQ(array.size(), 3U);
+    array.truncate(1);
+    EXPECT_EQ(array, PlistArray{"a"});
+}
+
+TEST(PlistArray, ReplacesAValueInItsPlace)
+{
+    PlistArray array{"a", "b"};
+    array.replace(1, "c");
+    EXPECT_EQ(array, (PlistArray{"a", "c"}));
+}
+
 } // namespace ventrik

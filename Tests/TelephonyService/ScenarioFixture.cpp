@@ -1,6 +1,6 @@
 #include "Tests/TelephonyService/ScenarioFixture.h"
 
-#include "LogGenerator/Orbel/LogPacket.h"
+#include "Packets/LogPacket.h"
 #include "Tests/Support/ResourceFiles.h"
 
 #include <algorithm>

@@ -2,7 +2,7 @@
 #include "Platform/TelephonyProtocol.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
-#include "TelephonyService/PacketBuilder.h"
+#include "Packets/PacketBuilder.h"
 #include "TelephonyService/TelephonyService.h"
 #include "Tests/Support/FakePlatform.h"
 #include "Tests/TelephonyService/ListSource.h"

@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/GSM/ActiveSet.h"
 
-#include "LogGenerator/Orbel/GSM/UMTSCellListRecord.h"
-#include "LogGenerator/Orbel/ValueText.h"
+#include "Packets/GSMRecords.h"
 
 namespace ventrik
 {
@@ -9,65 +8,50 @@ namespace ventrik
 namespace
 {
 
-// Cell, 15 bytes; bit fields of little-endian words
-//   7 13 bits primary scrambling code | 8.5 3 bits set type, 0: active set
-bool isActive(const LogPacket& cell)
-{
-    return cell.u8(8) >> 5 == 0;
-}
+constexpr SectionTable table{
+    .name = "Active Set",
+    .trace = "ActiveSet",
+    .records = {{{.record = &GSMRecords::cellList}}},
+};
 
-// Energies, 44 bytes: the first that is not 0 counts
-//   32 u32 first Ec/Io | 36 u32 second | 40 u32 third
+constexpr const Field& scramblingCode = GSMRecords::activeSetFields[0];
+constexpr const Field& rscp = GSMRecords::activeSetFields[1];
+constexpr const Field& energyPerChip = GSMRecords::activeSetFields[2];
+constexpr const Field& setType = GSMRecords::listedCellFields[1];
+constexpr const Field& receiveAGC = GSMRecords::cellListUnshown[0];
+
+// The first energy that is not 0 counts.
 std::uint32_t energyOf(const LogPacket& energies)
 {
-    for (const std::size_t offset : {32U, 36U})
-        if (const std::uint32_t energy = energies.u32(offset))
-            return energy;
-    return energies.u32(40);
-}
-
-// The level is a code power; its unit is shown as dB all the same.
-PlistDictionary row(const LogPacket& cell, int receiveAgc, int ecno)
-{
-    return {{"Scrambling Code", decimal(cell.u16(7) & 0x1FFF)},
-            {"RSCP", wholeDb((receiveAgc + 512) / 10 - 106 + ecno)},
-            {"Energy Per Chip", wholeDb(ecno)}};
+    for (const Field& field : GSMRecords::energyFields)
+        if (const std::int64_t energy = numberOf(energies, field))
+            return static_cast<std::uint32_t>(energy);
+    return 0;
 }
 
 } // namespace
 
-std::string_view ActiveSet::getSectionName() const
-{
-    return "Active Set";
-}
+ActiveSet::ActiveSet(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> ActiveSet::getLogCodeArray() const
+void ActiveSet::decode(const ShownRecord& shown, const LogPacket& packet)
 {
-    return {UMTSCellListRecord::logCode};
-}
-
-void ActiveSet::updateWithData(const LogPacket& packet, std::uint32_t logCode)
-{
-    log().warning("ActiveSet");
-    if (logCode != UMTSCellListRecord::logCode)
-        return logUnknownMessage(logCode);
-    if (packet.size() < UMTSCellListRecord::minimumSize)
-        return;
-    clearRows();
-
-    const RecordElements cells = UMTSCellListRecord::cells(packet);
-    const RecordElements energies = UMTSCellListRecord::energies(packet);
-    PlistArray rows;
+    constexpr std::int64_t active = 0;
+    const RecordElements cells = GSMRecords::listedCells.elementsOf(packet);
+    const RecordElements energies = GSMRecords::energies.elementsOf(packet);
+    const int level = (static_cast<int>(numberOf(packet, receiveAGC)) + 512) / 10 - 106;
+    RowList::Rewrite rows = rewriteRows(*shown.record);
     for (std::size_t i = 0; i < cells.completeIn(packet); ++i) {
         const LogPacket cell = cells.element(packet, i);
-        if (!isActive(cell))
+        if (numberOf(cell, setType) != active)
             continue;
         if (i >= energies.completeIn(packet))
             break; // its energies are cut
-        const std::uint32_t energy = energyOf(energies.element(packet, i));
-        rows.append(row(cell, packet.i16(13), lookUpECNO(energy)));
+        const int ecno = lookUpECNO(energyOf(energies.element(packet, i)));
+        rows.nextRow(cells.offset + cells.stride * i);
+        rows.show(scramblingCode, numberOf(cell, scramblingCode));
+        rows.showWorkedOut(rscp, level + ecno);
+        rows.showWorkedOut(energyPerChip, ecno);
     }
-    showRows(rows);
 }
 
 } // namespace ventrik

@@ -1,11 +1,8 @@
 #include "LogGenerator/Orbel/GSM/NeighboringCells.h"
 
-#include "LogGenerator/Orbel/CellMonitorArray.h"
-#include "LogGenerator/Orbel/GSM/IdleMeasurementsRecord.h"
-#include "LogGenerator/Orbel/ValueText.h"
+#include "Packets/GSMRecords.h"
+#include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
-
-#include <array>
 
 namespace ventrik
 {
@@ -13,92 +10,66 @@ namespace ventrik
 namespace
 {
 
-constexpr std::uint32_t bsicListLogCode = 0x51FF;
-
 // The monitor counts in steps of 2 dB.
-std::string doubledDbm(std::int32_t number)
-{
-    const auto level = cellLevel(number);
-    return level ? wholeDbm(2 * *level) : "";
-}
-
-constexpr std::array<CellRowField, 2> neighborFields{{
-    {kQXCellMonitorARFCN, "ARFCN", decimal},
-    {kQXCellMonitorRSSI, "RSSI", doubledDbm},
+constexpr std::array<std::string_view, 1> technologies{kQXCellMonitorRadioAccessTechnologyGSM};
+constexpr std::array<CellField, 2> neighborFields{{
+    {kQXCellMonitorARFCN, {"ARFCN", cellNumberPlace}, "ARFCN"},
+    {kQXCellMonitorRSSI, {"RSSI", cellLevelPlace, marked(wholeDbm(2), notMeasured)}, "RSSI"},
 }};
+constexpr MonitoredCells neighbors{MonitoredCells::Kind::Neighbors, technologies, neighborFields,
+                                   "NeighboringCells"};
+
+constexpr SectionTable table{
+    .name = "Neighboring Cells",
+    .trace = "NeighboringCells",
+    .records = {{
+        {.record = &GSMRecords::idleMeasurements},
+        {.record = &GSMRecords::bsicList},
+        {.record = &SharedRecords::cellMonitor, .cells = &neighbors},
+    }},
+};
+
+constexpr const Field& arfcn = GSMRecords::idleNeighborFields[0];
+constexpr const Field& listedARFCN = GSMRecords::bsicFields[0];
+constexpr const Field& bsic = GSMRecords::bsicFields[1];
 
 } // namespace
 
-std::string_view NeighboringCells::getSectionName() const
-{
-    return "Neighboring Cells";
-}
+NeighboringCells::NeighboringCells(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> NeighboringCells::getLogCodeArray() const
+void NeighboringCells::decode(const ShownRecord& shown, const LogPacket& packet)
 {
-    return {IdleMeasurementsRecord::logCode, bsicListLogCode, cellMonitorLogCode};
-}
-
-void NeighboringCells::updateWithData(const LogPacket& packet, std::uint32_t logCode)
-{
-    log().warning("NeighboringCells");
-    switch (logCode) {
-    case IdleMeasurementsRecord::logCode:
-        return updateFromIdleMeasurements(packet);
-    case bsicListLogCode:
-        return updateFromBSICList(packet);
-    case cellMonitorLogCode:
-        return updateFromCellMonitor(packet);
-    default:
-        return logUnknownMessage(logCode);
-    }
+    if (shown.record == &GSMRecords::idleMeasurements)
+        updateFromIdleMeasurements(packet);
+    else if (shown.record == &GSMRecords::bsicList)
+        updateFromBSICList(packet);
+    else
+        Base::decode(shown, packet);
 }
 
 void NeighboringCells::updateFromIdleMeasurements(const LogPacket& packet)
 {
-    if (packet.size() < IdleMeasurementsRecord::minimumSize)
-        return;
-    clearRows();
-
-    const RecordElements neighbors = IdleMeasurementsRecord::neighbors(packet);
-    PlistArray rows;
-    for (std::size_t i = 0; i < neighbors.completeIn(packet); ++i)
-        rows.append(row(neighbors.element(packet, i)));
-    showRows(rows);
-}
-
-// Neighbour of the idle measurements, 14 bytes
-//   0 u16 ARFCN | 2 u8 RSSI | 3 u32 C1, shown signed
-PlistDictionary NeighboringCells::row(const LogPacket& neighbor) const
-{
-    const std::uint16_t arfcn = neighbor.u16(0);
-    PlistDictionary row{{"ARFCN", decimal(arfcn)},
-                        {"RSSI", decimal(neighbor.u8(2))},
-                        {"C1 Value", decimal(neighbor.i32(3))}};
-    if (const auto bsic = arfcnToBsic.find(arfcn); bsic != arfcnToBsic.end())
-        row.set("BSIC", decimal(bsic->second));
-    return row;
-}
-
-// BSIC list, 0x51FF, at least 15 bytes
-//   14 u8 m | 15 m elements of 4 bytes: 0 u16 ARFCN | 2 u8 BSIC
-// The rows that are there stay as they are; the next measurements show it.
-void NeighboringCells::updateFromBSICList(const LogPacket& packet)
-{
-    if (packet.size() < 15)
-        return;
-    const RecordElements pairs{15, 4, packet.u8(14), 3};
-    arfcnToBsic.clear();
-    for (std::size_t i = 0; i < pairs.completeIn(packet); ++i) {
-        const LogPacket pair = pairs.element(packet, i);
-        arfcnToBsic[pair.u16(0)] = pair.u8(2);
+    const RecordElements cells = GSMRecords::idleNeighbors.elementsOf(packet);
+    RowList::Rewrite rows = rewriteRows(GSMRecords::idleMeasurements);
+    for (std::size_t i = 0; i < cells.completeIn(packet); ++i) {
+        const LogPacket cell = cells.element(packet, i);
+        rows.nextRow(cells.offset + cells.stride * i);
+        rows.show(GSMRecords::idleNeighborFields, cell);
+        const auto known = arfcnToBsic.find(numberOf(cell, arfcn));
+        if (known != arfcnToBsic.end())
+            rows.showWorkedOut(bsic, known->second);
     }
 }
 
-void NeighboringCells::updateFromCellMonitor(const LogPacket& packet)
+// The rows that are there stay as they are; the next measurements show it.
+void NeighboringCells::updateFromBSICList(const LogPacket& packet)
 {
-    showNeighborCells(packet, kQXCellMonitorRadioAccessTechnologyGSM, neighborFields,
-                      "NeighboringCells");
+    const RecordElements pairs = GSMRecords::bsics.elementsOf(packet);
+    arfcnToBsic.clear();
+    for (std::size_t i = 0; i < pairs.completeIn(packet); ++i) {
+        const LogPacket pair = pairs.element(packet, i);
+        arfcnToBsic[numberOf(pair, listedARFCN)] = numberOf(pair, bsic);
+    }
 }
 
 } // namespace ventrik

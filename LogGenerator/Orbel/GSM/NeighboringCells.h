@@ -12,20 +12,15 @@ namespace ventrik
 class NeighboringCells : public Base
 {
   public:
-    using Base::Base;
-
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
-    std::string_view getSectionName() const override;
-    std::vector<std::uint32_t> getLogCodeArray() const override;
+    explicit NeighboringCells(SystemLog& log);
 
   private:
+    void decode(const ShownRecord& shown, const LogPacket& packet) override;
     void updateFromIdleMeasurements(const LogPacket& packet);
     void updateFromBSICList(const LogPacket& packet);
-    void updateFromCellMonitor(const LogPacket& packet);
-    PlistDictionary row(const LogPacket& neighbor) const;
 
     /// What the last BSIC list told.
-    std::unordered_map<std::uint16_t, std::uint8_t> arfcnToBsic;
+    std::unordered_map<std::int64_t, std::int64_t> arfcnToBsic;
 };
 
 } // namespace ventrik

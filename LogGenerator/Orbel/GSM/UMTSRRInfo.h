@@ -9,18 +9,11 @@ namespace ventrik
 class UMTSRRInfo : public Base
 {
   public:
-    using Base::Base;
-
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
-    std::string_view getSectionName() const override;
-    std::vector<std::uint32_t> getLogCodeArray() const override;
+    explicit UMTSRRInfo(SystemLog& log);
 
   private:
-    void updateFromState(const LogPacket& packet);
+    void decode(const ShownRecord& shown, const LogPacket& packet) override;
     void updateFromTransmitPower(const LogPacket& packet);
-    void updateFromServingCell(const LogPacket& packet);
-    void updateFromSecurity(const LogPacket& packet);
-    void updateFromCellMonitor(const LogPacket& packet);
 };
 
 } // namespace ventrik

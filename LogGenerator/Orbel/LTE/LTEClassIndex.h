@@ -1,15 +1,11 @@
 #pragma once
 
 #include "LogGenerator/Orbel/ClassIndex.h"
-#include "LogGenerator/Orbel/LTE/ConnectedModeMeasurementMisc.h"
-#include "LogGenerator/Orbel/LTE/DetectedCells.h"
+#include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/LTEServingCellInfo.h"
 #include "LogGenerator/Orbel/LTE/MeasuredNeighborCells.h"
 #include "LogGenerator/Orbel/LTE/NeighborCellsList.h"
-#include "LogGenerator/Orbel/LTE/NeighborMeasurementMisc.h"
 #include "LogGenerator/Orbel/LTE/ReselectionCandidatesList.h"
-#include "LogGenerator/Orbel/LTE/ReselectionCandidatesMisc.h"
-#include "LogGenerator/Orbel/LTE/ServingCellMeasurement.h"
 #include "LogGenerator/Orbel/PDPContextList.h"
 #include "LogGenerator/Orbel/SimInfo.h"
 
@@ -20,20 +16,20 @@ namespace ventrik
 class LTEClassIndex : public ClassIndex
 {
   public:
-    explicit LTEClassIndex(SystemLog& log);
+    using ClassIndex::ClassIndex;
 
   private:
-    LTEServingCellInfo objLTEServingCellInfo;
-    ConnectedModeMeasurementMisc objConnectedModeMeasurementMisc;
-    MeasuredNeighborCells objMeasuredNeighborCells;
-    DetectedCells objDetectedCells;
-    ServingCellMeasurement objServingCellMeasurement;
-    NeighborMeasurementMisc objNeighborMeasurementMisc;
-    NeighborCellsList objNeighborCellsList;
-    ReselectionCandidatesMisc objReselectionCandidatesMisc;
-    ReselectionCandidatesList objReselectionCandidatesList;
-    SimInfo objSimInfo;
-    PDPContextList objPDPContextList;
+    Base& objLTEServingCellInfo = add<LTEServingCellInfo>();
+    Base& objConnectedModeMeasurementMisc = add<ConnectedModeMeasurementMisc>();
+    Base& objMeasuredNeighborCells = add<MeasuredNeighborCells>();
+    Base& objDetectedCells = add<DetectedCells>();
+    Base& objServingCellMeasurement = add<ServingCellMeasurement>();
+    Base& objNeighborMeasurementMisc = add<NeighborMeasurementMisc>();
+    Base& objNeighborCellsList = add<NeighborCellsList>();
+    Base& objReselectionCandidatesMisc = add<ReselectionCandidatesMisc>();
+    Base& objReselectionCandidatesList = add<ReselectionCandidatesList>();
+    Base& objSimInfo = add<SimInfo>();
+    Base& objPDPContextList = add<PDPContextList>();
 };
 
 } // namespace ventrik

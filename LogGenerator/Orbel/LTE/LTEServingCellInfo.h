@@ -9,16 +9,10 @@ namespace ventrik
 class LTEServingCellInfo : public Base
 {
   public:
-    using Base::Base;
-
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
-    std::string_view getSectionName() const override;
-    std::vector<std::uint32_t> getLogCodeArray() const override;
+    explicit LTEServingCellInfo(SystemLog& log);
 
   private:
-    void updateFromCellInfo(const LogPacket& packet);
-    void updateFromAntennaCount(const LogPacket& packet, std::uint32_t logCode);
-    void updateFromCellMonitor(const LogPacket& packet);
+    void decode(const ShownRecord& shown, const LogPacket& packet) override;
 };
 
 } // namespace ventrik

@@ -9,11 +9,10 @@ namespace ventrik
 class MeasuredNeighborCells : public Base
 {
   public:
-    using Base::Base;
+    explicit MeasuredNeighborCells(SystemLog& log);
 
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
-    std::string_view getSectionName() const override;
-    std::vector<std::uint32_t> getLogCodeArray() const override;
+  private:
+    void decode(const ShownRecord& shown, const LogPacket& packet) override;
 };
 
 } // namespace ventrik

@@ -1,7 +1,8 @@
 #include "LogGenerator/Orbel/UTRAN/CCTRCHSIRMeasurement.h"
 
-#include "LogGenerator/Orbel/UTRAN/TransportChannelRecord.h"
-#include "LogGenerator/Orbel/ValueText.h"
+#include "Packets/UTRANRecords.h"
+
+#include <fmt/format.h>
 
 namespace ventrik
 {
@@ -9,44 +10,36 @@ namespace ventrik
 namespace
 {
 
-constexpr std::size_t slotCount = 6;
+constexpr SectionTable table{
+    .name = "CCTRCH SIR",
+    .trace = "CCTRCH SIR Measurement",
+    .records = {{{.record = &UTRANRecords::transportChannelMeasurement}}},
+    .unknownCode = UnknownCode::Ignored,
+};
 
-// Coded composite transport channel, 8 bytes
-//   0 u8 identity | 1 u8 time-slot number | 2 6 x u8 signal-to-interference ratio of a slot
-PlistDictionary row(const LogPacket& channel)
+PlistArray slotRatios(std::int64_t bytes)
 {
     PlistArray ratios;
-    for (std::size_t slot = 0; slot < slotCount; ++slot)
-        ratios.append(decimal(channel.u8(2 + slot)));
-    return {
-        {"CCTRCH ID", decimal(channel.u8(0))}, {"TSNUM", decimal(channel.u8(1))}, {"SIR", ratios}};
+    for (std::size_t slot = 0; slot < UTRANRecords::slotCount; ++slot)
+        ratios.append(fmt::format("{}", bytes >> (8 * slot) & 0xFF));
+    return ratios;
 }
 
 } // namespace
 
-std::string_view CCTRCHSIRMeasurement::getSectionName() const
-{
-    return "CCTRCH SIR";
-}
+CCTRCHSIRMeasurement::CCTRCHSIRMeasurement(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> CCTRCHSIRMeasurement::getLogCodeArray() const
+void CCTRCHSIRMeasurement::decode(const ShownRecord& shown, const LogPacket& packet)
 {
-    return {TransportChannelRecord::logCode};
-}
-
-void CCTRCHSIRMeasurement::updateWithData(const LogPacket& packet, std::uint32_t logCode)
-{
-    log().warning("CCTRCH SIR Measurement");
-    if (logCode != TransportChannelRecord::logCode ||
-        packet.size() < TransportChannelRecord::minimumSize)
-        return;
-    clearRows();
-
-    const RecordElements channels = TransportChannelRecord::compositeChannels(packet);
-    PlistArray rows;
-    for (std::size_t i = 0; i < channels.completeIn(packet); ++i)
-        rows.append(row(channels.element(packet, i)));
-    showRows(rows);
+    const auto fields = std::span(UTRANRecords::compositeChannelFields);
+    RowList::Rewrite rows = rewriteRows(*shown.record);
+    const RecordElements channels = UTRANRecords::compositeChannels.elementsOf(packet);
+    for (std::size_t i = 0; i < channels.completeIn(packet); ++i) {
+        const LogPacket channel = channels.element(packet, i);
+        rows.nextRow(channels.offset + channels.stride * i);
+        rows.show(fields.first(2), channel);
+        rows.show(fields.back(), numberOf(channel, fields.back()), slotRatios);
+    }
 }
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/UTRAN/RRC_State.h"
 
-#include <array>
+#include "Packets/UTRANRecords.h"
+
 #include <optional>
 
 namespace ventrik
@@ -9,17 +10,13 @@ namespace ventrik
 namespace
 {
 
-constexpr std::uint32_t stateLogCode = 0xD0E0;
-constexpr std::size_t expectedSize = 15;
-constexpr std::uint8_t noState = 255;
-
-constexpr std::array<std::string_view, 6> stateLabels{"Disconnected", "Connecting", "Cell Fach",
-                                                      "Cell DCH",     "Cell PCH",   "Cell URA PCH"};
-
-std::string_view stateLabel(std::uint8_t state)
-{
-    return state < stateLabels.size() ? stateLabels[state] : "Unknown RRC Mode";
-}
+// A shorter record is reported, and decoded all the same.
+constexpr SectionTable table{
+    .name = "RRC Info",
+    .records = {{{.record = &UTRANRecords::rrcState}}},
+    .unknownCode = UnknownCode::Ignored,
+    .decodesShortRecords = true,
+};
 
 // {Key = text; Key = text}
 std::string describe(const std::optional<PlistDictionary>& container)
@@ -35,33 +32,25 @@ std::string describe(const std::optional<PlistDictionary>& container)
 
 } // namespace
 
-std::string_view RRC_State::getSectionName() const
-{
-    return "RRC Info";
-}
+RRC_State::RRC_State(SystemLog& log) : Base(log, table) {}
 
-std::vector<std::uint32_t> RRC_State::getLogCodeArray() const
+void RRC_State::decode(const ShownRecord& shown, const LogPacket& packet)
 {
-    return {stateLogCode};
-}
-
-// RRC state, 0xD0E0, 15 bytes; a shorter record is reported and decoded all the same
-//   13 u8 validity, 1: the state counts | 14 u8 state
-void RRC_State::updateWithData(const LogPacket& packet, std::uint32_t logCode)
-{
-    log().warning("RRC Info");
-    if (logCode != stateLogCode)
-        return;
-    if (packet.size() < expectedSize)
+    if (packet.size() < shown.record->minimumSize)
         log().warning("LogCode_0xD0E0 is length is {} expected size {}", packet.size(),
-                      expectedSize);
+                      shown.record->minimumSize);
 
-    const std::uint8_t state = packet.u8(13) == 1 ? packet.u8(14) : noState;
-    const std::string_view label = stateLabel(state);
-    show("State", label);
+    constexpr std::int64_t stateCounts = 1;
+    constexpr std::int64_t noState = 255;
+    constexpr const Field& validity = UTRANRecords::rrcStateUnshown.front();
+    constexpr const Field& field = UTRANRecords::rrcStateFields.front();
+    const std::int64_t state =
+        numberOf(packet, validity) == stateCounts ? numberOf(packet, field) : noState;
+    show(field, state);
     // For whoever watches the console; it has never been a line of the system log.
     log().showOnConsole(fmt::format("Display Dict = {}, rrc mode = {} {}\n",
-                                    describe(sectionRef.dictionary()), state, label));
+                                    describe(sectionRef.dictionary()), state,
+                                    field.shown.textOf(state).value_or("")));
 }
 
 } // namespace ventrik

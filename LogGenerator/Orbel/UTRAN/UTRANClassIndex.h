@@ -4,10 +4,8 @@
 #include "LogGenerator/Orbel/PDPContextList.h"
 #include "LogGenerator/Orbel/SimInfo.h"
 #include "LogGenerator/Orbel/UTRAN/CCTRCHSIRMeasurement.h"
-#include "LogGenerator/Orbel/UTRAN/GSMNeighbhorMeasurements.h"
 #include "LogGenerator/Orbel/UTRAN/RRC_State.h"
-#include "LogGenerator/Orbel/UTRAN/TRCHBLERMeasurement.h"
-#include "LogGenerator/Orbel/UTRAN/UTRANNeighbhorMeasurements.h"
+#include "LogGenerator/Orbel/UTRAN/UTRANSections.h"
 #include "LogGenerator/Orbel/UTRAN/UTRANServingCellInfo.h"
 
 namespace ventrik
@@ -18,17 +16,17 @@ namespace ventrik
 class UTRANClassIndex : public ClassIndex
 {
   public:
-    explicit UTRANClassIndex(SystemLog& log);
+    using ClassIndex::ClassIndex;
 
   private:
-    RRC_State rrc_state;
-    UTRANServingCellInfo servingCellInfo;
-    UTRANNeighbhorMeasurements tdMeasurements;
-    GSMNeighbhorMeasurements gsmMeasurements;
-    TRCHBLERMeasurement trchMeasurements;
-    CCTRCHSIRMeasurement cctrchMeasurements;
-    PDPContextList pdpList;
-    SimInfo simInfo;
+    Base& rrc_state = add<RRC_State>();
+    Base& servingCellInfo = add<UTRANServingCellInfo>();
+    Base& tdMeasurements = add<UTRANNeighbhorMeasurements>();
+    Base& gsmMeasurements = add<GSMNeighbhorMeasurements>();
+    Base& trchMeasurements = add<TRCHBLERMeasurement>();
+    Base& cctrchMeasurements = add<CCTRCHSIRMeasurement>();
+    Base& pdpList = add<PDPContextList>();
+    Base& simInfo = add<SimInfo>();
 };
 
 } // namespace ventrik

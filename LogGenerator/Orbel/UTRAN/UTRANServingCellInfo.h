@@ -2,8 +2,6 @@
 
 #include "LogGenerator/Orbel/Base.h"
 
-#include <initializer_list>
-
 namespace ventrik
 {
 
@@ -11,20 +9,11 @@ namespace ventrik
 class UTRANServingCellInfo : public Base
 {
   public:
-    using Base::Base;
-
-    void updateWithData(const LogPacket& packet, std::uint32_t logCode) override;
-    std::string_view getSectionName() const override;
-    std::vector<std::uint32_t> getLogCodeArray() const override;
+    explicit UTRANServingCellInfo(SystemLog& log);
 
   private:
-    void updateFromCellInfo(const LogPacket& packet);
-    void updateFromCellMonitor(const LogPacket& packet);
+    void decode(const ShownRecord& shown, const LogPacket& packet) override;
     void showCell(const PlistDictionary& cell);
-    /// Shows one number of a cell under each of the display keys.
-    void showNumber(const PlistDictionary& cell, std::string_view cellKey,
-                    std::string_view nameInLog,
-                    std::initializer_list<std::string_view> displayKeys);
 };
 
 } // namespace ventrik

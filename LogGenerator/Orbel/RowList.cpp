@@ -1,0 +1,193 @@
+#include "LogGenerator/Orbel/RowList.h"
+
+#include <utility>
+
+namespace ventrik
+{
+
+std::optional<ValueOrigin> RowList::originOf(std::size_t row, std::string_view key) const
+{
+    if (row >= _rows.size())
+        return std::nullopt;
+    for (const Cell& cell : _rows[row].cells)
+        if (cell.field && !cell.isWorkedOut && cell.field->key == key)
+            return ValueOrigin{_rows[row].record, std::nullopt, cell.field, _rows[row].start,
+                               cell.raw};
+    return std::nullopt;
+}
+
+RowList::Rewrite::Rewrite(RowList& list, std::optional<PlistArray> array, const Record& record,
+                          Containers containers)
+    : _list(list),
+      _isDetached(!array),
+      _areCopied(containers == Containers::Copied),
+      _isArrayToCopy(_areCopied),
+      _array(_isDetached ? PlistArray() : std::move(*array)),
+      _record(record)
+{
+    if (_array.size() == _list._rows.size())
+        return;
+    // Somebody else wrote the list since.
+    _list.forgetAll();
+    copyArray();
+    _array.clear();
+}
+
+RowList::Rewrite::~Rewrite()
+{
+    endList();
+    if (_isDetached)
+        _list.forgetAll();
+}
+
+void RowList::Rewrite::nextRow(std::size_t start)
+{
+    beginRow(start);
+    const bool isNew = _count > _array.size();
+    _isRowToCopy = _areCopied && !isNew;
+    if (isNew) {
+        copyArray();
+        _array.append(row().values);
+    }
+}
+
+void RowList::Rewrite::nextText(const Field& field, std::int64_t raw, std::size_t start)
+{
+    beginRow(start);
+    const bool isNew = _count > _array.size();
+    if (!isNew && isShown(field, raw, false))
+        return;
+    copyArray();
+    std::string text = field.shown.textOf(raw).value_or("");
+    if (isNew)
+        _array.append(std::move(text));
+    else
+        _array.replace(_count - 1, std::move(text));
+    row().cells.assign(1, {&field, raw, false});
+    _cells = 1;
+}
+
+void RowList::Rewrite::beginRow(std::size_t start)
+{
+    endRow();
+    if (_count == _list._rows.size())
+        _list._rows.emplace_back();
+    ++_count;
+    _cells = 0;
+    row().record = &_record;
+    row().start = start;
+}
+
+void RowList::Rewrite::show(const Field& field, std::int64_t raw)
+{
+    if (isShown(field, raw, false))
+        return;
+    if (auto text = field.shown.textOf(raw))
+        store(field.key, std::move(*text), {&field, raw, false});
+}
+
+void RowList::Rewrite::showWorkedOut(const Field& field, std::int64_t number)
+{
+    if (!isShown(field, number, true))
+        store(field.key, field.shown.textOfNumber(static_cast<double>(number)),
+              {&field, number, true});
+}
+
+void RowList::Rewrite::showValue(std::string_view key, PlistValue value)
+{
+    store(key, std::move(value), {nullptr, 0, true});
+}
+
+void RowList::Rewrite::show(std::span<const Field> fields, const LogPacket& element)
+{
+    for (const Field& field : fields)
+        show(field, numberOf(element, field));
+}
+
+void RowList::Rewrite::show(const Field& field, std::int64_t raw,
+                            PlistArray (*texts)(std::int64_t raw))
+{
+    if (!isShown(field, raw, false))
+        store(field.key, texts(raw), {&field, raw, false});
+}
+
+PlistArray RowList::Rewrite::showElements(const List& list, const LogPacket& packet)
+{
+    const RecordElements elements = list.elementsOf(packet);
+    const std::size_t count = elements.completeIn(packet);
+    const bool isOfTexts = list.fields.size() == 1 && list.fields.front().key.empty();
+    for (std::size_t i = 0; i < count; ++i) {
+        const LogPacket element = elements.element(packet, i);
+        const std::size_t start = elements.offset + elements.stride * i;
+        if (isOfTexts) {
+            nextText(list.fields.front(), numberOf(element, list.fields.front()), start);
+        } else {
+            nextRow(start);
+            show(list.fields, element);
+        }
+    }
+    endList();
+    return _array;
+}
+
+bool RowList::Rewrite::isShown(const Field& field, std::int64_t raw, bool isWorkedOut)
+{
+    const std::vector<Cell>& cells = row().cells;
+    if (_cells == cells.size() || cells[_cells].field != &field || cells[_cells].raw != raw ||
+        cells[_cells].isWorkedOut != isWorkedOut)
+        return false;
+    ++_cells;
+    return true;
+}
+
+void RowList::Rewrite::store(std::string_view key, PlistValue value, Cell cell)
+{
+    copyRow();
+    Row& row = this->row();
+    PlistDictionary::Entry* entry = row.values.entryAt(_cells);
+    if (entry && entry->key == key) {
+        entry->value = std::move(value);
+    } else {
+        // Another kind of row stood here.
+        row.values.truncate(_cells);
+        row.values.set(key, std::move(value));
+    }
+    row.cells.resize(row.values.size());
+    row.cells[_cells++] = cell;
+}
+
+void RowList::Rewrite::endRow()
+{
+    if (_count == 0 || row().cells.size() == _cells)
+        return;
+    copyRow();
+    row().values.truncate(_cells);
+    row().cells.resize(_cells);
+}
+
+void RowList::Rewrite::endList()
+{
+    endRow();
+    if (_array.size() == _count)
+        return;
+    copyArray();
+    _array.truncate(_count);
+    _list._rows.resize(_count);
+}
+
+void RowList::Rewrite::copyArray()
+{
+    if (std::exchange(_isArrayToCopy, false))
+        _array = _array.copy();
+}
+
+void RowList::Rewrite::copyRow()
+{
+    if (!std::exchange(_isRowToCopy, false))
+        return;
+    copyArray();
+    row().values = row().values.copy();
+    _array.replace(_count - 1, row().values);
+}
+
+} // namespace ventrik

@@ -1,0 +1,54 @@
+#include "Packets/LogPacket.h"
+
+#include "Packets/ArrayOutOfBoundsException.h"
+
+#include <algorithm>
+
+namespace ventrik
+{
+
+ByteView LogPacket::payload() const
+{
+    return _bytes.subspan(std::min(logPacketHeaderSize, _bytes.size()));
+}
+
+const PropertyListReading& LogPacket::propertyList() const
+{
+    if (!_propertyList)
+        _propertyList = std::make_shared<const PropertyListReading>(readPropertyList(payload()));
+    return *_propertyList;
+}
+
+LogPacket LogPacket::from(std::size_t offset) const
+{
+    return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));
+}
+
+std::size_t RecordElements::completeIn(const LogPacket& packet) const
+{
+    if (packet.size() < offset + needed)
+        return 0;
+    return std::min(count, (packet.size() - offset - needed) / stride + 1);
+}
+
+LogPacket RecordElements::element(const LogPacket& packet, std::size_t index) const
+{
+    if (index >= count)
+        throw ArrayOutOfBoundsException();
+    return packet.from(offset + stride * index);
+}
+
+ByteView stripPrefix(ByteView data)
+{
+    return data.size() >= transportPrefixSize && data[0] == transportPrefixMark
+               ? data.subspan(transportPrefixSize)
+               : data;
+}
+
+std::uint32_t effectiveLogCode(const LogPacket& packet)
+{
+    const std::uint32_t code = packet.u16(3);
+    return packet.u8(0) == extraCodePacketType ? code | extraCodeBase : code;
+}
+
+} // namespace ventrik

@@ -1,0 +1,177 @@
+#include "LogGenerator/Orbel/RowList.h"
+#include "Packets/PacketBuilder.h"
+#include "Packets/ShownNumbers.h"
+#include "Tests/LogGenerator/GeneratorFixture.h"
+#include "Tests/Support/ArrayLockHolder.h"
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr std::array<Field, 2> cellFields{{{"Cell", u8(0)}, {"Level", i8(1), wholeDbm()}}};
+constexpr List cells{
+    .key = "", .offset = 14, .stride = 2, .needed = 2, .count = {u8(13)}, .fields = cellFields};
+constexpr std::array<Field, 1> textFields{{{"", u8(0)}}};
+constexpr List texts{
+    .key = "", .offset = 14, .stride = 1, .needed = 1, .count = {u8(13)}, .fields = textFields};
+constexpr Record record{0x1234, "Cells", 14, {}, {&cells, &texts}};
+constexpr Field extra{"Extra", u8(0)};
+
+class RowListTest : public testing::Test
+{
+  protected:
+    void showCells(std::initializer_list<std::uint8_t> numbers)
+    {
+        const Bytes packet = PacketBuilder(0x1234)
+                                 .u8(13, static_cast<std::uint8_t>(numbers.size() / 2))
+                                 .bytes(14, Bytes(numbers))
+                                 .build();
+        RowList::Rewrite(list, rows, record).showElements(cells, LogPacket(packet));
+    }
+    void showTexts(std::initializer_list<std::uint8_t> numbers)
+    {
+        const Bytes packet = PacketBuilder(0x1234)
+                                 .u8(13, static_cast<std::uint8_t>(numbers.size()))
+                                 .bytes(14, Bytes(numbers))
+                                 .build();
+        RowList::Rewrite(list, rows, record).showElements(texts, LogPacket(packet));
+    }
+    static PlistValue row(std::string_view cell, std::string_view level)
+    {
+        return PlistDictionary{{"Cell", cell}, {"Level", level}};
+    }
+
+    RowList list;
+    PlistArray rows;
+};
+
+} // namespace
+
+TEST_F(RowListTest, ShowsARowForEachElement)
+{
+    showCells({7, 0xBA, 8, 0xB0}); // -70, -80
+    EXPECT_EQ(rows, (PlistArray{row("7", "-70 dBm"), row("8", "-80 dBm")}));
+}
+
+TEST_F(RowListTest, RowsThatAreNotWrittenAnewGo)
+{
+    showCells({7, 1, 8, 2, 9, 3});
+    showCells({8, 2});
+    EXPECT_EQ(rows, PlistArray{row("8", "2 dBm")});
+    showCells({});
+    EXPECT_TRUE(rows.empty());
+}
+
+TEST_F(RowListTest, RowsComeAgainAfterAnEmptyList)
+{
+    showCells({7, 1});
+    showCells({});
+    showCells({7, 1, 8, 2});
+    EXPECT_EQ(rows, (PlistArray{row("7", "1 dBm"), row("8", "2 dBm")}));
+}
+
+// Whoever changes a row behind the list's back sees what it stores.
+TEST_F(RowListTest, AnUnchangedNumberIsNotStoredAgain)
+{
+    showCells({7, 1});
+    PlistDictionary(*rows[0].dictionary()).set("Cell", "mine");
+    showCells({7, 2});
+    EXPECT_EQ(rows, PlistArray{row("mine", "2 dBm")});
+}
+
+TEST_F(RowListTest, AListThatSomebodyElseEmptiedIsWrittenWhole)
+{
+    showCells({7, 1, 8, 2});
+    rows.clear();
+    showCells({7, 1, 8, 2});
+    EXPECT_EQ(rows, (PlistArray{row("7", "1 dBm"), row("8", "2 dBm")}));
+}
+
+TEST_F(RowListTest, AListOfUnknownContentIsWrittenWhole)
+{
+    rows.append("old");
+    rows.append("older");
+    showCells({7, 1});
+    EXPECT_EQ(rows, PlistArray{row("7", "1 dBm")});
+}
+
+TEST_F(RowListTest, AValueThatARowNoLongerHasGoes)
+{
+    for (const bool hasExtra : {true, false}) {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(cellFields[0], 7);
+        if (hasExtra)
+            writing.showWorkedOut(extra, 3);
+    }
+    EXPECT_EQ(rows, (PlistArray{PlistDictionary{{"Cell", "7"}}}));
+}
+
+TEST_F(RowListTest, ARowMayBecomeOneOfOtherKeys)
+{
+    for (const Field* second : {&cellFields[1], &extra}) {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(*second, 5);
+        writing.show(cellFields[0], 7);
+    }
+    EXPECT_EQ(rows, (PlistArray{PlistDictionary{{"Extra", "5"}, {"Cell", "7"}}}));
+    EXPECT_EQ(rows[0].dictionary()->begin()->key, "Extra");
+}
+
+TEST_F(RowListTest, AFieldWithoutAKeyShowsTexts)
+{
+    showTexts({5, 6, 7});
+    EXPECT_EQ(rows, (PlistArray{"5", "6", "7"}));
+    showTexts({5, 9});
+    EXPECT_EQ(rows, (PlistArray{"5", "9"}));
+}
+
+TEST_F(RowListTest, CopiedContainersStayAsTheyWereForWhoeverHoldsThem)
+{
+    const auto show = [&](std::uint8_t cell, std::uint8_t level) {
+        const Bytes packet =
+            PacketBuilder(0x1234).u8(13, 2).bytes(14, Bytes{1, 1, cell, level}).build();
+        rows = RowList::Rewrite(list, rows, record, RowList::Containers::Copied)
+                   .showElements(cells, LogPacket(packet));
+    };
+    show(7, 1);
+    const PlistArray before = rows;
+    show(7, 1);
+    EXPECT_TRUE(rows.isSameContainer(before));
+    show(7, 2);
+    EXPECT_EQ(before, (PlistArray{row("1", "1 dBm"), row("7", "1 dBm")}));
+    EXPECT_EQ(rows, (PlistArray{row("1", "1 dBm"), row("7", "2 dBm")}));
+}
+
+TEST_F(RowListTest, WithoutAnArrayTheRowsGoNowhere)
+{
+    {
+        RowList::Rewrite writing(list, std::nullopt, record);
+        writing.nextRow();
+        writing.show(cellFields[0], 7);
+    }
+    showCells({7, 1});
+    EXPECT_EQ(rows, PlistArray{row("7", "1 dBm")});
+}
+
+TEST_F(RowListTest, TellsWhereAValueOfARowComesFrom)
+{
+    showCells({7, 1, 8, 2});
+    const auto origin = list.originOf(1, "Level");
+    ASSERT_TRUE(origin);
+    EXPECT_EQ(origin->record, &record);
+    EXPECT_EQ(origin->firstByte(), 17U); // 14 + 2 + 1
+    EXPECT_EQ(origin->raw, 2);
+    EXPECT_FALSE(list.originOf(1, "Other"));
+    EXPECT_FALSE(list.originOf(2, "Level"));
+}
+
+TEST_F(RowListTest, IsWrittenUnderTheArrayLock)
+{
+    EXPECT_TRUE(waitsForArrayLock([&] { showCells({7, 1}); }));
+}
+
+} // namespace ventrik

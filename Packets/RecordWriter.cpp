@@ -74,9 +74,11 @@ FieldWriter RecordWriter::add(const List& list)
     const std::size_t index = _elements[&list]++;
     const std::size_t start = startOf(list) + list.stride * index;
     _packet.size(start + list.stride);
-    if (index + 1 >= list.count.more)
-        writeNumber(_packet, 0, list.count.place,
-                    static_cast<std::int64_t>(index + 1 - list.count.more));
+    // Another list of the record may have counted as many with the same number.
+    const auto count =
+        static_cast<std::int64_t>(index + 1) - static_cast<std::int64_t>(list.count.more);
+    if (count > numberAt(LogPacket(_packet.written()), list.count.place))
+        writeNumber(_packet, 0, list.count.place, count);
     return {_packet, start, list.fields, list.unshown};
 }
 

@@ -1,27 +1,35 @@
 #include "LogGenerator/C2K/C2KOutput.h"
 
+#include "LogGenerator/StateKeys.h"
+
 namespace ventrik
 {
 
-void C2KOutput::publish(std::string_view lookupKey, const PlistValue& value) const
+void C2KOutput::publish(const Field& field, const LogPacket& part) const
 {
-    const PlistValue* found = _lookup ? _lookup->find(lookupKey) : nullptr;
-    const PlistArray* entries = found ? found->array() : nullptr;
-    if (!entries)
-        return;
-    for (const PlistValue& element : *entries) {
-        const PlistDictionary* entry = element.dictionary();
-        const PlistValue* label = entry ? entry->find("key") : nullptr;
-        const PlistValue* group = entry ? entry->find("dict") : nullptr;
-        if (!label || !label->string() || !group || !group->dictionary())
-            return;
-        PlistDictionary(*group->dictionary()).set(*label->string(), value);
-    }
+    _labels.publish(field, _record, numberOf(part, field));
+}
+
+void C2KOutput::publish(std::span<const Field> fields, const LogPacket& part) const
+{
+    for (const Field& field : fields)
+        publish(field, part);
+}
+
+void C2KOutput::publish(std::string_view lookupKey, std::string_view text) const
+{
+    _labels.publish(lookupKey, text);
+}
+
+void C2KOutput::publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+                        std::string_view textOfNone) const
+{
+    _labels.publish(lookupKey, pilots, textOfNone);
 }
 
 void C2KOutput::keepExtra(std::string_view key, const PlistValue& value) const
 {
-    PlistValue* extraInfo = _state.find("ExtraInfo");
+    PlistValue* extraInfo = _state.find(StateKey::extraInfo);
     if (extraInfo && extraInfo->dictionary())
         extraInfo->dictionary()->set(key, value);
 }

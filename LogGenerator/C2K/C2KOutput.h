@@ -1,28 +1,35 @@
 #pragma once
 
+#include "LogGenerator/C2K/C2KLabels.h"
+#include "Packets/Record.h"
 #include "Platform/SystemLog.h"
 #include "PropertyList/PlistValue.h"
 
-#include <optional>
 #include <string_view>
 
 namespace ventrik
 {
 
-/// Where a decoder leaves what it found: the labels of the display, through the lookup; and the
-/// state dictionary, for what it must know at its next packet. It owns none of them.
+/// Where a decoder leaves what it found: the labels of the display; and the state dictionary, for
+/// what it must know at its next packet. It owns none of them.
 class C2KOutput
 {
   public:
-    /// The lookup is null while there is no display.
-    C2KOutput(const PlistDictionary* lookup, PlistDictionary& state, SystemLog& log)
-        : _lookup(lookup), _state(state), _log(log)
+    /// The record is the one that is being decoded; null where there is none.
+    C2KOutput(C2KLabels& labels, PlistDictionary& state, SystemLog& log,
+              const Record* record = nullptr)
+        : _labels(labels), _state(state), _log(log), _record(record)
     {
     }
 
-    /// Stores the value under every label that the template gives to the lookup key. An entry of
-    /// the lookup that is none ends it there.
-    void publish(std::string_view lookupKey, const PlistValue& value) const;
+    /// Shows a field of a part of the record under every label that the template gives to its key.
+    void publish(const Field& field, const LogPacket& part) const;
+    void publish(std::span<const Field> fields, const LogPacket& part) const;
+    // The same with what no field describes.
+    void publish(std::string_view lookupKey, std::string_view text) const;
+    /// A group of pilots, or the text while there is none; an empty one means the empty group.
+    void publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+                 std::string_view textOfNone = {}) const;
 
     PlistDictionary& state() const { return _state; }
     /// Stores a value in the state's "ExtraInfo", which travels with the history.
@@ -30,9 +37,10 @@ class C2KOutput
     SystemLog& log() const { return _log; }
 
   private:
-    const PlistDictionary* _lookup;
+    C2KLabels& _labels;
     PlistDictionary& _state;
     SystemLog& _log;
+    const Record* _record;
 };
 
 } // namespace ventrik

@@ -1,10 +1,15 @@
 #include "LogGenerator/Orbel/ShownFields.h"
 
-#include <algorithm>
 #include <bit>
 
 namespace ventrik
 {
+
+void ShownFields::forgetAll()
+{
+    _memory.forgetAll();
+    _places.clear();
+}
 
 void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
 {
@@ -17,17 +22,13 @@ void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
 
 void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw)
 {
-    Slot& slot = slotOf(field.key, &field);
-    if (slot.field == &field && slot.raw == raw)
+    const std::size_t slot = _memory.slotOf(field);
+    if (_memory.shows(slot, field, raw, false))
         return;
-    auto text = field.shown.textOf(raw);
-    if (!text)
-        return;
-    slot.field = &field;
-    slot.record = _record;
-    slot.raw = raw;
-    slot.isWorkedOut = false;
-    store(dictionary, slot, std::move(*text));
+    if (auto text = field.shown.textOf(raw)) {
+        _memory.keep(slot, field, _record, raw, false);
+        store(dictionary, slot, field.key, std::move(*text));
+    }
 }
 
 void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> fields,
@@ -39,55 +40,39 @@ void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> field
 
 void ShownFields::showNumber(PlistDictionary& dictionary, const Field& field, double number)
 {
-    Slot& slot = slotOf(field.key, &field);
+    const std::size_t slot = _memory.slotOf(field);
     const auto bits = std::bit_cast<std::int64_t>(number);
-    if (slot.field == &field && slot.raw == bits)
+    if (_memory.shows(slot, field, bits, true))
         return;
-    slot.field = &field;
-    slot.record = _record;
-    slot.raw = bits;
-    slot.isWorkedOut = true;
-    store(dictionary, slot, field.shown.textOfNumber(number));
+    _memory.keep(slot, field, _record, bits, true);
+    store(dictionary, slot, field.key, field.shown.textOfNumber(number));
 }
 
 void ShownFields::showValue(PlistDictionary& dictionary, std::string_view key, PlistValue value)
 {
-    Slot& slot = slotOf(key, nullptr);
-    slot.field = nullptr;
-    store(dictionary, slot, std::move(value));
+    const std::size_t slot = _memory.slotOf(key);
+    _memory.keepNone(slot);
+    store(dictionary, slot, key, std::move(value));
 }
 
 std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
 {
-    const auto slot = std::ranges::find(_slots, key, &Slot::key);
-    if (slot == _slots.end() || !slot->field || slot->isWorkedOut)
-        return std::nullopt;
-    return ValueOrigin{slot->record, std::nullopt, slot->field, 0, slot->raw};
+    return _memory.originOf(key);
 }
 
-ShownFields::Slot& ShownFields::slotOf(std::string_view key, const Field* field)
+void ShownFields::store(PlistDictionary& dictionary, std::size_t slot, std::string_view key,
+                        PlistValue value)
 {
-    // Fields come in the order of their tables.
-    if (_next >= _slots.size() || !field || _slots[_next].field != field) {
-        auto slot = field ? std::ranges::find(_slots, field, &Slot::field) : _slots.end();
-        if (slot == _slots.end())
-            slot = std::ranges::find(_slots, key, &Slot::key);
-        if (slot == _slots.end())
-            slot = _slots.insert(slot, {.key = key});
-        _next = static_cast<std::size_t>(slot - _slots.begin());
-    }
-    return _slots[_next++];
-}
-
-void ShownFields::store(PlistDictionary& dictionary, Slot& slot, PlistValue value)
-{
-    PlistDictionary::Entry* entry = dictionary.entryAt(slot.place);
-    if (entry && entry->key == slot.key) {
+    if (slot >= _places.size())
+        _places.resize(slot + 1);
+    std::size_t& place = _places[slot];
+    PlistDictionary::Entry* entry = dictionary.entryAt(place);
+    if (entry && entry->key == key) {
         entry->value = std::move(value);
         return;
     }
-    dictionary.set(slot.key, std::move(value));
-    slot.place = dictionary.placeOf(slot.key).value_or(0);
+    dictionary.set(key, std::move(value));
+    place = dictionary.placeOf(key).value_or(0);
 }
 
 } // namespace ventrik

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Orbel/ValueOrigin.h"
+#include "LogGenerator/Orbel/FieldMemory.h"
 #include "PropertyList/PlistValue.h"
 
 #include <string_view>
@@ -9,14 +9,14 @@
 namespace ventrik
 {
 
-/// What a dictionary of the display shows of records: for each key the field that wrote it last and
-/// the raw number that it shows. A field that comes with the same number again is neither formatted
-/// nor stored. When a key goes, whoever removed it, all is forgotten and shown again.
+/// Shows fields of records in a dictionary of the display. A field that comes with the number that
+/// its key shows already is neither formatted nor stored. When a key goes, whoever removed it, all
+/// is forgotten and shown again.
 class ShownFields
 {
   public:
     /// Nothing is known of what the dictionary shows: every field is written anew.
-    void forgetAll() { _slots.clear(); }
+    void forgetAll();
 
     /// The following fields are those of this record, and go into this dictionary.
     void begin(const PlistDictionary& dictionary, const Record* record);
@@ -33,22 +33,13 @@ class ShownFields
     std::optional<ValueOrigin> originOf(std::string_view key) const;
 
   private:
-    struct Slot {
-        std::string_view key;
-        const Field* field = nullptr; // null: a value that no field describes
-        const Record* record = nullptr;
-        std::int64_t raw = 0;
-        bool isWorkedOut = false; // the raw number is none of the record's
-        std::size_t place = 0;    // in the dictionary
-    };
+    void store(PlistDictionary& dictionary, std::size_t slot, std::string_view key,
+               PlistValue value);
 
-    Slot& slotOf(std::string_view key, const Field* field);
-    static void store(PlistDictionary& dictionary, Slot& slot, PlistValue value);
-
-    std::vector<Slot> _slots;
-    std::size_t _next = 0; // where the next field is most likely to be
+    FieldMemory _memory;
+    std::vector<std::size_t> _places; // of each slot's key in the dictionary
     const Record* _record = nullptr;
-    std::size_t _removals = 0; // of the dictionary, as far as the slots know
+    std::size_t _removals = 0; // of the dictionary, as far as is known
 };
 
 } // namespace ventrik

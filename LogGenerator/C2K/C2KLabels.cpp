@@ -1,0 +1,127 @@
+#include "LogGenerator/C2K/C2KLabels.h"
+
+#include "Packets/ShownNumbers.h"
+
+#include <bit>
+
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr Shown pilotLevel{.digits = Digits::SignedTwoDecimals, .unit = "dB"};
+
+PlistDictionary groupOf(const std::vector<ShownPilot>& pilots)
+{
+    // The display sorts the group.
+    PlistDictionary group{{"_sorted", "_sorted"}};
+    for (const ShownPilot& pilot : pilots)
+        group.set(fmt::format("{};{}", pilot.index, pilot.pnOffset),
+                  (pilot.isReference ? "(ref pilot) " : "") + pilotLevel.textOfNumber(pilot.level));
+    return group;
+}
+
+} // namespace
+
+// Levels that are no number are the same when their bits are.
+bool ShownPilot::operator==(const ShownPilot& other) const
+{
+    return index == other.index && pnOffset == other.pnOffset && isReference == other.isReference &&
+           std::bit_cast<std::uint64_t>(level) == std::bit_cast<std::uint64_t>(other.level);
+}
+
+void C2KLabels::useLookup(const PlistDictionary* lookup)
+{
+    if (lookup ? _lookup && _lookup->isSameContainer(*lookup) : !_lookup)
+        return;
+    _lookup = lookup ? std::optional(*lookup) : std::nullopt;
+    _memory.forgetAll();
+    _labels.clear();
+}
+
+void C2KLabels::publish(const Field& field, const Record* record, std::int64_t raw)
+{
+    const std::size_t slot = _memory.slotOf(field);
+    if (_memory.shows(slot, field, raw, false))
+        return;
+    _memory.keep(slot, field, record, raw, false);
+    Labels& labels = labelsOf(slot, field.key);
+    labels.text.clear();
+    store(labels, field.shown.textOf(raw).value_or(""));
+}
+
+void C2KLabels::publish(std::string_view lookupKey, std::string_view text)
+{
+    const std::size_t slot = _memory.slotOf(lookupKey);
+    Labels& labels = labelsOf(slot, lookupKey);
+    if (labels.text == text && !text.empty() && !labels.isGroup)
+        return;
+    _memory.keepNone(slot);
+    labels.text = text;
+    labels.isGroup = false;
+    store(labels, text);
+}
+
+void C2KLabels::publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+                        std::string_view textOfNone)
+{
+    if (pilots.empty() && !textOfNone.empty())
+        return publish(lookupKey, textOfNone);
+    const std::size_t slot = _memory.slotOf(lookupKey);
+    Labels& labels = labelsOf(slot, lookupKey);
+    if (labels.isGroup && labels.pilots == pilots)
+        return;
+    _memory.keepNone(slot);
+    labels.pilots = pilots;
+    labels.isGroup = true;
+    store(labels, groupOf(pilots));
+}
+
+std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
+                                               std::string_view label) const
+{
+    for (std::size_t slot = 0; slot < _labels.size(); ++slot)
+        for (const Target& target : _labels[slot].targets)
+            if (target.label == label && target.group.isSameContainer(group))
+                return _memory.originOf(slot);
+    return std::nullopt;
+}
+
+C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, std::string_view lookupKey)
+{
+    if (slot >= _labels.size()) {
+        _labels.resize(slot + 1);
+        _labels[slot].targets = targetsOf(lookupKey);
+    }
+    return _labels[slot];
+}
+
+// An entry of the lookup that is none ends the labels there.
+std::vector<C2KLabels::Target> C2KLabels::targetsOf(std::string_view lookupKey) const
+{
+    std::vector<Target> targets;
+    const PlistValue* found = _lookup ? _lookup->find(lookupKey) : nullptr;
+    const PlistArray* entries = found ? found->array() : nullptr;
+    if (!entries)
+        return targets;
+    for (const PlistValue& element : *entries) {
+        const PlistDictionary* entry = element.dictionary();
+        const PlistValue* label = entry ? entry->find("key") : nullptr;
+        const PlistValue* group = entry ? entry->find("dict") : nullptr;
+        if (!label || !label->string() || !group || !group->dictionary())
+            break;
+        targets.push_back({*group->dictionary(), *label->string()});
+    }
+    return targets;
+}
+
+void C2KLabels::store(Labels& labels, const PlistValue& value)
+{
+    for (Target& target : labels.targets)
+        target.group.set(target.label, value);
+}
+
+} // namespace ventrik

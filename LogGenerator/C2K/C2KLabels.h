@@ -1,0 +1,62 @@
+#pragma once
+
+#include "LogGenerator/Orbel/FieldMemory.h"
+#include "PropertyList/PlistValue.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace ventrik
+{
+
+/// A pilot as a group of pilots shows it: by its place in the record and its PN offset.
+struct ShownPilot {
+    std::size_t index;
+    std::uint16_t pnOffset;
+    double level; ///< dB
+    bool isReference = false;
+
+    bool operator==(const ShownPilot& other) const;
+};
+
+/// The labels that the template gives to each lookup key, and what they show: a value that has not
+/// changed is neither formatted nor stored again. It keeps the lookup alive that it knows.
+class C2KLabels
+{
+  public:
+    /// The labels are those of this lookup, whatever was known of another one is forgotten. None:
+    /// what is published goes nowhere.
+    void useLookup(const PlistDictionary* lookup);
+
+    void publish(const Field& field, const Record* record, std::int64_t raw);
+    void publish(std::string_view lookupKey, std::string_view text);
+    void publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+                 std::string_view textOfNone);
+
+    /// Where the value under a label of a group comes from; none where no field shows there.
+    std::optional<ValueOrigin> originOf(const PlistDictionary& group, std::string_view label) const;
+
+  private:
+    struct Target {
+        PlistDictionary group;
+        std::string label;
+    };
+    struct Labels {
+        std::vector<Target> targets;
+        std::string text;               // that no field describes; else empty
+        std::vector<ShownPilot> pilots; // likewise
+        bool isGroup = false;
+    };
+
+    Labels& labelsOf(std::size_t slot, std::string_view lookupKey);
+    std::vector<Target> targetsOf(std::string_view lookupKey) const;
+    static void store(Labels& labels, const PlistValue& value);
+
+    std::optional<PlistDictionary> _lookup;
+    FieldMemory _memory;
+    std::vector<Labels> _labels; // of each slot
+};
+
+} // namespace ventrik

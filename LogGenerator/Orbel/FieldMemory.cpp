@@ -1,0 +1,56 @@
+#include "LogGenerator/Orbel/FieldMemory.h"
+
+#include <algorithm>
+
+namespace ventrik
+{
+
+std::size_t FieldMemory::slotOf(const Field& field)
+{
+    // Fields come in the order of their tables.
+    if (_next < _slots.size() && _slots[_next].field == &field)
+        return _next++;
+    const auto slot = std::ranges::find(_slots, &field, &Slot::field);
+    const auto index = slot == _slots.end() ? slotOf(field.key)
+                                            : static_cast<std::size_t>(slot - _slots.begin());
+    _next = index + 1;
+    return index;
+}
+
+std::size_t FieldMemory::slotOf(std::string_view key)
+{
+    auto slot = std::ranges::find(_slots, key, &Slot::key);
+    if (slot == _slots.end())
+        slot = _slots.insert(slot, {.key = key});
+    return static_cast<std::size_t>(slot - _slots.begin());
+}
+
+bool FieldMemory::shows(std::size_t slot, const Field& field, std::int64_t raw,
+                        bool isWorkedOut) const
+{
+    const Slot& known = _slots[slot];
+    return known.field == &field && known.raw == raw && known.isWorkedOut == isWorkedOut;
+}
+
+void FieldMemory::keep(std::size_t slot, const Field& field, const Record* record, std::int64_t raw,
+                       bool isWorkedOut)
+{
+    _slots[slot] = {_slots[slot].key, &field, record, raw, isWorkedOut};
+}
+
+std::optional<ValueOrigin> FieldMemory::originOf(std::size_t slot) const
+{
+    const Slot& known = _slots[slot];
+    if (!known.field || !known.record || known.isWorkedOut)
+        return std::nullopt;
+    return ValueOrigin{known.record, std::nullopt, known.field, 0, known.raw};
+}
+
+std::optional<ValueOrigin> FieldMemory::originOf(std::string_view key) const
+{
+    const auto slot = std::ranges::find(_slots, key, &Slot::key);
+    return slot == _slots.end() ? std::nullopt
+                                : originOf(static_cast<std::size_t>(slot - _slots.begin()));
+}
+
+} // namespace ventrik

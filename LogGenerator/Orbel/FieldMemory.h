@@ -1,0 +1,47 @@
+#pragma once
+
+#include "LogGenerator/Orbel/ValueOrigin.h"
+
+#include <string_view>
+#include <vector>
+
+namespace ventrik
+{
+
+/// What keys of the display show: for each the field that wrote it last and the raw number that it
+/// wrote. Keys must be constants.
+class FieldMemory
+{
+  public:
+    void forgetAll() { _slots.clear(); }
+
+    /// The slot of a field's key, a new one at the end of the others when it had none.
+    std::size_t slotOf(const Field& field);
+    std::size_t slotOf(std::string_view key);
+
+    /// Whether the slot's key shows that number of that field. A number that was worked out is none
+    /// of the record's.
+    bool shows(std::size_t slot, const Field& field, std::int64_t raw, bool isWorkedOut) const;
+    void keep(std::size_t slot, const Field& field, const Record* record, std::int64_t raw,
+              bool isWorkedOut);
+    /// The key shows what no field describes.
+    void keepNone(std::size_t slot) { _slots[slot].field = nullptr; }
+
+    std::optional<ValueOrigin> originOf(std::size_t slot) const;
+    /// None for a key that no field shows. The version is for the caller to fill in.
+    std::optional<ValueOrigin> originOf(std::string_view key) const;
+
+  private:
+    struct Slot {
+        std::string_view key;
+        const Field* field = nullptr;
+        const Record* record = nullptr;
+        std::int64_t raw = 0;
+        bool isWorkedOut = false;
+    };
+
+    std::vector<Slot> _slots;
+    std::size_t _next = 0; // where the next field is most likely to be
+};
+
+} // namespace ventrik

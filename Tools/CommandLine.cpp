@@ -1,15 +1,17 @@
 #include "Tools/CommandLine.h"
 
 #include "Platform/Linux/StandardStreams.h"
-#include "Platform/SystemLog.h"
+#include "Tools/OptionValues.h"
 
 #include <algorithm>
 #include <cerrno>
-#include <cmath>
 #include <cstdlib>
+#include <span>
+#include <sstream>
+#include <vector>
 
+#include <CLI/CLI.hpp>
 #include <fmt/format.h>
-#include <getopt.h>
 #include <unistd.h>
 
 namespace ventrik
@@ -19,69 +21,244 @@ namespace
 {
 
 constexpr int wrongUsage = 2;
+constexpr std::size_t lineWidth = 80;
+constexpr std::size_t helpColumn = 28; // behind the longest option
 
-struct LogLevel {
-    std::string_view name;
-    int priority;
+// Breaks the text at spaces into lines of that width; an indentation is up to the caller.
+std::string wrapped(std::string_view text, std::size_t width)
+{
+    std::string result;
+    std::size_t column = 0;
+    for (const std::string& word : CLI::detail::split(std::string(text), ' ')) {
+        const bool fits = column + 1 + word.size() <= width;
+        if (column > 0)
+            result += fits ? ' ' : '\n';
+        column = (column > 0 && fits ? column + 1 : 0) + word.size();
+        result += word;
+    }
+    return result;
+}
+
+// The help of all programs; man pages are made of it as well, which see a form of usage behind
+// "or:" and a section in a heading with a colon.
+class HelpText : public CLI::Formatter
+{
+  public:
+    HelpText()
+    {
+        column_width(helpColumn);
+        label("Positionals", "Arguments");
+        label("REQUIRED", ""); // usage shows that
+    }
+    void addUsage(std::string_view form) { _forms.emplace_back(form); }
+    void addExitStatus(int status, std::string_view meaning)
+    {
+        _exitStatuses += row(std::to_string(status), meaning);
+    }
+
+    std::string make_help(const CLI::App* app, std::string, CLI::AppFormatMode mode) const override
+    {
+        const std::string text =
+            make_usage(app, app->get_name()) + "\n" + wrapped(app->get_description(), lineWidth) +
+            "\n" + make_positionals(app) + make_groups(app, mode) + "\nExit status:\n" +
+            _exitStatuses + row(std::to_string(wrongUsage), "wrong usage") +
+            row("141", "the reader of what it prints has gone");
+        return CLI::detail::find_and_replace(text, "\n\n\n", "\n\n");
+    }
+    std::string make_usage(const CLI::App*, std::string name) const override
+    {
+        std::string text;
+        for (const std::string& form : _forms)
+            text += fmt::format("{} {} {}\n", text.empty() ? "Usage:" : "  or: ", name, form);
+        return text;
+    }
+    std::string make_option_desc(const CLI::Option* option) const override
+    {
+        return wrapped(option->get_description(), lineWidth - helpColumn);
+    }
+
+  private:
+    static std::string row(std::string name, std::string_view text)
+    {
+        constexpr std::size_t indentation = 6;
+        std::ostringstream line;
+        CLI::detail::format_help(line, std::move(name), wrapped(text, lineWidth - indentation),
+                                 indentation);
+        return line.str();
+    }
+
+    std::vector<std::string> _forms;
+    std::string _exitStatuses;
 };
-constexpr LogLevel logLevels[] = {
-    {"emergency", LogPriority::emergency}, {"alert", LogPriority::alert},
-    {"critical", LogPriority::critical},   {"error", LogPriority::error},
-    {"warning", LogPriority::warning},     {"notice", LogPriority::notice},
-    {"info", LogPriority::info},           {"debug", LogPriority::debug}};
+
+[[noreturn]] void tell(std::string_view program, std::string_view text)
+{
+    if (writeText(STDOUT_FILENO, text, Patience::Endless))
+        std::exit(EXIT_SUCCESS);
+    std::exit(tellOutputFailure(program, "standard output", errno));
+}
+
+bool takesValue(const CLI::Option& option)
+{
+    return option.get_items_expected_max() > 0;
+}
+
+[[noreturn]] void refuseArgument(std::string reason)
+{
+    throw CLI::ParseError(std::move(reason), CLI::ExitCodes::ArgumentMismatch);
+}
+
+// The arguments with each "--option=value" as two: the library would miss an empty value, and let a
+// flag have one.
+std::vector<std::string> separated(const CLI::App& app, std::span<char* const> arguments)
+{
+    std::vector<std::string> result;
+    bool isValue = false;
+    bool isBehindOptions = false;
+    for (const std::string argument : arguments) {
+        const std::size_t equals = argument.find('=');
+        const std::string name = argument.substr(0, equals);
+        const bool mayBeOption = !isValue && !isBehindOptions && name.starts_with("--");
+        const CLI::Option* option = mayBeOption ? app.get_option_no_throw(name) : nullptr;
+        const bool hasValue = option && equals != std::string::npos;
+        if (hasValue && !takesValue(*option))
+            refuseArgument(fmt::format("{} takes no value", name));
+        isBehindOptions |= !isValue && argument == "--";
+        isValue = option && !hasValue && takesValue(*option);
+        result.push_back(hasValue ? name : argument);
+        if (hasValue)
+            result.push_back(argument.substr(equals + 1));
+    }
+    if (isValue)
+        refuseArgument(fmt::format("{} needs a value", result.back()));
+    return result;
+}
+
+// What is wrong with arguments that nobody takes; "--" among them has ended the options.
+std::string reasonOfExtras(const std::vector<std::string>& extras)
+{
+    const auto first = std::ranges::find_if(extras, [](const auto& text) { return text != "--"; });
+    const bool isOption = first == extras.begin() && first->starts_with("-");
+    return fmt::format("{} '{}'{}", isOption ? "there is no option" : "what is", *first,
+                       isOption ? "" : "?");
+}
 
 } // namespace
 
-CommandLine::CommandLine(std::string_view program, int argc, char** argv)
-    : _program(program), _argc(argc), _argv(argv)
+struct CommandLine::Parser {
+    Parser(std::string program, std::string purpose) : app(std::move(purpose), std::move(program))
+    {
+        app.formatter(help);
+        app.set_help_flag();
+    }
+
+    CLI::Option* add(std::string name, std::string text, Take take)
+    {
+        auto takeEach = [name, take = std::move(take)](const CLI::results_t& values) {
+            try {
+                std::ranges::for_each(values, take);
+            } catch (const WrongValue& error) {
+                throw CLI::ValidationError(name, error.what());
+            }
+            return true;
+        };
+        return app.add_option(name, std::move(takeEach), std::move(text))
+            ->group(group)
+            ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+    }
+    CLI::App app;
+    std::shared_ptr<HelpText> help = std::make_shared<HelpText>();
+    std::string group = "Options";
+};
+
+CommandLine::CommandLine(std::string program, std::string purpose)
+    : _parser(std::make_unique<Parser>(std::move(program), std::move(purpose)))
 {
-    opterr = 0;
 }
 
-int CommandLine::next(const option* options)
+CommandLine::~CommandLine() = default;
+
+void CommandLine::addUsage(std::string_view form)
 {
-    const int letter = getopt_long(_argc, _argv, ":", options, nullptr);
-    if (letter == ':')
-        refuse(fmt::format("{} needs a value", _argv[optind - 1]));
-    if (letter == '?')
-        refuse(fmt::format("there is no option '{}'", _argv[optind - 1]));
-    _value = optarg;
-    return letter;
+    _parser->help->addUsage(form);
 }
 
-std::vector<std::string> CommandLine::arguments() const
+void CommandLine::beginGroup(std::string heading)
 {
-    return {_argv + optind, _argv + _argc};
+    _parser->group = std::move(heading);
+}
+
+void CommandLine::addFlag(std::string name, std::string help, std::function<void()> take)
+{
+    _parser->app.add_flag_callback(std::move(name), std::move(take), std::move(help))
+        ->group(_parser->group);
+}
+
+void CommandLine::addFlag(std::string name, std::string help, bool& target)
+{
+    addFlag(std::move(name), std::move(help), [&target] { target = true; });
+}
+
+void CommandLine::addOption(std::string_view nameAndValue, std::string help, Take take)
+{
+    const std::size_t space = nameAndValue.find(' ');
+    _parser->add(std::string(nameAndValue.substr(0, space)), std::move(help), std::move(take))
+        ->type_name(std::string(nameAndValue.substr(space + 1)));
+}
+
+void CommandLine::addArgument(std::string name, std::string help, std::string& target)
+{
+    _parser->add(std::move(name), std::move(help), [&target](const auto& value) { target = value; })
+        ->type_name("")
+        ->required();
+}
+
+void CommandLine::addLogOptions(std::string_view lines, int& level, std::string verboseHelp,
+                                bool& verbose)
+{
+    beginGroup("Log");
+    addOption("--log-level LEVEL",
+              fmt::format("the least urgent lines that {}: {}", lines, logLevelNames(level)), level,
+              logLevelValue);
+    addFlag("--verbose", std::move(verboseHelp), verbose);
+}
+
+void CommandLine::addExitStatus(int status, std::string_view meaning)
+{
+    _parser->help->addExitStatus(status, meaning);
+}
+
+void CommandLine::parse(int argc, char** argv)
+{
+    CLI::App& app = _parser->app;
+    const std::string program = app.get_name();
+    app.option_defaults()->group("Information");
+    app.set_help_flag("--help", "tells the options");
+    app.set_version_flag("--version", program + " " VENTRIK_VERSION, "tells the version");
+    try {
+        auto arguments = separated(app, std::span(argv, static_cast<std::size_t>(argc)).subspan(1));
+        std::ranges::reverse(arguments); // the library takes them from the end
+        app.parse(arguments);
+    } catch (const CLI::CallForHelp&) {
+        tell(program, app.help());
+    } catch (const CLI::CallForVersion& version) {
+        tell(program, std::string(version.what()) + "\n");
+    } catch (const CLI::ExtrasError&) {
+        refuse(reasonOfExtras(app.remaining()));
+    } catch (const CLI::ParseError& error) {
+        refuse(error.what());
+    }
+}
+
+bool CommandLine::has(const std::string& option) const
+{
+    return _parser->app.count(option) > 0;
 }
 
 void CommandLine::refuse(std::string_view reason) const
 {
-    complain(_program, fmt::format("{}; see --help", reason));
+    complain(_parser->app.get_name(), fmt::format("{}; see --help", reason));
     std::exit(wrongUsage);
-}
-
-void CommandLine::tell(std::string_view text) const
-{
-    if (writeText(STDOUT_FILENO, text, Patience::Endless))
-        std::exit(EXIT_SUCCESS);
-    std::exit(tellOutputFailure(_program, "standard output", errno));
-}
-
-double CommandLine::positiveNumber(std::string_view option) const
-{
-    char* end = nullptr;
-    const double number = std::strtod(_value, &end);
-    if (end == _value || *end != '\0' || !std::isfinite(number) || number <= 0)
-        refuse(fmt::format("{} takes a number above 0, not '{}'", option, _value));
-    return number;
-}
-
-int CommandLine::logLevel() const
-{
-    const auto* level = std::ranges::find(logLevels, std::string_view(_value), &LogLevel::name);
-    if (level == std::end(logLevels))
-        refuse(fmt::format("there is no log level '{}'", _value));
-    return level->priority;
 }
 
 } // namespace ventrik

@@ -1,41 +1,62 @@
 #pragma once
 
+#include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
-#include <vector>
-
-struct option;
+#include <utility>
 
 namespace ventrik
 {
 
-/// Walks over a program's options (getopt_long's table) and refuses what is wrong in one line on
-/// standard error, with exit status 2.
+/// A program's options, each declared once: its name, its help, its check and where it goes. What
+/// is wrong is refused in one line on standard error, with exit status 2.
+///
+/// An option that is given again is checked each time, and its last value counts.
 class CommandLine
 {
   public:
-    CommandLine(std::string_view program, int argc, char** argv);
+    /// Takes the value of an option; throws WrongValue for one that is no good.
+    using Take = std::function<void(const std::string& value)>;
 
-    /// The next option's letter, or -1 after the last; `value` is then its value.
-    int next(const option* options);
-    const char* value() const { return _value; }
-    /// What stands behind the options.
-    std::vector<std::string> arguments() const;
+    CommandLine(std::string program, std::string purpose);
+    ~CommandLine();
+    CommandLine(const CommandLine&) = delete;
+    CommandLine& operator=(const CommandLine&) = delete;
 
+    /// What usage shows behind the program's name, where "[OPTION]..." and the argument are not
+    /// all; again for another way to use it.
+    void addUsage(std::string_view form);
+    /// The help's heading for what is declared from then on; "Options" before.
+    void beginGroup(std::string heading);
+    void addFlag(std::string name, std::string help, std::function<void()> take);
+    void addFlag(std::string name, std::string help, bool& target);
+    /// The name and the value's name in one, as in "--seed N".
+    void addOption(std::string_view nameAndValue, std::string help, Take take);
+    /// `read` makes the target's value of the text, see OptionValues.h.
+    template <typename Target, typename Read>
+    void addOption(std::string_view nameAndValue, std::string help, Target& target, Read read)
+    {
+        addOption(nameAndValue, std::move(help),
+                  [&target, read](const std::string& value) { target = read(value); });
+    }
+    /// The one argument, which must be there.
+    void addArgument(std::string name, std::string help, std::string& target);
+    /// --log-level and --verbose, with their present values as the defaults. The level's help says
+    /// which lines it is about.
+    void addLogOptions(std::string_view lines, int& level, std::string verboseHelp, bool& verbose);
+    /// For the help; 2, wrong usage, is there already.
+    void addExitStatus(int status, std::string_view meaning);
+
+    /// Gives every option its value. Ends the program for --help and --version (which go to
+    /// standard output, with success where that takes them) and for wrong usage.
+    void parse(int argc, char** argv);
+    bool has(const std::string& option) const;
     [[noreturn]] void refuse(std::string_view reason) const;
-    /// Prints to standard output and ends the program, with success where that takes it: for --help
-    /// and --version.
-    [[noreturn]] void tell(std::string_view text) const;
-    /// A positive number; anything else is refused under the option's name.
-    double positiveNumber(std::string_view option) const;
-    /// The priority (see LogPriority) whose name the value is; anything else is refused.
-    int logLevel() const;
 
   private:
-    std::string_view _program;
-    int _argc;
-    char** _argv;
-    const char* _value = nullptr;
+    struct Parser; // keeps the library's header, which takes long to read, out of the programs
+    std::unique_ptr<Parser> _parser;
 };
 
 } // namespace ventrik

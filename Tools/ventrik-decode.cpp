@@ -1,14 +1,13 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Tools/CommandLine.h"
 #include "Tools/DecodeCommand.h"
+#include "Tools/OptionValues.h"
 
 #include <csignal>
-#include <filesystem>
 #include <map>
 
 #include <fcntl.h>
 #include <fmt/format.h>
-#include <getopt.h>
 #include <unistd.h>
 
 using namespace ventrik;
@@ -16,113 +15,59 @@ using namespace ventrik;
 namespace
 {
 
-constexpr const char* usage =
-    "usage: ventrik-decode [--technology NAME] [--format text|json|jsonl] [--system-log FILE]\n"
-    "                      [--snapshot FILE] [--description TEXT] [--resources DIR]\n"
-    "                      [--log-level LEVEL] [--verbose] CAPTURE\n"
-    "\n"
-    "Decodes a capture of log-channel messages (a pcap file; - for standard input) and prints the\n"
-    "display that the viewer would show.\n"
-    "\n"
-    "  --technology NAME   lte, gsm, utran, c2k or ifx; needed where the capture does not tell\n"
-    "  --format FORMAT     text: the display tree at the end (default)\n"
-    "                      json: one document; jsonl: a line for every message\n"
-    "  --system-log FILE   writes every system-log line to FILE\n"
-    "  --snapshot FILE     writes the snapshot that Save would write after the last message\n"
-    "  --description TEXT  the snapshot's description\n"
-    "  --resources DIR     takes the display templates from DIR\n"
-    "  --verbose           shows the system log on standard error, and what decoders tell\n"
-    "  --log-level LEVEL   the least urgent lines that --verbose shows: debug (default), info,\n"
-    "                      notice, warning, error, critical, alert or emergency\n"
-    "  --help, --version\n"
-    "\n"
-    "Exit status: 0 done, 1 the input cannot be read or is damaged or the result cannot be\n"
-    "written, 2 wrong usage.\n";
-
-CaptureTechnology technologyArgument(const CommandLine& line)
-{
-    const auto technology = technologyNamed(line.value());
-    if (!technology)
-        line.refuse(fmt::format("there is no technology '{}'", line.value()));
-    return *technology;
-}
-
-DecodeFormat formatArgument(const CommandLine& line)
+DecodeFormat formatValue(const std::string& text)
 {
     static const std::map<std::string_view, DecodeFormat> formats{
         {"text", DecodeFormat::Text},
         {"json", DecodeFormat::Json},
         {"jsonl", DecodeFormat::JsonLines}};
-    const auto format = formats.find(line.value());
+    const auto format = formats.find(text);
     if (format == formats.end())
-        line.refuse(fmt::format("there is no format '{}'", line.value()));
+        throw WrongValue(fmt::format("there is no format '{}'", text));
     return format->second;
 }
 
-std::string directoryArgument(const CommandLine& line)
+void addOptions(CommandLine& line, DecodeOptions& result)
 {
-    std::error_code error;
-    if (!std::filesystem::is_directory(line.value(), error))
-        line.refuse(fmt::format("'{}' is no directory", line.value()));
-    return line.value();
-}
-
-void takeOption(int letter, const CommandLine& line, DecodeOptions& result)
-{
-    switch (letter) {
-    case 't':
-        result.technology = technologyArgument(line);
-        break;
-    case 'f':
-        result.format = formatArgument(line);
-        break;
-    case 'l':
-        result.systemLogFile = line.value();
-        break;
-    case 's':
-        result.snapshotFile = line.value();
-        break;
-    case 'd':
-        result.description = line.value();
-        break;
-    case 'r':
-        result.resourceDirectories = {directoryArgument(line)};
-        break;
-    case 'V':
-        result.verbose = true;
-        break;
-    case 'L':
-        result.logLevel = line.logLevel();
-        break;
-    case 'h':
-        line.tell(usage);
-    default:
-        line.tell("ventrik-decode " VENTRIK_VERSION "\n");
-    }
+    line.addUsage("[OPTION]... CAPTURE");
+    line.addArgument("CAPTURE", "a pcap file; - for standard input", result.capture);
+    line.addOption("--technology NAME",
+                   technologyNames() + "; needed where the capture does not tell",
+                   result.technology, technologyValue);
+    line.addOption("--format FORMAT",
+                   "text: the display tree at the end (default); json: one document; jsonl: a "
+                   "line for every message",
+                   result.format, formatValue);
+    line.addOption("--system-log FILE",
+                   "writes every system-log line to FILE: its priority, a tab, its text",
+                   result.systemLogFile, textValue);
+    line.addOption("--snapshot FILE",
+                   "writes the snapshot that Save would write after the last message",
+                   result.snapshotFile, textValue);
+    line.addOption("--description TEXT", "the snapshot's description", result.description,
+                   textValue);
+    line.addOption("--resources DIR", "takes the display templates from DIR",
+                   [&](const std::string& directory) {
+                       result.resourceDirectories = {directoryValue(directory)};
+                   });
+    line.addLogOptions("--verbose shows", result.logLevel,
+                       "shows the system log on standard error, and what decoders tell",
+                       result.verbose);
+    line.addExitStatus(DecodeStatus::done, "all was decoded");
+    line.addExitStatus(DecodeStatus::badInput,
+                       "the input cannot be read or is damaged (what was decoded before is still "
+                       "printed), or the result cannot be written");
 }
 
 DecodeOptions parseArguments(int argc, char** argv)
 {
-    static const option options[] = {{"technology", required_argument, nullptr, 't'},
-                                     {"format", required_argument, nullptr, 'f'},
-                                     {"system-log", required_argument, nullptr, 'l'},
-                                     {"snapshot", required_argument, nullptr, 's'},
-                                     {"description", required_argument, nullptr, 'd'},
-                                     {"resources", required_argument, nullptr, 'r'},
-                                     {"verbose", no_argument, nullptr, 'V'},
-                                     {"log-level", required_argument, nullptr, 'L'},
-                                     {"help", no_argument, nullptr, 'h'},
-                                     {"version", no_argument, nullptr, 'v'},
-                                     {}};
-    CommandLine line("ventrik-decode", argc, argv);
+    CommandLine line("ventrik-decode",
+                     "Decodes a capture of log-channel messages and prints the display that the "
+                     "viewer would show. Time is the capture's.");
     DecodeOptions result;
     result.version = VENTRIK_VERSION;
-    for (int letter = 0; (letter = line.next(options)) != -1;)
-        takeOption(letter, line, result);
-    const auto arguments = line.arguments();
-    if (arguments.size() != 1)
-        line.refuse(arguments.empty() ? "which capture?" : "one capture at a time");
-    result.capture = arguments.front();
+    addOptions(line, result);
+    line.parse(argc, argv);
     return result;
 }
 

@@ -6,40 +6,18 @@
 #include "TelephonyService/Scenarios.h"
 #include "TelephonyService/TelephonyService.h"
 #include "Tools/CommandLine.h"
+#include "Tools/OptionValues.h"
 
 #include <QCoreApplication>
 
 #include <cstdlib>
 
 #include <fmt/format.h>
-#include <getopt.h>
 
 using namespace ventrik;
 
 namespace
 {
-
-constexpr const char* usage =
-    "usage: ventrik-telephony --technology NAME [--seed N]\n"
-    "       ventrik-telephony --technology NAME [--seed N] --write CAPTURE [--count N]\n"
-    "       ventrik-telephony --replay CAPTURE [--speed FACTOR|max] [--loop]\n"
-    "\n"
-    "A telephony service for machines without a baseband: answers the log-channel protocol and\n"
-    "streams a built-in scenario, or a capture, to every viewer that connects.\n"
-    "\n"
-    "  --technology NAME  the scenario of that technology: lte, gsm, utran, c2k or ifx\n"
-    "  --seed N           another drive through the same scenario (default 1)\n"
-    "  --write CAPTURE    writes the scenario's messages to a capture instead, and ends\n"
-    "  --count N          so many of them (default 10000)\n"
-    "  --replay CAPTURE   replays a capture with the pauses it was recorded with\n"
-    "  --speed FACTOR     replays that much faster; max: as fast as the viewer takes\n"
-    "  --loop             begins again at the capture's end\n"
-    "  --log-level LEVEL  the least urgent lines that go to the system log: debug, info, notice,\n"
-    "                     warning, error (default), critical, alert or emergency\n"
-    "  --verbose          copies every line of the log to standard error\n"
-    "  --help, --version\n"
-    "\n"
-    "Ended by SIGTERM or SIGINT. Exit status: 0 ended so, 1 it could not start, 2 wrong usage.\n";
 
 struct ServiceOptions {
     std::optional<CaptureTechnology> technology;
@@ -51,109 +29,74 @@ struct ServiceOptions {
     bool verbose = false;
 };
 
-std::uint32_t numberArgument(const CommandLine& line, std::string_view option)
+std::optional<double> speedValue(const std::string& text)
 {
-    char* end = nullptr;
-    errno = 0;
-    const unsigned long number = std::strtoul(line.value(), &end, 10);
-    if (end == line.value() || *end != '\0' || errno != 0 || number > UINT32_MAX)
-        line.refuse(
-            fmt::format("{} takes a whole number below 2^32, not '{}'", option, line.value()));
-    return static_cast<std::uint32_t>(number);
+    return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
 }
 
-std::optional<double> speedArgument(const CommandLine& line)
+CaptureTechnology scenarioValue(const std::string& text)
 {
-    if (std::string_view(line.value()) == "max")
-        return std::nullopt;
-    return line.positiveNumber("--speed");
+    const CaptureTechnology technology = technologyValue(text);
+    if (!makeScenario(technology, 1))
+        throw WrongValue(fmt::format("there is no scenario for '{}' yet", text));
+    return technology;
 }
 
-CaptureTechnology technologyArgument(const CommandLine& line)
+void addScenarioOptions(CommandLine& line, ServiceOptions& result)
 {
-    const auto technology = technologyNamed(line.value());
-    if (!technology)
-        line.refuse(fmt::format("there is no technology '{}'", line.value()));
-    if (!makeScenario(*technology, 1))
-        line.refuse(fmt::format("there is no scenario for '{}' yet", line.value()));
-    return *technology;
+    line.addOption("--technology NAME", "the scenario of that technology: " + technologyNames(),
+                   result.technology, scenarioValue);
+    line.addOption("--seed N",
+                   "another drive through the same scenario (default 1); the same number gives "
+                   "the same drive",
+                   result.seed, wholeNumberValue);
+    line.addOption("--write CAPTURE",
+                   "writes the scenario's messages to a capture instead, and ends",
+                   result.captureToWrite, textValue);
+    line.addOption("--count N", "so many of them (default 10000)", result.messageCount,
+                   wholeNumberValue);
 }
 
-struct ReplayArguments {
-    std::optional<std::string> capture;
-    std::optional<double> speed = 1.0;
-    bool loop = false;
-    bool isAskedFor = false;
-};
-
-void takeOption(int letter, const CommandLine& line, ServiceOptions& result,
-                ReplayArguments& replay)
+void addReplayOptions(CommandLine& line, ReplayOptions& result)
 {
-    switch (letter) {
-    case 't':
-        result.technology = technologyArgument(line);
-        break;
-    case 'n':
-        result.seed = numberArgument(line, "--seed");
-        break;
-    case 'w':
-        result.captureToWrite = line.value();
-        break;
-    case 'c':
-        result.messageCount = numberArgument(line, "--count");
-        break;
-    case 'r':
-        replay.capture = line.value();
-        break;
-    case 's':
-        replay.speed = speedArgument(line);
-        replay.isAskedFor = true;
-        break;
-    case 'l':
-        replay.loop = replay.isAskedFor = true;
-        break;
-    case 'L':
-        result.logLevel = line.logLevel();
-        break;
-    case 'V':
-        result.verbose = true;
-        break;
-    case 'h':
-        line.tell(usage);
-    default:
-        line.tell("ventrik-telephony " VENTRIK_VERSION "\n");
-    }
+    line.beginGroup("Replay");
+    line.addOption("--replay CAPTURE", "replays a capture with the pauses it was recorded with",
+                   result.capture, textValue);
+    line.addOption("--speed FACTOR", "replays that much faster; max: as fast as the viewer takes",
+                   result.speed, speedValue);
+    line.addFlag("--loop", "begins again at the capture's end", result.loop);
+}
+
+void refuseWrongTogether(const CommandLine& line)
+{
+    if (line.has("--technology") == line.has("--replay"))
+        line.refuse("either --technology or --replay");
+    if (!line.has("--replay") && (line.has("--speed") || line.has("--loop")))
+        line.refuse("--speed and --loop go with --replay");
+    if (line.has("--write") && !line.has("--technology"))
+        line.refuse("--write goes with --technology");
 }
 
 ServiceOptions parseArguments(int argc, char** argv)
 {
-    static const option options[] = {{"technology", required_argument, nullptr, 't'},
-                                     {"seed", required_argument, nullptr, 'n'},
-                                     {"write", required_argument, nullptr, 'w'},
-                                     {"count", required_argument, nullptr, 'c'},
-                                     {"replay", required_argument, nullptr, 'r'},
-                                     {"speed", required_argument, nullptr, 's'},
-                                     {"loop", no_argument, nullptr, 'l'},
-                                     {"log-level", required_argument, nullptr, 'L'},
-                                     {"verbose", no_argument, nullptr, 'V'},
-                                     {"help", no_argument, nullptr, 'h'},
-                                     {"version", no_argument, nullptr, 'v'},
-                                     {}};
-    CommandLine line("ventrik-telephony", argc, argv);
+    CommandLine line("ventrik-telephony",
+                     "A telephony service for machines without a baseband: answers the log-channel "
+                     "protocol and streams a built-in scenario, or a capture, to every viewer that "
+                     "connects.");
     ServiceOptions result;
-    ReplayArguments replay;
-    for (int letter = 0; (letter = line.next(options)) != -1;)
-        takeOption(letter, line, result, replay);
-    if (!line.arguments().empty())
-        line.refuse(fmt::format("what is '{}'?", line.arguments().front()));
-    if (result.technology.has_value() == replay.capture.has_value())
-        line.refuse("either --technology or --replay");
-    if (replay.capture)
-        result.replay = ReplayOptions{*replay.capture, replay.speed, replay.loop};
-    else if (replay.isAskedFor)
-        line.refuse("--speed and --loop go with --replay");
-    if (result.captureToWrite && !result.technology)
-        line.refuse("--write goes with --technology");
+    ReplayOptions replay;
+    line.addUsage("--technology NAME [OPTION]...");
+    line.addUsage("--replay CAPTURE [OPTION]...");
+    addScenarioOptions(line, result);
+    addReplayOptions(line, replay);
+    line.addLogOptions("go to the system log", result.logLevel,
+                       "copies every line of the log to standard error", result.verbose);
+    line.addExitStatus(EXIT_SUCCESS, "a signal ended it");
+    line.addExitStatus(EXIT_FAILURE, "it could not start");
+    line.parse(argc, argv);
+    refuseWrongTogether(line);
+    if (line.has("--replay"))
+        result.replay = replay;
     return result;
 }
 

@@ -10,27 +10,12 @@
 #include <cerrno>
 #include <cstdlib>
 
-#include <fmt/format.h>
-#include <getopt.h>
 #include <unistd.h>
 
 using namespace ventrik;
 
 namespace
 {
-
-constexpr const char* usage =
-    "usage: ventrik-watch [--once] [--log-level LEVEL] [--verbose]\n"
-    "\n"
-    "The viewer for a terminal: prints the display tree each time something new has arrived.\n"
-    "\n"
-    "  --once             ends after the first tree\n"
-    "  --log-level LEVEL  the least urgent lines that go to the system log: debug, info, notice,\n"
-    "                     warning, error (default), critical, alert or emergency\n"
-    "  --verbose          copies every line of the log to standard error\n"
-    "  --help, --version\n"
-    "\n"
-    "Exit status: 0 ended, 1 the tree could not be written, 2 wrong usage.\n";
 
 struct WatchOptions {
     bool once = false;
@@ -40,24 +25,16 @@ struct WatchOptions {
 
 WatchOptions parseArguments(int argc, char** argv)
 {
-    static const option options[] = {
-        {"once", no_argument, nullptr, 'o'},    {"log-level", required_argument, nullptr, 'L'},
-        {"verbose", no_argument, nullptr, 'V'}, {"help", no_argument, nullptr, 'h'},
-        {"version", no_argument, nullptr, 'v'}, {}};
-    CommandLine line("ventrik-watch", argc, argv);
+    CommandLine line("ventrik-watch", "The viewer for a terminal: prints the display tree each "
+                                      "time something new has arrived.");
     WatchOptions result;
-    for (int letter = 0; (letter = line.next(options)) != -1;) {
-        if (letter == 'o')
-            result.once = true;
-        else if (letter == 'L')
-            result.logLevel = line.logLevel();
-        else if (letter == 'V')
-            result.verbose = true;
-        else
-            line.tell(letter == 'h' ? usage : "ventrik-watch " VENTRIK_VERSION "\n");
-    }
-    if (!line.arguments().empty())
-        line.refuse(fmt::format("what is '{}'?", line.arguments().front()));
+    line.addUsage("[OPTION]...");
+    line.addFlag("--once", "ends after the first tree", result.once);
+    line.addLogOptions("go to the system log", result.logLevel,
+                       "copies every line of the log to standard error", result.verbose);
+    line.addExitStatus(EXIT_SUCCESS, "it was ended");
+    line.addExitStatus(EXIT_FAILURE, "the tree could not be written");
+    line.parse(argc, argv);
     return result;
 }
 

@@ -1,5 +1,4 @@
 #include "App/VentrikApp.h"
-#include "Capture/CaptureTechnology.h"
 #include "Platform/Linux/DiagnosticLogs.h"
 #include "Platform/Linux/LinuxPlatform.h"
 #include "Platform/Linux/StandardStreams.h"
@@ -7,6 +6,7 @@
 #include "Tools/CommandLine.h"
 #include "Tools/DemoDirectory.h"
 #include "Tools/DemoService.h"
+#include "Tools/OptionValues.h"
 
 #include <QApplication>
 #include <QIcon>
@@ -19,32 +19,11 @@
 #include <optional>
 
 #include <fmt/format.h>
-#include <getopt.h>
 
 using namespace ventrik;
 
 namespace
 {
-
-constexpr const char* usage =
-    "usage: ventrik [--demo TECHNOLOGY] [--save-button] [--snapshot-directory DIR]\n"
-    "               [--size WIDTHxHEIGHT] [--no-animation] [--plain] [--log-level LEVEL]\n"
-    "               [--verbose]\n"
-    "\n"
-    "Shows what the baseband tells, as a tree of tables that is brought up to date every 2 s.\n"
-    "\n"
-    "  --demo TECHNOLOGY         brings its own telephony service (lte, gsm, utran, c2k or ifx)\n"
-    "  --save-button             offers Save also where it is switched off\n"
-    "  --snapshot-directory DIR  saves snapshots in DIR\n"
-    "  --size WIDTHxHEIGHT       the window's size (default: that of the main screen)\n"
-    "  --no-animation            every change shows at once\n"
-    "  --plain                   no animation, and values that have changed are not tinted\n"
-    "  --log-level LEVEL         the least urgent lines that go to the system log: debug, info,\n"
-    "                            notice, warning, error (default), critical, alert or emergency\n"
-    "  --verbose                 copies every line of the log to standard error\n"
-    "  --help, --version\n"
-    "\n"
-    "Exit status: 0 ended, 1 there is no display or no demo service, 2 wrong usage.\n";
 
 struct ViewerOptions {
     VentrikAppOptions app;
@@ -63,62 +42,49 @@ std::optional<int> sideOf(std::string_view text)
     return side;
 }
 
-QSize sizeArgument(const CommandLine& line)
+QSize sizeValue(const std::string& value)
 {
-    const std::string_view text = line.value();
+    const std::string_view text = value;
     const std::size_t cross = std::min(text.find('x'), text.size());
     const auto width = sideOf(text.substr(0, cross));
     const auto height = sideOf(text.substr(std::min(cross + 1, text.size())));
     if (!width || !height)
-        line.refuse(fmt::format("--size takes WIDTHxHEIGHT, not '{}'", text));
+        throw WrongValue(fmt::format("'{}' is no WIDTHxHEIGHT", text));
     return {*width, *height};
 }
 
-std::string technologyArgument(const CommandLine& line)
+void addOptions(CommandLine& line, ViewerOptions& result)
 {
-    if (!technologyNamed(line.value()))
-        line.refuse(fmt::format("there is no technology '{}'", line.value()));
-    return line.value();
+    line.addUsage("[OPTION]...");
+    line.addOption("--demo TECHNOLOGY", "brings its own telephony service: " + technologyNames(),
+                   result.demoTechnology,
+                   [](const std::string& text) { return technologyValue(text).name; });
+    line.addFlag("--save-button", "offers Save also where it is switched off",
+                 result.app.saveButton);
+    line.addOption("--snapshot-directory DIR",
+                   "saves snapshots in DIR, which is made at the first save",
+                   result.app.snapshotDirectory, textValue);
+    line.addOption("--size WIDTHxHEIGHT", "the window's size (default: that of the main screen)",
+                   result.app.windowSize, sizeValue);
+    line.addFlag("--no-animation", "every change shows at once",
+                 [&app = result.app] { app.animation = false; });
+    line.addFlag("--plain", "no animation, and values that have changed are not tinted",
+                 [&app = result.app] { app.animation = app.tintsChanges = false; });
+    line.addLogOptions("go to the system log", result.logLevel,
+                       "copies every line of the log to standard error", result.verbose);
+    line.addExitStatus(EXIT_SUCCESS, "it was ended");
+    line.addExitStatus(EXIT_FAILURE, "there is no display or no demo service");
 }
 
 ViewerOptions parseArguments(int argc, char** argv)
 {
-    static const option options[] = {{"demo", required_argument, nullptr, 'd'},
-                                     {"snapshot-directory", required_argument, nullptr, 's'},
-                                     {"size", required_argument, nullptr, 'z'},
-                                     {"save-button", no_argument, nullptr, 'b'},
-                                     {"no-animation", no_argument, nullptr, 'n'},
-                                     {"plain", no_argument, nullptr, 'p'},
-                                     {"log-level", required_argument, nullptr, 'L'},
-                                     {"verbose", no_argument, nullptr, 'V'},
-                                     {"help", no_argument, nullptr, 'h'},
-                                     {"version", no_argument, nullptr, 'v'},
-                                     {}};
-    CommandLine line("ventrik", argc, argv);
+    CommandLine line("ventrik",
+                     "Shows what the baseband tells, as a tree of tables that is brought "
+                     "up to date every 2 s.");
     ViewerOptions result;
     result.app.snapshotDirectory = defaultDiagnosticLogDirectory();
-    for (int letter = 0; (letter = line.next(options)) != -1;) {
-        if (letter == 'd')
-            result.demoTechnology = technologyArgument(line);
-        else if (letter == 's')
-            result.app.snapshotDirectory = line.value();
-        else if (letter == 'z')
-            result.app.windowSize = sizeArgument(line);
-        else if (letter == 'b')
-            result.app.saveButton = true;
-        else if (letter == 'n')
-            result.app.animation = false;
-        else if (letter == 'p')
-            result.app.animation = result.app.tintsChanges = false;
-        else if (letter == 'L')
-            result.logLevel = line.logLevel();
-        else if (letter == 'V')
-            result.verbose = true;
-        else
-            line.tell(letter == 'h' ? usage : "ventrik " VENTRIK_VERSION "\n");
-    }
-    if (!line.arguments().empty())
-        line.refuse(fmt::format("what is '{}'?", line.arguments().front()));
+    addOptions(line, result);
+    line.parse(argc, argv);
     return result;
 }
 

@@ -24,7 +24,9 @@ class ToolUsageFixture : public ProcessFixture
     {
         const auto help = start(tool, {"--help"});
         EXPECT_EQ(help->waitForEnd(), 0);
-        EXPECT_THAT(help->output(), testing::StartsWith("usage: " + tool + " "));
+        EXPECT_THAT(help->output(), testing::StartsWith("Usage: " + tool + " "));
+        for (const std::string& line : linesOf(help->output()))
+            EXPECT_LE(line.size(), 80U) << line;
         EXPECT_THAT(help->errors(), testing::IsEmpty());
         const auto version = start(tool, {"--version"});
         EXPECT_EQ(version->waitForEnd(), 0);

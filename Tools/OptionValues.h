@@ -1,0 +1,30 @@
+#pragma once
+
+#include "Capture/CaptureTechnology.h"
+
+#include <cstdint>
+#include <stdexcept>
+#include <string>
+
+namespace ventrik
+{
+
+/// Says what is wrong with an option's value.
+struct WrongValue : std::runtime_error {
+    using std::runtime_error::runtime_error;
+};
+
+/// Values of options from their texts; WrongValue for what is none.
+std::string textValue(const std::string& text);
+std::uint32_t wholeNumberValue(const std::string& text);
+/// Finite and above 0.
+double positiveNumberValue(const std::string& text);
+std::string directoryValue(const std::string& text); ///< one that is there
+CaptureTechnology technologyValue(const std::string& text);
+int logLevelValue(const std::string& text); ///< see LogPriority
+
+/// What the help says of them, as in "a, b or c".
+std::string technologyNames();
+std::string logLevelNames(int defaultLevel);
+
+} // namespace ventrik

@@ -80,7 +80,7 @@ class HelpText : public CLI::Formatter
   private:
     static std::string row(std::string name, std::string_view text)
     {
-        constexpr std::size_t indentation = 6;
+        constexpr std::size_t indentation = 7;
         std::ostringstream line;
         CLI::detail::format_help(line, std::move(name), wrapped(text, lineWidth - indentation),
                                  indentation);

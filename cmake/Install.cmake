@@ -1,6 +1,4 @@
 # What an installation holds beside the programs, and the Debian package of it.
-include(GNUInstallDirs)
-
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/Resources/ DESTINATION ${CMAKE_INSTALL_DATADIR}/ventrik
   FILES_MATCHING PATTERN "*.plist" PATTERN "ventrik.png" PATTERN "man" EXCLUDE)
 install(FILES ${PROJECT_SOURCE_DIR}/Resources/ventrik.desktop
@@ -14,7 +12,6 @@ install(FILES ${PROJECT_SOURCE_DIR}/Resources/ventrik.png
 install(FILES ${PROJECT_SOURCE_DIR}/CHANGELOG.md DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/ventrik)
 install(FILES ${PROJECT_SOURCE_DIR}/LICENSE DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/ventrik
   RENAME copyright)
-install(DIRECTORY ${PROJECT_SOURCE_DIR}/Resources/man/ DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
 
 set(CPACK_GENERATOR DEB)
 set(CPACK_PACKAGING_INSTALL_PREFIX /usr)

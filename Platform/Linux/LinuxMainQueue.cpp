@@ -1,22 +1,19 @@
 #include "Platform/Linux/LinuxMainQueue.h"
 
+#include "Platform/TaskSchedule.h"
+
 #include <QTimer>
 
 #include <algorithm>
 #include <cstdint>
-#include <map>
 #include <utility>
 
 namespace ventrik
 {
 
-using std::chrono::steady_clock;
-
-// One Qt timer stands for the earliest task: Qt alone would not keep equal due times in order, and
+// One Qt timer stands for the first task: Qt alone would not keep equal due times in order, and
 // would round long delays.
-struct LinuxMainQueue::Core : std::enable_shared_from_this<Core> {
-    using Key = std::pair<steady_clock::time_point, std::uint64_t>; // due time, order of submission
-
+struct LinuxMainQueue::Core : TaskSchedule {
     Core()
     {
         wakeUp.setSingleShot(true);
@@ -24,21 +21,15 @@ struct LinuxMainQueue::Core : std::enable_shared_from_this<Core> {
         QObject::connect(&wakeUp, &QTimer::timeout, [this] { runDueTasks(); });
     }
 
-    Key add(steady_clock::time_point due, Task task)
-    {
-        const Key key{due, nextSequence++};
-        const auto position = tasks.emplace(key, std::move(task)).first;
-        if (position == tasks.begin())
-            arm();
-        return key;
-    }
+    Duration now() const override { return std::chrono::steady_clock::now().time_since_epoch(); }
+    void firstHasChanged() override { arm(); }
 
     void arm()
     {
-        if (tasks.empty())
+        const auto due = nextDue();
+        if (!due)
             return wakeUp.stop();
-        const auto delay = std::chrono::ceil<std::chrono::milliseconds>(tasks.begin()->first.first -
-                                                                        steady_clock::now());
+        const auto delay = std::chrono::ceil<std::chrono::milliseconds>(*due - now());
         constexpr std::int64_t longest = 24 * 60 * 60 * 1000; // what Qt counts in fits an int
         wakeUp.start(static_cast<int>(std::clamp<std::int64_t>(delay.count(), 0, longest)));
     }
@@ -48,93 +39,40 @@ struct LinuxMainQueue::Core : std::enable_shared_from_this<Core> {
     void runDueTasks()
     {
         const auto self = shared_from_this();
-        const auto now = steady_clock::now();
-        const auto end = nextSequence;
-        while (!tasks.empty() && tasks.begin()->first.first <= now &&
-               tasks.begin()->first.second < end) {
-            auto entry = tasks.extract(tasks.begin());
+        const auto time = now();
+        const auto before = end();
+        while (isDue(time, before)) {
+            const Task task = takeFirst();
             arm(); // a nested event loop within the task needs it
-            entry.mapped()();
+            task();
         }
         arm();
     }
 
     QTimer wakeUp;
-    std::uint64_t nextSequence = 0;
-    std::map<Key, Task> tasks;
-};
-
-class LinuxMainQueue::Timer : public RepeatingTimer
-{
-  public:
-    Timer(const std::shared_ptr<Core>& core, Duration interval, Task task)
-        : _state(std::make_shared<State>(State{core, interval, std::move(task), {}, true}))
-    {
-        schedule(_state, steady_clock::now() + interval);
-    }
-    ~Timer() override { Timer::stop(); }
-
-    void stop() override
-    {
-        _state->isRunning = false;
-        if (const auto core = _state->core.lock())
-            core->tasks.erase(_state->key);
-    }
-
-  private:
-    // Shared with the queued tick, so that the timer may go away while it ticks.
-    struct State {
-        std::weak_ptr<Core> core;
-        Duration interval;
-        Task task;
-        Core::Key key;
-        bool isRunning;
-    };
-
-    static void schedule(const std::shared_ptr<State>& state, steady_clock::time_point due)
-    {
-        const auto core = state->core.lock();
-        if (core == nullptr)
-            return;
-        state->key = core->add(due, [state, due] {
-            if (!state->isRunning)
-                return;
-            schedule(state, nextDue(due, state->interval));
-            state->task();
-        });
-    }
-
-    static steady_clock::time_point nextDue(steady_clock::time_point due, Duration interval)
-    {
-        const auto missed = std::max<std::int64_t>((steady_clock::now() - due) / interval, 0);
-        return due + (missed + 1) * interval;
-    }
-
-    std::shared_ptr<State> _state;
 };
 
 LinuxMainQueue::LinuxMainQueue() : _core(std::make_shared<Core>()) {}
 
 LinuxMainQueue::~LinuxMainQueue()
 {
-    // What a dropped task owns may stop timers: by then the map must not be in use any more.
-    const auto dropped = std::exchange(_core->tasks, {});
+    _core->clear();
     _core->wakeUp.stop();
 }
 
 void LinuxMainQueue::async(Task task)
 {
-    _core->add(steady_clock::now(), std::move(task));
+    _core->after(Duration{0}, std::move(task));
 }
 
 void LinuxMainQueue::after(Duration delay, Task task)
 {
-    _core->add(steady_clock::now() + std::max(delay, Duration{0}), std::move(task));
+    _core->after(delay, std::move(task));
 }
 
 std::unique_ptr<RepeatingTimer> LinuxMainQueue::repeatEvery(Duration interval, Task task)
 {
-    return std::make_unique<Timer>(_core, std::max(interval, Duration{1}), std::move(task));
+    return _core->repeatEvery(interval, std::move(task));
 }
 
 } // namespace ventrik

@@ -8,9 +8,8 @@ namespace ventrik
 {
 
 /// The main queue on Qt's event loop. Make and use it on the thread that runs the loop; timers may
-/// outlive it and are silent then. Nothing runs before its due time; a timer that was held up skips
-/// the ticks it missed. A task may destroy the queue or run a nested event loop, in which the
-/// queue goes on.
+/// outlive it and are silent then. Nothing runs before its due time. A task may destroy the queue
+/// or run a nested event loop, in which the queue goes on.
 class LinuxMainQueue : public MainQueue
 {
   public:
@@ -27,7 +26,6 @@ class LinuxMainQueue : public MainQueue
 
   private:
     struct Core;
-    class Timer;
 
     std::shared_ptr<Core> _core;
 };

@@ -20,10 +20,7 @@ class ManualMainQueue : public MainQueue
     ManualMainQueue& operator=(const ManualMainQueue&) = delete;
 
     void async(Task task) override;
-    /// A negative delay counts as 0.
     void after(Duration delay, Task task) override;
-    /// The interval is 1 ns at least: time must pass between two ticks. The next tick takes its
-    /// place in the order before the present one runs.
     [[nodiscard]] std::unique_ptr<RepeatingTimer> repeatEvery(Duration interval,
                                                               Task task) override;
 
@@ -39,7 +36,6 @@ class ManualMainQueue : public MainQueue
 
   private:
     struct Core;
-    class Timer;
 
     std::shared_ptr<Core> _core;
 };

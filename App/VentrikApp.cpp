@@ -6,7 +6,9 @@
 #include <QScreen>
 #include <QVBoxLayout>
 
+#include <algorithm>
 #include <filesystem>
+#include <iterator>
 
 namespace ventrik
 {
@@ -24,12 +26,6 @@ constexpr auto savedMessageTime = 8s;
 
 constexpr const char* firstStatus = "Connecting";
 constexpr const char* connectingStatus = "Connecting...";
-
-// Every screen of the stack is a pane.
-VentrikPaneController& paneOf(Screen& screen)
-{
-    return static_cast<VentrikPaneController&>(screen);
-}
 
 bool exists(const std::string& path)
 {
@@ -171,40 +167,36 @@ void VentrikApp::snapshotSaved(const std::string& fileName)
     });
 }
 
-void VentrikApp::updateStatusForViewController(VentrikPaneController& pane)
+void VentrikApp::updateStatusForViewController(Screen& screen)
 {
     if (_model->isConnected())
-        pane.setStatus(_updateMessage.value_or(std::string()), false);
+        screen.setStatus(_updateMessage.value_or(std::string()), false);
     else
-        pane.setStatus(connectingStatus, true);
+        screen.setStatus(connectingStatus, true);
 }
 
-bool VentrikApp::reloadPane(const std::vector<Screen*>& screens, std::size_t index)
+// From the bottom up to the first screen above the root that has nothing left to show.
+void VentrikApp::reloadScreens()
 {
-    VentrikPaneController& pane = paneOf(*screens[index]);
-    const bool isRoot = index == 0;
-    ModelNodePointer node = isRoot ? _model->topLevelNodes() : _model->nodeAtPath(pane.path());
-    if (!node && !isRoot) {
-        _navController->popTo(*screens[index - 1], true);
-        return false;
-    }
-    pane.reloadWithNode(std::move(node));
-    return true;
+    const std::vector<Screen*> screens = _navController->screens();
+    screens.front()->reload();
+    const auto gone = std::find_if_not(screens.begin() + 1, screens.end(),
+                                       [](Screen* screen) { return screen->reload(); });
+    if (gone != screens.end())
+        _navController->popTo(**std::prev(gone), true);
 }
 
 void VentrikApp::updateViewControllerFromModel()
 {
     if (!_navController)
         return;
-    const std::vector<Screen*> screens = _navController->screens();
     _hasRefreshed = true;
-    for (std::size_t i = 0; i < screens.size() && reloadPane(screens, i); ++i) {
-    }
+    reloadScreens();
     if (_model->isConnected()) {
         _lastUpdate = _platform.clock.now();
         setUpdateMessage(_dateFormatter->stringFromDate(*_lastUpdate));
     }
-    updateStatusForViewController(topPane());
+    updateStatusForViewController(_navController->topScreen());
     updateWindowTitle();
 }
 
@@ -214,21 +206,26 @@ void VentrikApp::channelChanged()
     if (!_navController)
         return;
     if (_hasRefreshed)
-        updateStatusForViewController(topPane());
+        updateStatusForViewController(_navController->topScreen());
     else
         updateTopNotes();
     updateWindowTitle();
 }
 
-VentrikPaneController& VentrikApp::topPane() const
-{
-    return paneOf(_navController->topScreen());
-}
-
 void VentrikApp::updateTopNotes()
 {
     if (_navController)
-        topPane().updateNotes();
+        _navController->topScreen().updateNotes();
+}
+
+ModelNodePointer VentrikApp::topLevelNodes()
+{
+    return _model ? _model->topLevelNodes() : nullptr;
+}
+
+ModelNodePointer VentrikApp::nodeAtPath(const std::string& path)
+{
+    return _model ? _model->nodeAtPath(path) : nullptr;
 }
 
 StatusNote VentrikApp::statusNote() const
@@ -254,13 +251,13 @@ void VentrikApp::updateWindowTitle()
     const std::string_view technology = _model->technologyName();
     add(QString::fromUtf8(technology.data(), static_cast<qsizetype>(technology.size())));
     if (_navController->screens().size() > 1)
-        add(topPane().title());
+        add(_navController->topScreen().title());
     _window->setWindowTitle(title);
 }
 
 void VentrikApp::willShowScreen(NavigationStack&, Screen& screen, bool)
 {
-    updateStatusForViewController(paneOf(screen));
+    updateStatusForViewController(screen);
     updateWindowTitle();
 }
 

@@ -29,9 +29,9 @@ struct VentrikAppOptions {
     std::optional<QSize> windowSize; ///< none: as large as the main screen
 };
 
-/// The application: builds the window, the model and the root pane, brings the panes up to date
-/// after each refresh, and undoes its one system setting at the end. Everything runs on the main
-/// queue; a QApplication exists for as long as this does.
+/// The application: builds the window, the model and the root pane, brings the screens up to
+/// date after each refresh, and undoes its one system setting at the end. Everything runs on the
+/// main queue; a QApplication exists for as long as this does.
 class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, public VentrikSaveHost
 {
   public:
@@ -52,7 +52,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     /// The status line tells for some seconds where the file is.
     void snapshotSaved(const std::string& fileName) override;
 
-    void updateStatusForViewController(VentrikPaneController& pane);
+    void updateStatusForViewController(Screen& screen);
     void updateViewControllerFromModel();
     void willShowScreen(NavigationStack& stack, Screen& screen, bool animated) override;
 
@@ -76,6 +76,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     {
         _updateMessage = std::move(message);
     }
+    /// Null also before launch and after termination.
+    ModelNodePointer topLevelNodes() override;
+    ModelNodePointer nodeAtPath(const std::string& path) override;
     bool allowSaveButton() const override { return _allowSaveButton; }
     bool tintsChanges() const override { return _options.tintsChanges; }
     StatusNote statusNote() const override;
@@ -89,11 +92,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void showWindow();
     void startModelLater();
     void channelChanged();
-    VentrikPaneController& topPane() const;
     void updateTopNotes();
     void updateWindowTitle();
-    /// False when the pane's node is gone; the panes above are popped then, and it with them.
-    bool reloadPane(const std::vector<Screen*>& screens, std::size_t index);
+    void reloadScreens();
 
     Platform _platform;
     VentrikAppOptions _options;

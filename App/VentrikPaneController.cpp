@@ -174,6 +174,15 @@ void VentrikPaneController::setStatus(const std::string& status, bool isLoading)
     createToolbarItems();
 }
 
+bool VentrikPaneController::reload()
+{
+    ModelNodePointer node = isRoot() ? _host.topLevelNodes() : _host.nodeAtPath(_keyPath);
+    const bool isThere = isRoot() || node;
+    if (isThere)
+        reloadWithNode(std::move(node));
+    return isThere;
+}
+
 void VentrikPaneController::reloadWithNode(ModelNodePointer node)
 {
     _formerNodes = std::exchange(_nodes, std::move(node));

@@ -16,6 +16,9 @@ class VentrikPaneHost
 {
   public:
     virtual ~VentrikPaneHost() = default;
+    /// The nodes that panes show; null where there is none.
+    virtual ModelNodePointer topLevelNodes() { return nullptr; }
+    virtual ModelNodePointer nodeAtPath(const std::string&) { return nullptr; }
     virtual bool allowSaveButton() const = 0;
     virtual void showSaveView() = 0;
     /// Whether values that have changed are tinted for a moment.
@@ -36,9 +39,12 @@ class VentrikPaneController : public TableScreen
     initWithNode(VentrikPaneHost& host, ModelNodePointer node, std::string path);
 
     void createToolbarItems();
-    void setStatus(const std::string& status, bool isLoading);
+    void setStatus(const std::string& status, bool isLoading) override;
     /// Asks the host anew for what is said beside the status and on an empty pane.
-    void updateNotes();
+    void updateNotes() override;
+    /// Shows its place in the tree as that is now. The root also shows that there is no tree; a
+    /// pane whose node is gone stays as it is.
+    bool reload() override;
     /// Shows another node's children, or nothing.
     void reloadWithNode(ModelNodePointer node);
     const std::string& path() const { return _keyPath; }

@@ -17,8 +17,15 @@ void Screen::setToolbarItems(std::vector<ToolBarItem> items, bool animated)
     _toolbar->setItems(std::move(items), animated && _stack && _stack->canAnimate());
 }
 
+bool Screen::isRoot() const
+{
+    return _stack && _stack->screens().front() == this;
+}
+
 void Screen::viewWillAppear(bool) {}
 
 void Screen::viewWillDisappear(bool) {}
+
+void Screen::setStatus(const std::string&, bool) {}
 
 } // namespace ventrik

@@ -22,9 +22,37 @@ using namespace std::chrono_literals;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
+// A kind of screen of its own, which writes down what it is told.
+class Legend : public Screen
+{
+  public:
+    Legend() { setTitle("Legend"); }
+
+    bool reload() override
+    {
+        told.emplace_back("data");
+        return hasContent;
+    }
+    void setStatus(const std::string& status, bool isLoading) override
+    {
+        told.push_back(status + (isLoading ? " (loading)" : ""));
+    }
+    void updateNotes() override { told.emplace_back("notes"); }
+
+    bool hasContent = true;
+    std::vector<std::string> told;
+};
+
 class VentrikAppTest : public AppFixture
 {
   protected:
+    Legend& openLegend()
+    {
+        auto legend = std::make_unique<Legend>();
+        Legend& opened = *legend;
+        app.navController()->push(std::move(legend), false);
+        return opened;
+    }
     // Down to Cell / Details / More.
     void openAll()
     {
@@ -194,6 +222,66 @@ TEST_F(VentrikAppTest, AVanishedDrillDownPopsToTheDeepestLivingPane)
     refreshWithData();
     EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell"));
     EXPECT_EQ(statusText(topPane()), "Updated 2026-11-16 at 06:10:33");
+}
+
+TEST_F(VentrikAppTest, AScreenThatIsNoPaneIsToldOfDataStatusAndNotes)
+{
+    launchAndConnect();
+    refreshWithData();
+    Legend& legend = openLegend();
+    EXPECT_THAT(legend.told, ElementsAre("Updated 2026-11-16 at 06:10:28"));
+    EXPECT_EQ(windowTitle(), "Ventrik – LTE – Legend");
+    legend.told.clear();
+    refreshWithData();
+    EXPECT_THAT(legend.told, testing::IsSupersetOf({"data", "Updated 2026-11-16 at 06:10:28"}));
+    legend.told.clear();
+    app.snapshotSaved("file");
+    EXPECT_THAT(legend.told, ElementsAre("notes"));
+}
+
+TEST_F(VentrikAppTest, AScreenThatIsNoPaneIsToldThatTheConnectionIsLost)
+{
+    launchAndConnect();
+    refreshWithData();
+    Legend& legend = openLegend();
+    legend.told.clear();
+    loseService();
+    fake.mainQueue.advance(2s);
+    EXPECT_THAT(legend.told, testing::Contains("Connecting... (loading)"));
+}
+
+TEST_F(VentrikAppTest, AScreenThatIsNoPaneStaysWhileItHasSomethingToShow)
+{
+    launchAndConnect();
+    refreshWithData();
+    openRow(0);
+    Legend& legend = openLegend();
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell", "Legend"));
+    legend.hasContent = false;
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik", "Cell"));
+}
+
+TEST_F(VentrikAppTest, AScreenThatIsNoPaneTakesThoseAboveAlong)
+{
+    launchAndConnect();
+    refreshWithData();
+    Legend& legend = openLegend();
+    app.navController()->push(
+        VentrikPaneController::initWithNode(app, app.nodeAtPath("/Cell"), "/Cell"), false);
+    legend.hasContent = false;
+    refreshWithData();
+    EXPECT_THAT(titles(), ElementsAre("Ventrik"));
+}
+
+TEST_F(VentrikAppTest, AScreenThatTakesNothingUpMayStandOnTheStack)
+{
+    launchAndConnect();
+    app.navController()->push(std::make_unique<Screen>(), false);
+    refreshWithData();
+    fake.mainQueue.advance(2s);
+    EXPECT_EQ(app.navController()->screens().size(), 2U);
 }
 
 TEST_F(VentrikAppTest, ADrillDownThatIsStillThereStays)

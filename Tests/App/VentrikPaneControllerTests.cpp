@@ -32,6 +32,12 @@ ModelNodePointer inner(std::string name, VentrikModelNode::Children children = {
 class PaneTest : public testing::Test, public VentrikPaneHost
 {
   protected:
+    ModelNodePointer topLevelNodes() override { return topLevel; }
+    ModelNodePointer nodeAtPath(const std::string& path) override
+    {
+        const auto node = nodes.find(path);
+        return node == nodes.end() ? nullptr : node->second;
+    }
     bool allowSaveButton() const override { return savesAllowed; }
     void showSaveView() override { ++savePresses; }
     bool tintsChanges() const override { return changesTinted; }
@@ -66,6 +72,8 @@ class PaneTest : public testing::Test, public VentrikPaneHost
         return *dynamic_cast<QLabel*>(pane.toolbar().items().at(1));
     }
 
+    ModelNodePointer topLevel;
+    std::map<std::string, ModelNodePointer> nodes;
     bool savesAllowed = false;
     bool changesTinted = true;
     int savePresses = 0;
@@ -91,6 +99,35 @@ TEST_F(PaneTest, WithoutANodeThePaneSaysWhyThereIsNoData)
     noData = "No data yet";
     root->updateNotes();
     EXPECT_EQ(top().table().placeholder(), "No data yet");
+}
+
+TEST_F(PaneTest, TheRootReloadsTheWholeTreeAlsoWhenThereIsNone)
+{
+    open(inner("Ventrik", {leaf("A", "1")}));
+    topLevel = inner("Ventrik", {leaf("A", "1"), leaf("B", "2")});
+    EXPECT_TRUE(root->reload());
+    EXPECT_EQ(root->rowsInSection(0), 2);
+    topLevel = nullptr;
+    EXPECT_TRUE(root->reload());
+    EXPECT_EQ(root->rowsInSection(0), 0);
+}
+
+TEST_F(PaneTest, APaneReloadsTheNodeAtItsPath)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("A", "1")})}));
+    click(0);
+    nodes["/Cell"] = inner("Cell", {leaf("A", "1"), leaf("B", "2")});
+    EXPECT_TRUE(top().reload());
+    EXPECT_EQ(top().rowsInSection(0), 2);
+}
+
+TEST_F(PaneTest, APaneWhoseNodeIsGoneSaysSoAndStaysAsItIs)
+{
+    open(inner("Ventrik", {inner("Cell", {leaf("A", "1")})}));
+    click(0);
+    EXPECT_FALSE(top().reload());
+    EXPECT_EQ(title(), "Cell");
+    EXPECT_EQ(top().rowsInSection(0), 1);
 }
 
 TEST_F(PaneTest, AnEmptyListSaysThatItIs)

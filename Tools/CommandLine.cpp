@@ -65,10 +65,10 @@ class HelpText : public CLI::Formatter
             row("141", "the reader of what it prints has gone");
         return CLI::detail::find_and_replace(text, "\n\n\n", "\n\n");
     }
-    std::string make_usage(const CLI::App*, std::string name) const override
+    std::string make_usage(const CLI::App* app, std::string name) const override
     {
         std::string text;
-        for (const std::string& form : _forms)
+        for (const std::string& form : _forms.empty() ? usualForm(*app) : _forms)
             text += fmt::format("{} {} {}\n", text.empty() ? "Usage:" : "  or: ", name, form);
         return text;
     }
@@ -78,6 +78,14 @@ class HelpText : public CLI::Formatter
     }
 
   private:
+    static std::vector<std::string> usualForm(const CLI::App& app)
+    {
+        std::string form = "[OPTION]...";
+        for (const CLI::Option* option : app.get_options())
+            if (option->get_positional())
+                form += " " + option->get_name(true);
+        return {form};
+    }
     static std::string row(std::string name, std::string_view text)
     {
         constexpr std::size_t indentation = 7;
@@ -166,6 +174,7 @@ struct CommandLine::Parser {
             ->group(group)
             ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
     }
+
     CLI::App app;
     std::shared_ptr<HelpText> help = std::make_shared<HelpText>();
     std::string group = "Options";
@@ -236,7 +245,8 @@ void CommandLine::parse(int argc, char** argv)
     app.set_help_flag("--help", "tells the options");
     app.set_version_flag("--version", program + " " VENTRIK_VERSION, "tells the version");
     try {
-        auto arguments = separated(app, std::span(argv, static_cast<std::size_t>(argc)).subspan(1));
+        // A program may be started without even its own name.
+        auto arguments = separated(app, std::span(argv + std::min(argc, 1), argv + argc));
         std::ranges::reverse(arguments); // the library takes them from the end
         app.parse(arguments);
     } catch (const CLI::CallForHelp&) {

@@ -24,8 +24,8 @@ class CommandLine
     CommandLine(const CommandLine&) = delete;
     CommandLine& operator=(const CommandLine&) = delete;
 
-    /// What usage shows behind the program's name, where "[OPTION]..." and the argument are not
-    /// all; again for another way to use it.
+    /// What usage shows behind the program's name, once for each way to use it; where there is
+    /// none, "[OPTION]..." and the argument.
     void addUsage(std::string_view form);
     /// The help's heading for what is declared from then on; "Options" before.
     void beginGroup(std::string heading);

@@ -29,7 +29,6 @@ DecodeFormat formatValue(const std::string& text)
 
 void addOptions(CommandLine& line, DecodeOptions& result)
 {
-    line.addUsage("[OPTION]... CAPTURE");
     line.addArgument("CAPTURE", "a pcap file; - for standard input", result.capture);
     line.addOption("--technology NAME",
                    technologyNames() + "; needed where the capture does not tell",

@@ -28,7 +28,6 @@ WatchOptions parseArguments(int argc, char** argv)
     CommandLine line("ventrik-watch", "The viewer for a terminal: prints the display tree each "
                                       "time something new has arrived.");
     WatchOptions result;
-    line.addUsage("[OPTION]...");
     line.addFlag("--once", "ends after the first tree", result.once);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);

@@ -55,7 +55,6 @@ QSize sizeValue(const std::string& value)
 
 void addOptions(CommandLine& line, ViewerOptions& result)
 {
-    line.addUsage("[OPTION]...");
     line.addOption("--demo TECHNOLOGY", "brings its own telephony service: " + technologyNames(),
                    result.demoTechnology,
                    [](const std::string& text) { return technologyValue(text).name; });

@@ -20,11 +20,11 @@ class ToolUsageFixture : public ProcessFixture
                 << testing::PrintToString(arguments);
         }
     }
-    void expectHelpAndVersion(const std::string& tool)
+    void expectHelpAndVersion(const std::string& tool, const std::string& usage)
     {
         const auto help = start(tool, {"--help"});
         EXPECT_EQ(help->waitForEnd(), 0);
-        EXPECT_THAT(help->output(), testing::StartsWith("Usage: " + tool + " "));
+        EXPECT_THAT(help->output(), testing::StartsWith("Usage: " + tool + " " + usage + "\n"));
         for (const std::string& line : linesOf(help->output()))
             EXPECT_LE(line.size(), 80U) << line;
         EXPECT_THAT(help->errors(), testing::IsEmpty());

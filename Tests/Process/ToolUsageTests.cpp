@@ -46,17 +46,17 @@ TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
 
 TEST_F(ToolUsage, TelephonyTellsItsUsageAndVersion)
 {
-    expectHelpAndVersion("ventrik-telephony");
+    expectHelpAndVersion("ventrik-telephony", "--technology NAME [OPTION]...");
 }
 
 TEST_F(ToolUsage, WatchTellsItsUsageAndVersion)
 {
-    expectHelpAndVersion("ventrik-watch");
+    expectHelpAndVersion("ventrik-watch", "[OPTION]...");
 }
 
 TEST_F(ToolUsage, DecodeTellsItsUsageAndVersion)
 {
-    expectHelpAndVersion("ventrik-decode");
+    expectHelpAndVersion("ventrik-decode", "[OPTION]... CAPTURE");
 }
 
 } // namespace ventrik

@@ -295,7 +295,7 @@ TEST_F(WindowProcess, RefusesWhatIsWrong)
 
 TEST_F(WindowProcess, TellsItsUsageAndVersion)
 {
-    expectHelpAndVersion("ventrik");
+    expectHelpAndVersion("ventrik", "[OPTION]...");
 }
 
 TEST_F(WindowProcess, ExportsItsTwoFunctions)

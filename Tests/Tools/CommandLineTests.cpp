@@ -20,7 +20,6 @@ class CommandLineTest : public testing::Test
     void parse(std::vector<std::string> arguments)
     {
         CommandLine line("tool", "Does what a tool does.");
-        line.addUsage("[OPTION]... FILE");
         line.addArgument("FILE", "what it reads", file);
         line.addOption("--count N", "so many of them", count, wholeNumberValue);
         line.addOption("--name TEXT", "its name", name, textValue);
@@ -118,6 +117,15 @@ TEST_F(CommandLineTest, NamesAnArgumentThatNobodyTakes)
 TEST_F(CommandLineTest, RefusesAnArgumentThatIsMissing)
 {
     expectRefused({}, "FILE is required");
+}
+
+TEST_F(CommandLineTest, LeavesAProgramWithoutItsNameToItsDefaults)
+{
+    CommandLine line("tool", "Does what a tool does.");
+    line.addFlag("--once", "ends after the first", once);
+    char* none = nullptr;
+    line.parse(0, &none);
+    EXPECT_FALSE(once);
 }
 
 TEST_F(CommandLineTest, RefusesAnOptionWithoutItsValueAndAFlagWithOne)

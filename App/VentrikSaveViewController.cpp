@@ -5,7 +5,7 @@
 #include "App/Toolkit/NavigationStack.h"
 #include "Capture/SnapshotFile.h"
 #include "Files/PrivateFile.h"
-#include "LogGenerator/DateText.h"
+#include "LogGenerator/Core/DateText.h"
 
 #include <ui_VentrikSaveViewController.h>
 

@@ -1,4 +1,4 @@
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/LinuxSystemLog.h"
@@ -22,7 +22,7 @@ class FilteredLog : public SystemLog
     void write(int, std::string_view) override {}
 };
 
-std::vector<Bytes> scenarioMessages(const CaptureTechnology& technology, std::size_t count)
+std::vector<Bytes> scenarioMessages(const Technology& technology, std::size_t count)
 {
     const auto scenario = makeScenario(technology, 1);
     std::vector<Bytes> messages;
@@ -33,7 +33,7 @@ std::vector<Bytes> scenarioMessages(const CaptureTechnology& technology, std::si
 
 void decodeScenario(benchmark::State& benchmarkState, const char* technologyName)
 {
-    const CaptureTechnology technology = *technologyNamed(technologyName);
+    const Technology technology = *technologyNamed(technologyName);
     const std::vector<Bytes> messages = scenarioMessages(technology, 2000);
     FilteredLog log;
     const LinuxResources resources(LinuxResources::defaultDirectories(), "1.0");

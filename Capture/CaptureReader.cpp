@@ -36,7 +36,7 @@ std::optional<CaptureReader> CaptureReader::open(const std::string& path, std::s
     return CaptureReader(handle, name);
 }
 
-std::optional<CaptureTechnology> CaptureReader::technology() const
+std::optional<Technology> CaptureReader::technology() const
 {
     return technologyOfLinkType(linkType());
 }

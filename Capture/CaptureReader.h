@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 #include "Platform/Clock.h"
 #include "PropertyList/PlistValue.h"
 
@@ -27,7 +27,7 @@ class CaptureReader
     static std::optional<CaptureReader> open(const std::string& path, std::string& error);
 
     /// None when the link type names no technology.
-    std::optional<CaptureTechnology> technology() const;
+    std::optional<Technology> technology() const;
     int linkType() const;
 
     /// The next message; none at the end of the capture and at damage.

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 #include "Files/PrivateFile.h"
 #include "Platform/Clock.h"
 #include "PropertyList/PlistValue.h"
@@ -26,7 +26,7 @@ class CaptureWriter
     /// Begins a file that takes its name, and the place of what has it, at `commit`. On failure
     /// `error` says why in one line.
     static std::optional<CaptureWriter>
-    create(const std::string& path, const CaptureTechnology& technology, std::string& error);
+    create(const std::string& path, const Technology& technology, std::string& error);
 
     /// False, with nothing written, for a message above `maximumMessageSize`; false also when the
     /// file cannot be written, which `commit` explains.

@@ -1,6 +1,6 @@
 #include "Model/VentrikModel.h"
 
-#include "Platform/TelephonyConstants.h"
+#include "Platform/Technology.h"
 #include "Platform/TelephonyProtocol.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
@@ -207,8 +207,8 @@ void VentrikModel::configureGenerator()
     setFault(ChannelFault::NoTechnology);
     _logGenerator =
         _makeGenerator(*technology, {_platform.log, _platform.resources, _platform.clock});
-    if (_logGenerator)
-        _technologyName = LogGenerator::technologyName(*technology);
+    if (const auto known = technologyOfIdentifier(*technology); known && _logGenerator)
+        _technologyName = known->displayName;
     _platform.log.error("Got log generated: {}", fmt::ptr(_logGenerator.get()));
 }
 

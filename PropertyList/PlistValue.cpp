@@ -302,9 +302,16 @@ std::optional<PlistDictionary> WeakContainer::dictionary() const
     return storage ? std::optional(PlistDictionary(std::move(storage))) : std::nullopt;
 }
 
-bool WeakContainer::refersTo(const PlistDictionary& dictionary) const
+bool WeakContainer::refersTo(const PlistValue& container) const
 {
-    return _dictionary.lock() == dictionary._storage;
+    // Whoever owns the same thing is neither before nor behind it.
+    const auto isSame = [](const auto& weak, const auto& owner) {
+        return !weak.owner_before(owner) && !owner.owner_before(weak);
+    };
+    if (const PlistArray* values = container.array())
+        return isSame(_array, values->_values);
+    const PlistDictionary* entries = container.dictionary();
+    return entries && isSame(_dictionary, entries->_storage);
 }
 
 } // namespace ventrik

@@ -202,7 +202,7 @@ class WeakContainer
     /// The container, while somebody still owns it.
     std::optional<PlistArray> array() const;
     std::optional<PlistDictionary> dictionary() const;
-    bool refersTo(const PlistDictionary& dictionary) const;
+    bool refersTo(const PlistValue& container) const;
 
   private:
     std::weak_ptr<PlistArray::Storage> _array;

@@ -18,8 +18,7 @@ constexpr Clock::TimePoint captureStart =
 } // namespace
 
 bool writeScenarioCapture(MessageSource& source, std::uint64_t messageCount,
-                          const CaptureTechnology& technology, const std::string& path,
-                          std::string& error)
+                          const Technology& technology, const std::string& path, std::string& error)
 {
     auto writer = CaptureWriter::create(path, technology, error);
     if (!writer)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 #include "TelephonyService/MessageSource.h"
 
 #include <cstdint>
@@ -10,7 +10,7 @@ namespace ventrik
 {
 
 /// The built-in scenario of a technology; none where there is no such scenario.
-std::unique_ptr<MessageSource> makeScenario(const CaptureTechnology& technology,
+std::unique_ptr<MessageSource> makeScenario(const Technology& technology,
                                             std::uint32_t seed);
 
 } // namespace ventrik

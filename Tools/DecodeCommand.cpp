@@ -1,8 +1,8 @@
 #include "Tools/DecodeCommand.h"
 
 #include "Capture/SnapshotFile.h"
-#include "LogGenerator/AssertionFailure.h"
-#include "LogGenerator/DateText.h"
+#include "LogGenerator/Core/AssertionFailure.h"
+#include "LogGenerator/Core/DateText.h"
 #include "Model/TreePrinter.h"
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxResources.h"
@@ -71,7 +71,7 @@ class Decoding
 {
   public:
     Decoding(const DecodeOptions& options, CaptureReader& reader, LogGenerator& generator,
-             CaptureClock& clock, const CaptureTechnology& technology, std::FILE* output)
+             CaptureClock& clock, const Technology& technology, std::FILE* output)
         : _options(options),
           _reader(reader),
           _clock(clock),
@@ -212,7 +212,7 @@ class Decoding
     const DecodeOptions& _options;
     CaptureReader& _reader;
     CaptureClock& _clock;
-    CaptureTechnology _technology;
+    Technology _technology;
     std::FILE* _output;
     int _outputError = 0;
     OfflineDecoder _decoder;
@@ -221,7 +221,7 @@ class Decoding
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
 
-std::optional<CaptureTechnology> chooseTechnology(const DecodeOptions& options,
+std::optional<Technology> chooseTechnology(const DecodeOptions& options,
                                                   const CaptureReader& reader)
 {
     const auto technology = options.technology ? options.technology : reader.technology();

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 #include "Platform/SystemLog.h"
 
 #include <cstdio>
@@ -15,7 +15,7 @@ enum class DecodeFormat { Text, Json, JsonLines };
 
 struct DecodeOptions {
     std::string capture; ///< a file, or "-" for standard input
-    std::optional<CaptureTechnology> technology;
+    std::optional<Technology> technology;
     DecodeFormat format = DecodeFormat::Text;
     std::optional<std::string> systemLogFile;
     std::optional<std::string> snapshotFile;

@@ -1,7 +1,8 @@
 #pragma once
 
 #include "Capture/CaptureReader.h"
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
+#include "LogGenerator/Core/StateKeys.h"
 
 #include <memory>
 #include <optional>
@@ -42,7 +43,7 @@ class OfflineDecoder
     void finish();
 
     /// The display as it stands; null while the generator has none.
-    const PlistValue* display() const { return _state.find("Display"); }
+    const PlistValue* display() const { return _state.find(StateKey::display); }
     std::string displayFault() const { return _generator.displayFault(); }
     PlistValue saveContents() const { return _generator.getSaveContentsFromState(_state); }
 

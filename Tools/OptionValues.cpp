@@ -70,7 +70,7 @@ std::string directoryValue(const std::string& text)
     return text;
 }
 
-CaptureTechnology technologyValue(const std::string& text)
+Technology technologyValue(const std::string& text)
 {
     const auto technology = technologyNamed(text);
     if (!technology)
@@ -89,7 +89,7 @@ int logLevelValue(const std::string& text)
 std::string technologyNames()
 {
     std::vector<std::string> names;
-    for (const CaptureTechnology& technology : captureTechnologies())
+    for (const Technology& technology : technologies())
         names.emplace_back(technology.name);
     return alternatives(std::move(names));
 }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 
 #include <cstdint>
 #include <stdexcept>
@@ -20,7 +20,7 @@ std::uint32_t wholeNumberValue(const std::string& text);
 /// Finite and above 0.
 double positiveNumberValue(const std::string& text);
 std::string directoryValue(const std::string& text); ///< one that is there
-CaptureTechnology technologyValue(const std::string& text);
+Technology technologyValue(const std::string& text);
 int logLevelValue(const std::string& text); ///< see LogPriority
 
 /// What the help says of them, as in "a, b or c".

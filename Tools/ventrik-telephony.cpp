@@ -20,7 +20,7 @@ namespace
 {
 
 struct ServiceOptions {
-    std::optional<CaptureTechnology> technology;
+    std::optional<Technology> technology;
     std::uint32_t seed = 1;
     std::optional<std::string> captureToWrite;
     std::uint32_t messageCount = 10000;
@@ -34,9 +34,9 @@ std::optional<double> speedValue(const std::string& text)
     return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
 }
 
-CaptureTechnology scenarioValue(const std::string& text)
+Technology scenarioValue(const std::string& text)
 {
-    const CaptureTechnology technology = technologyValue(text);
+    const Technology technology = technologyValue(text);
     if (!makeScenario(technology, 1))
         throw WrongValue(fmt::format("there is no scenario for '{}' yet", text));
     return technology;

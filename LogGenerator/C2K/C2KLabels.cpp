@@ -33,6 +33,13 @@ bool ShownPilot::operator==(const ShownPilot& other) const
            std::bit_cast<std::uint64_t>(level) == std::bit_cast<std::uint64_t>(other.level);
 }
 
+ShownPilot shownPilot(std::size_t index, const LogPacket& element, const Field& pnOffset,
+                      const Field& level)
+{
+    return {index, static_cast<std::uint16_t>(numberOf(element, pnOffset)),
+            level.shown.number(numberOf(element, level)).value_or(0)};
+}
+
 void C2KLabels::useLookup(const PlistDictionary* lookup)
 {
     if (lookup ? _lookup && _lookup->isSameContainer(*lookup) : !_lookup)

@@ -21,6 +21,10 @@ struct ShownPilot {
     bool operator==(const ShownPilot& other) const;
 };
 
+/// A pilot of a list's element, with the fields that tell its offset and its level.
+ShownPilot shownPilot(std::size_t index, const LogPacket& element, const Field& pnOffset,
+                      const Field& level);
+
 /// The labels that the template gives to each lookup key, and what they show: a value that has not
 /// changed is neither formatted nor stored again. It keeps the lookup alive that it knows.
 class C2KLabels

@@ -8,7 +8,8 @@
 #include "LogGenerator/C2K/OneXServingSystem.h"
 #include "LogGenerator/C2K/OneXStatus.h"
 #include "LogGenerator/C2K/OneXTrafficFER.h"
-#include "Packets/LogPacket.h"
+#include "LogGenerator/Core/StateKeys.h"
+#include "Packets/C2KRecords.h"
 
 #include <algorithm>
 #include <array>
@@ -22,19 +23,33 @@ namespace
 constexpr const char* templateName = "C2KTemplate";
 
 struct Decoder {
-    std::uint32_t logCode;
+    const Record* record;
     void (*decode)(const LogPacket& packet, const C2KOutput& output);
+    bool hasOneSize = false; // a longer record is none
 };
 
 // In the order of the start command.
-constexpr std::array<Decoder, 8> decoders{{{0x108A, decodeFingerC2I},
-                                           {0x1183, decodeEVDOStatus},
-                                           {0x1192, decodeForwardDataRate},
-                                           {0x12B6, decodeActiveSetPilots},
-                                           {0x119C, decodeOneXStatus},
-                                           {0x119D, decodeOneXTrafficFER},
-                                           {0x127E, decodeReverseDataRate},
-                                           {0x134F, decodeOneXServingSystem}}};
+constexpr std::array<Decoder, 8> decoders{{
+    {&C2KRecords::fingerC2I, decodeFingerC2I},
+    {&C2KRecords::evdoStatus, decodeEVDOStatus, true},
+    {&C2KRecords::forwardPackets, decodeForwardDataRate},
+    {&C2KRecords::activeSetPilots, decodeActiveSetPilots},
+    {&C2KRecords::oneXStatus, decodeOneXStatus},
+    {&C2KRecords::oneXTraffic, decodeOneXTrafficFER},
+    {&C2KRecords::reversePackets, decodeReverseDataRate},
+    {&C2KRecords::servingSystem, decodeOneXServingSystem},
+}};
+
+// A record of a wrong size is reported.
+bool hasItsSize(const LogPacket& packet, const Decoder& decoder, SystemLog& log)
+{
+    const std::size_t size = decoder.record->minimumSize;
+    if (decoder.hasOneSize ? packet.size() == size : packet.size() >= size)
+        return true;
+    log.error("Log code 0x{:04x} is {} bytes long but {} {} bytes.", decoder.record->logCode,
+              packet.size(), decoder.hasOneSize ? "should be" : "must be at least", size);
+    return false;
+}
 
 } // namespace
 
@@ -49,34 +64,34 @@ PlistDictionary C2KLogGenerator::getStartCommand() const
 {
     PlistArray logCodes;
     for (const Decoder& decoder : decoders)
-        logCodes.append(decoder.logCode);
+        logCodes.append(decoder.record->logCode);
     return {{"SetState", "Streaming"}, {"SetOrbelLogCodes", logCodes}};
 }
 
 void C2KLogGenerator::updateState(PlistDictionary& state, ByteView data)
 {
-    getDisplayFromState(state);
-    const PlistValue* found = state.find("Lookup");
-    if (!found || !found->dictionary())
-        return updateFromLog(data, nullptr, state);
-    // Held here, because the decoders change the state.
-    const PlistDictionary lookup = *found->dictionary();
-    updateFromLog(data, &lookup, state);
+    ensureDisplay(state);
+    const PlistValue* lookup = state.find(StateKey::lookup);
+    updateFromLog(data, lookup ? lookup->dictionary() : nullptr, state);
 }
 
 void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup,
                                     PlistDictionary& state)
 {
+    _labels.useLookup(lookup);
     if (data.size() < logPacketHeaderSize)
         return;
     const LogPacket packet(stripPrefix(data));
     // Another type is reported, and decoded all the same.
     if (packet.u8(0) != ordinaryPacketType)
         log().error("Invalid log type: {:x}. Dropping.", packet.u8(0));
-    const auto* decoder = std::ranges::find(decoders, effectiveLogCode(packet), &Decoder::logCode);
+    const auto* decoder =
+        std::ranges::find(decoders, effectiveLogCode(packet),
+                          [](const Decoder& known) { return known.record->logCode; });
     if (decoder == decoders.end())
         return;
-    decoder->decode(packet, C2KOutput(lookup, state, log()));
+    if (hasItsSize(packet, *decoder, log()))
+        decoder->decode(packet, C2KOutput(_labels, state, log(), decoder->record));
     keepPacket(packet.bytes());
 }
 
@@ -88,22 +103,40 @@ std::optional<PlistValue> C2KLogGenerator::generateLogUsingState(PlistDictionary
     return display;
 }
 
+std::optional<ValueOrigin> C2KLogGenerator::originOf(const PlistDictionary& state,
+                                                     std::span<const std::string_view> path) const
+{
+    const PlistValue* group = state.find(StateKey::display);
+    if (path.empty())
+        return std::nullopt;
+    for (const std::string_view key : path.first(path.size() - 1))
+        group = group && group->dictionary() ? group->dictionary()->find(key) : nullptr;
+    return group && group->dictionary() ? _labels.originOf(*group->dictionary(), path.back())
+                                        : std::nullopt;
+}
+
 std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& state)
 {
+    const PlistValue* display = ensureDisplay(state);
+    return display ? std::optional(*display) : std::nullopt;
+}
+
+const PlistValue* C2KLogGenerator::ensureDisplay(PlistDictionary& state)
+{
     claimDisplay(state, templateName);
-    if (const PlistValue* display = state.find("Display"))
-        return *display;
+    if (const PlistValue* display = state.find(StateKey::display))
+        return display;
     const auto displayTemplate =
         loadTemplate(state, templateName, "Cannot load C2K template for display");
     if (!displayTemplate)
-        return std::nullopt;
+        return nullptr;
     PlistDictionary display;
     PlistDictionary lookup;
     processTemplate(*displayTemplate->dictionary(), display, lookup, log());
-    state.set("Display", display);
-    state.set("Lookup", lookup);
-    state.set("ExtraInfo", PlistDictionary());
-    return display;
+    state.set(StateKey::display, display);
+    state.set(StateKey::lookup, lookup);
+    state.set(StateKey::extraInfo, PlistDictionary());
+    return state.find(StateKey::display);
 }
 
 void C2KLogGenerator::processTemplate(const PlistDictionary& displayTemplate,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/C2K/C2KLabels.h"
 #include "LogGenerator/Orbel/OrbelLogGenerator.h"
 
 namespace ventrik
@@ -20,6 +21,9 @@ class C2KLogGenerator : public OrbelLogGenerator
     std::optional<PlistValue> generateLogUsingState(PlistDictionary& state) override;
     PlistDictionary getStartCommand() const override;
 
+    std::optional<ValueOrigin> originOf(const PlistDictionary& state,
+                                        std::span<const std::string_view> path) const override;
+
     /// Fills the display with the template's groups and empty values, and the lookup with an array
     /// of entries for each lookup key: the label, and the group of the display that holds it.
     static void processTemplate(const PlistDictionary& displayTemplate, PlistDictionary& display,
@@ -31,6 +35,11 @@ class C2KLogGenerator : public OrbelLogGenerator
 
   private:
     using OrbelLogGenerator::OrbelLogGenerator;
+
+    /// The display in the state, built on first use; null when the template cannot be loaded.
+    const PlistValue* ensureDisplay(PlistDictionary& state);
+
+    C2KLabels _labels;
 };
 
 } // namespace ventrik

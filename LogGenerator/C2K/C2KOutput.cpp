@@ -1,6 +1,6 @@
 #include "LogGenerator/C2K/C2KOutput.h"
 
-#include "LogGenerator/StateKeys.h"
+#include "LogGenerator/Core/StateKeys.h"
 
 namespace ventrik
 {

@@ -1,6 +1,8 @@
 #include "LogGenerator/C2K/DataRates.h"
 
 #include "LogGenerator/C2K/C2KOutput.h"
+#include "LogGenerator/Core/StateKeys.h"
+#include "Packets/C2KRecords.h"
 #include "Packets/LogPacket.h"
 
 #include <array>
@@ -12,15 +14,15 @@ namespace
 {
 
 // Bits in a packet of each counted kind; 0 for kinds that do not count.
-constexpr std::array<std::int64_t, 56> forwardBits{
+constexpr std::array<std::int64_t, C2KRecords::forwardKindCount> forwardBits{
     128,  256,  512, 1024, 0,    128,  256,  512,  1024, 0,    128,  256,  512,  1024,
     0,    128,  256, 512,  1024, 0,    128,  256,  512,  1024, 0,    512,  1024, 2048,
     0,    128,  256, 512,  1024, 0,    512,  1024, 2048, 0,    1024, 3072, 0,    512,
     1024, 2048, 0,   4096, 0,    1024, 3072, 0,    4096, 0,    5120, 0,    5120, 0};
 
 // Bits in a packet of each payload size.
-constexpr std::array<std::int64_t, 12> reverseBits{128,  256,  512,  768,  1024, 1536,
-                                                   2048, 3072, 4096, 6144, 8192, 12288};
+constexpr std::array<std::int64_t, C2KRecords::payloadSizeCount> reverseBits{
+    128, 256, 512, 768, 1024, 1536, 2048, 3072, 4096, 6144, 8192, 12288};
 
 /// Where a direction keeps its last record, and where its rate is shown.
 struct Direction {
@@ -34,10 +36,12 @@ struct Direction {
     std::string_view sent2Key;
 };
 
-constexpr Direction forward{"kFLDataRate", "FLDataSeqNum",  "FLDataSent", "FLDataSeqNum1",
-                            "FLDataSent1", "FLDataSeqNum2", "FLDataSent2"};
-constexpr Direction reverse{"kRLDataRate", "RLDataSeqNum",  "RLDataSent", "RLDataSeqNum1",
-                            "RLDataSent1", "RLDataSeqNum2", "RLDataSent2"};
+constexpr Direction forward{
+    "kFLDataRate", StateKey::forwardSequence, StateKey::forwardSent, "FLDataSeqNum1",
+    "FLDataSent1", "FLDataSeqNum2",           "FLDataSent2"};
+constexpr Direction reverse{
+    "kRLDataRate", StateKey::reverseSequence, StateKey::reverseSent, "RLDataSeqNum1",
+    "RLDataSent1", "RLDataSeqNum2",           "RLDataSent2"};
 
 const PlistInteger* keptNumber(const PlistDictionary& state, std::string_view key)
 {
@@ -69,42 +73,35 @@ void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t
     output.keepExtra(direction.sent1Key, sent);
 }
 
-} // namespace
-
-// EV-DO forward-link packets, 0x1192, at least 241 bytes
-//   13 u32 sequence number | 17 56 counters, u32 each
-void decodeForwardDataRate(const LogPacket& packet, const C2KOutput& output)
+std::uint32_t sequenceNumber(const LogPacket& packet, const Field& field)
 {
-    constexpr std::size_t minimumSize = 241;
-    if (packet.size() < minimumSize) {
-        output.log().error("Log code 0x1192 is {} bytes long but must be at least {} bytes.",
-                           packet.size(), minimumSize);
-        return;
-    }
-    std::int64_t sent = 0;
-    for (std::size_t kind = 0; kind < forwardBits.size(); ++kind)
-        sent += packet.u32(17 + 4 * kind) * forwardBits.at(kind);
-    updateRate(forward, packet.u32(13), sent, output);
+    return static_cast<std::uint32_t>(numberOf(packet, field));
 }
 
-// EV-DO reverse-link packets, 0x127E, at least 1750 bytes
-//   14 u32 sequence number | 18 three blocks of 576 bytes, each of two halves of 288: for each of
-//   12 payload sizes 24 bytes, of which the first 16 are four u32 counters
+} // namespace
+
+void decodeForwardDataRate(const LogPacket& packet, const C2KOutput& output)
+{
+    constexpr const Field& counter = C2KRecords::packetCounterFields.front();
+    std::int64_t sent = 0;
+    for (std::size_t kind = 0; kind < forwardBits.size(); ++kind)
+        sent += numberOf(C2KRecords::forwardCounters.element(packet, kind), counter) *
+                forwardBits.at(kind);
+    updateRate(forward, sequenceNumber(packet, C2KRecords::forwardPacketsUnshown.front()), sent,
+               output);
+}
+
 void decodeReverseDataRate(const LogPacket& packet, const C2KOutput& output)
 {
-    constexpr std::size_t minimumSize = 1750;
-    if (packet.size() < minimumSize) {
-        output.log().error("Log code 0x127e is {} bytes long but must be at least {} bytes.",
-                           packet.size(), minimumSize);
-        return;
-    }
+    const RecordElements& sizes = C2KRecords::reverseCounters;
     std::int64_t sent = 0;
-    for (std::size_t half = 0; half < 6; ++half)
-        for (std::size_t rate = 0; rate < reverseBits.size(); ++rate)
-            for (std::size_t counter = 0; counter < 4; ++counter)
-                sent +=
-                    packet.u32(18 + 288 * half + 24 * rate + 4 * counter) * reverseBits.at(rate);
-    updateRate(reverse, packet.u32(14), sent, output);
+    for (std::size_t i = 0; i < sizes.count; ++i) {
+        const LogPacket counters = sizes.element(packet, i);
+        for (const Field& counter : C2KRecords::payloadCounterFields)
+            sent += numberOf(counters, counter) * reverseBits.at(i % reverseBits.size());
+    }
+    updateRate(reverse, sequenceNumber(packet, C2KRecords::reversePacketsUnshown.front()), sent,
+               output);
 }
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 
-#include "LogGenerator/AssertionFailure.h"
+#include "LogGenerator/Core/AssertionFailure.h"
+#include "LogGenerator/Core/StateKeys.h"
 #include "PropertyList/PropertyListReader.h"
 
 #include <cstdio>
@@ -78,16 +79,16 @@ void GSMLogGenerator::takeMessage(PlistDictionary& state, ByteView data)
         failAssertion("Could not deserialize the object", notDeserializedLine, log());
     const PlistValue display = processObject(*reading.value, log());
     claimDisplay(state, displayOwner);
-    state.set("DisplayState", *reading.value);
-    state.set("Display", display);
-    state.set("ExtraInfo", PlistDictionary());
+    state.set(StateKey::displayState, *reading.value);
+    state.set(StateKey::display, display);
+    state.set(StateKey::extraInfo, PlistDictionary());
 }
 
 std::optional<PlistValue> GSMLogGenerator::generateLogUsingState(PlistDictionary& state)
 {
     claimDisplay(state, displayOwner);
     recordDisplay(state);
-    const PlistValue* display = state.find("Display");
+    const PlistValue* display = state.find(StateKey::display);
     return display ? std::optional(*display) : std::nullopt;
 }
 
@@ -98,7 +99,7 @@ PlistDictionary GSMLogGenerator::getStartCommand() const
 
 PlistValue GSMLogGenerator::getSaveContentsFromState(const PlistDictionary& state) const
 {
-    const PlistValue* history = state.find("History");
+    const PlistValue* history = state.find(StateKey::history);
     return history && history->array() ? history->array()->copy() : PlistArray();
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
 
 namespace ventrik
 {

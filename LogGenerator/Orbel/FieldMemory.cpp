@@ -11,8 +11,8 @@ std::size_t FieldMemory::slotOf(const Field& field)
     if (_next < _slots.size() && _slots[_next].field == &field)
         return _next++;
     const auto slot = std::ranges::find(_slots, &field, &Slot::field);
-    const auto index = slot == _slots.end() ? slotOf(field.key)
-                                            : static_cast<std::size_t>(slot - _slots.begin());
+    const auto index =
+        slot == _slots.end() ? slotOf(field.key) : static_cast<std::size_t>(slot - _slots.begin());
     _next = index + 1;
     return index;
 }

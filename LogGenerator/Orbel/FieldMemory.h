@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Orbel/ValueOrigin.h"
+#include "LogGenerator/Core/ValueOrigin.h"
 
 #include <string_view>
 #include <vector>

@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/OrbelLogGenerator.h"
 
+#include "LogGenerator/Core/StateKeys.h"
 #include "LogGenerator/Orbel/BuildDate.h"
 #include "LogGenerator/Orbel/ETLDLF.h"
 #include "PropertyList/PropertyListReader.h"
@@ -36,18 +37,18 @@ void OrbelLogGenerator::storePacketsInState(PlistDictionary& state)
     if (_binData->droppedCount() > 0)
         log().error("The period's raw packets are above {} MiB: the oldest {} are dropped",
                     PeriodPackets::maximumSize >> 20, _binData->droppedCount());
-    state.set("DisplayState", _binData->take());
+    state.set(StateKey::displayState, _binData->take());
 }
 
 std::optional<PlistValue> OrbelLogGenerator::loadTemplate(PlistDictionary& state,
                                                           const std::string& name,
                                                           std::string_view failureLine)
 {
-    if (const PlistValue* loaded = state.find("Template"))
+    if (const PlistValue* loaded = state.find(StateKey::displayTemplate))
         return *loaded;
     auto loaded = _isTemplateBad ? std::nullopt : readTemplate(name);
     if (loaded)
-        state.set("Template", *loaded);
+        state.set(StateKey::displayTemplate, *loaded);
     else
         log().error("{}", failureLine);
     return loaded;
@@ -108,13 +109,13 @@ std::optional<Bytes> OrbelLogGenerator::makeVersionReport() const
 std::optional<Bytes> OrbelLogGenerator::generateDlfFromState(const PlistDictionary& state) const
 {
     auto dlf = makeVersionReport();
-    const PlistValue* history = state.find("History");
+    const PlistValue* history = state.find(StateKey::history);
     if (!dlf || !history || !history->array())
         return dlf;
 
     for (const PlistValue& entry : *history->array()) {
         const PlistDictionary* period = entry.dictionary();
-        const PlistValue* displayState = period ? period->find("DisplayState") : nullptr;
+        const PlistValue* displayState = period ? period->find(StateKey::displayState) : nullptr;
         if (!displayState)
             continue;
         const Bytes* packets = displayState->data();
@@ -133,7 +134,7 @@ std::optional<Bytes> OrbelLogGenerator::generateDlfFromState(const PlistDictiona
 
 PlistValue OrbelLogGenerator::getSaveContentsFromState(const PlistDictionary& state) const
 {
-    const PlistValue* history = state.find("History");
+    const PlistValue* history = state.find(StateKey::history);
     PlistArray contents = history && history->array() ? history->array()->copy() : PlistArray();
     if (auto dlf = generateDlfFromState(state)) {
         PlistDictionary entry;

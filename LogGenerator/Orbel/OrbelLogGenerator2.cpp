@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/OrbelLogGenerator2.h"
 
+#include "LogGenerator/Core/StateKeys.h"
 #include "LogGenerator/Orbel/UnparsableDataException.h"
 
 #include <algorithm>
@@ -7,6 +8,19 @@
 
 namespace ventrik
 {
+
+namespace
+{
+
+std::optional<std::size_t> rowNumber(std::string_view text)
+{
+    std::size_t number = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    return error == std::errc() && end == text.data() + text.size() ? std::optional(number)
+                                                                    : std::nullopt;
+}
+
+} // namespace
 
 OrbelLogGenerator2::~OrbelLogGenerator2()
 {
@@ -26,7 +40,7 @@ void OrbelLogGenerator2::initWithPListName(std::string templateName,
 void OrbelLogGenerator2::updateState(PlistDictionary& state, ByteView data)
 {
     // The display comes first, so that the sections are bound before the packet is decoded.
-    getDisplayFromState(state);
+    ensureDisplay(state);
     updateWithData(data);
     keepPacket(data);
 }
@@ -68,23 +82,52 @@ std::optional<PlistValue> OrbelLogGenerator2::generateLogUsingState(PlistDiction
 
 std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionary& state)
 {
+    const PlistValue* display = ensureDisplay(state);
+    return display ? std::optional(*display) : std::nullopt;
+}
+
+const PlistValue* OrbelLogGenerator2::ensureDisplay(PlistDictionary& state)
+{
+    const PlistValue* display = state.find(StateKey::display);
+    if (display && _boundDisplay.refersTo(*display))
+        return display;
     claimDisplay(state, pListName);
-    if (const PlistValue* display = state.find("Display")) {
+    display = state.find(StateKey::display);
+    if (display) {
         // After a restart the display of the generator before us is still in the state: values go
         // on where they stood, so our sections take over its containers.
-        const PlistValue* displayTemplate = state.find("Template");
-        if (displayTemplate && display->dictionary() &&
-            !_boundDisplay.refersTo(*display->dictionary())) {
+        const PlistValue* displayTemplate = state.find(StateKey::displayTemplate);
+        if (displayTemplate && display->dictionary()) {
             bindSections(*displayTemplate, *display);
             _boundDisplay = WeakContainer(*display);
         }
-        return *display;
+        return display;
     }
-    if (const auto display = buildDisplay(state)) {
-        printDict(*display);
-        _boundDisplay = WeakContainer(*display);
-        state.set("Display", *display);
-        state.set("ExtraInfo", PlistDictionary());
+    if (const auto built = buildDisplay(state)) {
+        printDict(*built);
+        _boundDisplay = WeakContainer(*built);
+        state.set(StateKey::display, *built);
+        state.set(StateKey::extraInfo, PlistDictionary());
+    }
+    return nullptr;
+}
+
+std::optional<ValueOrigin>
+OrbelLogGenerator2::originOf(const PlistDictionary&, std::span<const std::string_view> path) const
+{
+    for (std::size_t i = 0; cIndex && i + 1 < path.size(); ++i) {
+        const Base* section = cIndex->getClass(path[i]);
+        if (!section)
+            continue;
+        const auto rest = path.subspan(i + 1);
+        // A value; a value of one of the section's rows; one of a row under a key.
+        if (rest.size() == 1)
+            return section->originOf(rest[0]);
+        const auto row = rowNumber(rest[rest.size() - 2]);
+        if (rest.size() > 3 || !row)
+            return std::nullopt;
+        return section->originOf(rest.size() == 3 ? rest[0] : std::string_view(), *row,
+                                 rest.back());
     }
     return std::nullopt;
 }

@@ -24,6 +24,9 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     std::optional<PlistValue> generateLogUsingState(PlistDictionary& state) override;
     PlistDictionary getStartCommand() const override;
 
+    std::optional<ValueOrigin> originOf(const PlistDictionary& state,
+                                        std::span<const std::string_view> path) const override;
+
     /// Routes one packet, as it arrived, to the subscribed sections.
     void updateWithData(ByteView data);
     /// The copy of a template value, its sections bound to their containers; none when it holds a
@@ -41,6 +44,8 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
 
   private:
     static void deliver(const LogPacket& packet, std::uint32_t logCode, Base& section);
+    /// The display in the state; null in the call that builds it, and when there is none.
+    const PlistValue* ensureDisplay(PlistDictionary& state);
     std::optional<PlistValue> buildDisplay(PlistDictionary& state);
     void bindSection(std::string_view name, const PlistValue& container);
     /// Binds the sections that the template names, and nothing that a record brought into the

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "LogGenerator/Core/ValueOrigin.h"
 #include "LogGenerator/Orbel/ArrayLock.h"
-#include "LogGenerator/Orbel/ValueOrigin.h"
 #include "PropertyList/PlistValue.h"
 
 #include <string_view>

@@ -1,4 +1,4 @@
-#include "LogGenerator/DateText.h"
+#include "LogGenerator/Core/DateText.h"
 
 #include <gtest/gtest.h>
 

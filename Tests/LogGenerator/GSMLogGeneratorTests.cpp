@@ -1,4 +1,4 @@
-#include "LogGenerator/AssertionFailure.h"
+#include "LogGenerator/Core/AssertionFailure.h"
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "Platform/TelephonyConstants.h"
 #include "PropertyList/PropertyListWriter.h"

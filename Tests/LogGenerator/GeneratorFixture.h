@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
 #include "LogGenerator/Orbel/Base.h"
 #include "Packets/PacketBuilder.h"
 #include "Tests/Support/FakePlatform.h"

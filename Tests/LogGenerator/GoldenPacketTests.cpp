@@ -1,4 +1,4 @@
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 #include "Tests/Support/ResourceFiles.h"
 

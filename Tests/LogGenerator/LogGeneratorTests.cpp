@@ -1,4 +1,4 @@
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
 #include "Platform/TelephonyConstants.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 

@@ -1,4 +1,5 @@
 // faulty-telephony MODE: a telephony service that misbehaves in the way that the mode names.
+#include "Packets/PacketBuilder.h"
 #include "Platform/Linux/LinuxMainQueue.h"
 #include "Platform/Linux/LinuxMessagePorts.h"
 #include "Platform/Linux/LinuxSystemLog.h"
@@ -7,7 +8,6 @@
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 #include "TelephonyService/LTEScenario.h"
-#include "Packets/PacketBuilder.h"
 #include "TelephonyService/TelephonyService.h"
 
 #include <QCoreApplication>

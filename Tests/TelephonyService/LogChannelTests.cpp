@@ -1,7 +1,7 @@
+#include "Packets/PacketBuilder.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 #include "TelephonyService/LogChannel.h"
-#include "Packets/PacketBuilder.h"
 #include "Tests/Support/FakePlatform.h"
 #include "Tests/TelephonyService/ListSource.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Core/LogGenerator.h"
 #include "TelephonyService/MessageSource.h"
 #include "Tests/Support/FakePlatform.h"
 

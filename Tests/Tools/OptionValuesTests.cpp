@@ -9,7 +9,7 @@ namespace ventrik
 TEST(OptionValues, NamesEveryTechnology)
 {
     const std::string names = technologyNames();
-    for (const CaptureTechnology& technology : captureTechnologies()) {
+    for (const Technology& technology : technologies()) {
         EXPECT_THAT(names, testing::HasSubstr(std::string(technology.name)));
         EXPECT_EQ(technologyValue(std::string(technology.name)).linkType, technology.linkType);
     }

@@ -1,4 +1,4 @@
-#include "Capture/CaptureTechnology.h"
+#include "Platform/Technology.h"
 
 #include <gtest/gtest.h>
 
@@ -24,7 +24,7 @@ constexpr Row rows[] = {
 
 } // namespace
 
-TEST(CaptureTechnology, LinkTypesAndNamesGiveTheTechnologies)
+TEST(Technology, LinkTypesAndNamesGiveTheTechnologies)
 {
     for (const Row& row : rows) {
         const auto byLinkType = technologyOfLinkType(row.linkType);
@@ -37,7 +37,7 @@ TEST(CaptureTechnology, LinkTypesAndNamesGiveTheTechnologies)
     }
 }
 
-TEST(CaptureTechnology, OthersGiveNone)
+TEST(Technology, OthersGiveNone)
 {
     EXPECT_FALSE(technologyOfLinkType(146));
     EXPECT_FALSE(technologyOfLinkType(152));

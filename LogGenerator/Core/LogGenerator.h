@@ -1,10 +1,12 @@
 #pragma once
 
-#include "LogGenerator/GeneratorServices.h"
+#include "LogGenerator/Core/GeneratorServices.h"
+#include "LogGenerator/Core/ValueOrigin.h"
 #include "PropertyList/PlistValue.h"
 
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -14,9 +16,7 @@ namespace ventrik
 /// Turns the log messages of one radio technology into a display object.
 ///
 /// A generator keeps what it knows in the state dictionary, which the monitor model owns and hands
-/// to every operation; only generators write it. Its keys: "History", "DisplayState", "Display",
-/// "ExtraInfo", "Template", "Lookup", and "DisplayOwner", which names the template or the kind of
-/// generator that made the display.
+/// to every operation; only generators write it. Its keys stand in StateKeys.h.
 ///
 /// Construction is silent; each concrete class's `generator` runs its `init`, a member because its
 /// log lines belong in the middle of the subclass's own.
@@ -38,12 +38,14 @@ class LogGenerator
     /// One line that says why there is no display; empty when nothing is in the way of one.
     virtual std::string displayFault() const { return {}; }
 
+    /// Where the value at a path of the display's keys and row numbers comes from; none where no
+    /// field of a record shows there.
+    virtual std::optional<ValueOrigin> originOf(const PlistDictionary& state,
+                                                std::span<const std::string_view> path) const;
+
     /// A new generator for the service's technology identifier, or none if it is unknown.
     static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,
                                                                  const GeneratorServices& services);
-
-    /// The technology of that identifier as people call it; empty if it is unknown.
-    static std::string_view technologyName(const PlistValue& technology);
 
     /// Records the state's display in its history, which never holds more than 5 entries.
     static void updateHistoryInState(PlistDictionary& state, const Clock& clock);

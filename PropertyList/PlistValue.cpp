@@ -15,6 +15,9 @@ namespace
 // Up to this many keys a walk over the entries is faster than a hash.
 constexpr std::size_t linearSearchLimit = 16;
 
+// Few containers hold less; growing from one by doubling would move the first elements twice.
+constexpr std::size_t firstCapacity = 4;
+
 struct KeyHash {
     using is_transparent = void;
     std::size_t operator()(std::string_view key) const
@@ -59,6 +62,8 @@ const PlistValue* PlistArray::end() const
 
 void PlistArray::append(PlistValue value)
 {
+    if (_values->capacity() == 0)
+        _values->reserve(firstCapacity);
     _values->push_back(std::move(value));
 }
 
@@ -182,6 +187,8 @@ void PlistDictionary::set(std::string_view key, PlistValue value)
     }
     auto& entries = _storage->entries;
     auto& places = _storage->places;
+    if (entries.capacity() == 0)
+        entries.reserve(firstCapacity);
     entries.push_back({std::string(key), std::move(value)});
     if (!places.empty())
         places.emplace(key, entries.size() - 1);

@@ -22,6 +22,35 @@ constexpr bool isXmlCharacter(char32_t code)
            (code >= 0x10000 && code <= 0x10ffff);
 }
 
+// ASCII that XML can carry. Written without branches, so that the compiler looks at a whole chunk
+// at once.
+constexpr bool isPlain(char character)
+{
+    const auto code = static_cast<unsigned char>(character);
+    return (code < 0x80) & ((code >= 0x20) | (code == '\t') | (code == '\n') | (code == '\r'));
+}
+
+constexpr std::size_t chunkLength = 16;
+
+bool isPlainChunk(std::string_view text)
+{
+    unsigned char isOther = 0;
+    for (std::size_t i = 0; i < chunkLength; ++i)
+        isOther |= !isPlain(text[i]);
+    return isOther == 0;
+}
+
+// Where the run of plain characters that starts at the place ends. Nearly every text is one, and
+// its characters need not be decoded.
+std::size_t endOfPlainRun(std::string_view text, std::size_t place)
+{
+    while (place + chunkLength <= text.size() && isPlainChunk(text.substr(place)))
+        place += chunkLength;
+    while (place < text.size() && isPlain(text[place]))
+        ++place;
+    return place;
+}
+
 struct NamedCharacter {
     std::string_view name;
     char character;
@@ -78,19 +107,22 @@ std::string_view escapeOf(char character)
 
 bool isAllXmlSpace(std::string_view text)
 {
-    return text.find_first_not_of(xmlSpaces) == std::string_view::npos;
+    return std::all_of(text.begin(), text.end(), isXmlSpace);
 }
 
 std::string_view trimXmlSpace(std::string_view text)
 {
-    const std::size_t first = std::min(text.find_first_not_of(xmlSpaces), text.size());
-    text.remove_prefix(first);
-    return text.substr(0, text.find_last_not_of(xmlSpaces) + 1);
+    while (!text.empty() && isXmlSpace(text.front()))
+        text.remove_prefix(1);
+    while (!text.empty() && isXmlSpace(text.back()))
+        text.remove_suffix(1);
+    return text;
 }
 
 std::optional<std::string> xmlTextProblem(std::string_view text)
 {
-    for (std::size_t place = 0; place < text.size();) {
+    for (std::size_t place = endOfPlainRun(text, 0); place < text.size();
+         place = endOfPlainRun(text, place)) {
         const Utf8Character character = decodeUtf8(text.substr(place));
         if (character.length == 0)
             return fmt::format("byte {} is not UTF-8", place);

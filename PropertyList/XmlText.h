@@ -8,11 +8,9 @@
 namespace ventrik
 {
 
-inline constexpr std::string_view xmlSpaces = " \t\r\n";
-
 constexpr bool isXmlSpace(char character)
 {
-    return xmlSpaces.find(character) != std::string_view::npos;
+    return character == ' ' || character == '\t' || character == '\r' || character == '\n';
 }
 
 bool isAllXmlSpace(std::string_view text);

@@ -125,6 +125,18 @@ TEST(XmlReaderDamage, MarkupMustBeClosed)
     expectError("</plist>", "at byte");
 }
 
+TEST(XmlReaderDamage, ACharacterIsFoundWhereverItStands)
+{
+    for (std::size_t place = 0; place < 70; ++place) {
+        std::string text(70, 'a');
+        text[place] = '\x1f';
+        expectError("<string>" + text + "</string>", "U+001F at byte " + std::to_string(8 + place));
+        text[place] = '\xff';
+        expectError("<string>" + text + "</string>",
+                    "byte " + std::to_string(8 + place) + " is not UTF-8");
+    }
+}
+
 TEST(XmlReaderDamage, DocumentTypeStandsOnceAndBeforeTheRoot)
 {
     expectError("<plist><!DOCTYPE plist><true/></plist>", "document type line at byte 7");

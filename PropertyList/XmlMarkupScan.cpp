@@ -4,7 +4,6 @@
 #include "PropertyList/XmlText.h"
 
 #include <algorithm>
-#include <array>
 #include <utility>
 
 namespace ventrik
@@ -14,24 +13,18 @@ namespace
 {
 
 constexpr std::size_t npos = std::string_view::npos;
+constexpr std::string_view byteOrderMark = "\xef\xbb\xbf";
 
-// The parser takes some 20 times the size of a small element; this bounds what a message may cost.
+// A value takes some 20 times the size of a small element; this bounds what a message may cost.
 constexpr std::size_t maximumElements = 2'000'000;
-
-bool equalIgnoringCase(std::string_view text, std::string_view upper)
-{
-    return std::equal(text.begin(), text.end(), upper.begin(), upper.end(),
-                      [](char character, char expected) {
-                          const bool isLower = character >= 'a' && character <= 'z';
-                          return (isLower ? character - 'a' + 'A' : character) == expected;
-                      });
-}
 
 bool isEncodingAccepted(std::string_view name)
 {
-    static constexpr std::array<std::string_view, 3> accepted{"UTF-8", "US-ASCII", "ASCII"};
-    return std::any_of(accepted.begin(), accepted.end(),
-                       [&](std::string_view each) { return equalIgnoringCase(name, each); });
+    std::string upper(name);
+    for (char& character : upper)
+        if (character >= 'a' && character <= 'z')
+            character = static_cast<char>(character - 'a' + 'A');
+    return upper == "UTF-8" || upper == "US-ASCII" || upper == "ASCII";
 }
 
 // The quoted value after "encoding =" in a declaration; the whole rest when it is malformed.
@@ -47,165 +40,264 @@ std::string_view declaredEncoding(std::string_view declaration, std::size_t plac
     return end == npos ? rest : rest.substr(1, end - 1);
 }
 
-// A cursor over the markup: each step takes one tag, comment, section or instruction.
-class MarkupScan
+// Beyond ASCII every character may stand in a name.
+constexpr bool isNameStart(char character)
 {
-  public:
-    MarkupScan(std::string_view text, std::size_t maximumDepth)
-        : _text(text), _maximumDepth(maximumDepth)
-    {
-    }
+    return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') ||
+           character == '_' || character == ':' || static_cast<unsigned char>(character) >= 0x80;
+}
 
-    XmlMarkup run()
-    {
-        while ((_start = _text.find('<', _place)) != npos)
-            skipMarkup();
-        return _markup;
-    }
-
-  private:
-    bool at(std::string_view markup) const { return _text.substr(_start).starts_with(markup); }
-
-    void skipMarkup()
-    {
-        if (at("<!--"))
-            skipPast("-->", 4, "comment");
-        else if (at("<![CDATA["))
-            skipPast("]]>", 9, "CDATA section");
-        else if (at("<?"))
-            skipInstruction();
-        else if (at("<!DOCTYPE"))
-            skipDoctype();
-        else if (at("</"))
-            skipEndTag();
-        else
-            skipStartTag();
-    }
-
-    void skipPast(std::string_view end, std::size_t from, std::string_view what)
-    {
-        const std::size_t found = _text.find(end, _start + from);
-        if (found == npos)
-            failPropertyList("the {} at byte {} has no end", what, _start);
-        _place = found + end.size();
-    }
-
-    void skipInstruction()
-    {
-        skipPast("?>", 2, "processing instruction");
-        const std::string_view body = _text.substr(_start + 2, _place - _start - 4);
-        if (body.size() > 3 && body.starts_with("xml") && isXmlSpace(body[3]))
-            checkDeclaration(body);
-    }
-
-    void checkDeclaration(std::string_view body) const
-    {
-        if (!isAllXmlSpace(_text.substr(0, _start)))
-            failPropertyList("the XML declaration at byte {} is not at the start", _start);
-        constexpr std::string_view keyword = "encoding";
-        const std::size_t found = body.find(keyword);
-        if (found == npos)
-            return;
-        const std::string_view name = declaredEncoding(body, found + keyword.size());
-        if (!isEncodingAccepted(name))
-            failPropertyList("the encoding \"{}\" declared at byte {} is not UTF-8",
-                             printable(name), _start);
-    }
-
-    void skipEndTag()
-    {
-        skipPast(">", 2, "end tag");
-        if (_depth > 0)
-            --_depth;
-    }
-
-    void skipStartTag()
-    {
-        _place = endOfTag();
-        if (++_elementCount > maximumElements)
-            failPropertyList("more than {} elements at byte {}", maximumElements, _start);
-        const bool isEmptyElement = _text[_place - 2] == '/';
-        if (_depth == _maximumDepth)
-            failPropertyList("elements nested deeper than {} at byte {}", _maximumDepth, _start);
-        if (!isEmptyElement)
-            ++_depth;
-    }
-
-    // Past the ">" that ends the tag; one inside a quoted attribute value does not.
-    std::size_t endOfTag() const
-    {
-        std::size_t place = _start + 1;
-        while ((place = _text.find_first_of("\"'>", place)) != npos) {
-            if (_text[place] == '>')
-                return place + 1;
-            place = pastQuoted(place);
-        }
-        failPropertyList("the tag at byte {} has no end", _start);
-    }
-
-    std::size_t pastQuoted(std::size_t quote) const
-    {
-        const std::size_t end = _text.find(_text[quote], quote + 1);
-        if (end == npos)
-            failPropertyList("the quoted text at byte {} has no end", quote);
-        return end + 1;
-    }
-
-    void skipDoctype()
-    {
-        if (_elementCount > 0 || _markup.doctypeLength > 0)
-            failPropertyList("a document type line at byte {}, where none may be", _start);
-        const std::size_t end = endOfDoctype();
-        _markup = {_start, end - _start};
-        _place = end;
-    }
-
-    // Past the ">" that ends the line; those of the declarations between "[" and "]" do not.
-    std::size_t endOfDoctype()
-    {
-        const std::size_t doctype = _start;
-        bool isInSubset = false;
-        std::size_t place = _start + 1;
-        while ((place = _text.find_first_of("\"'[]<>", place)) != npos) {
-            const char character = _text[place];
-            if (character == '>' && !isInSubset)
-                return place + 1;
-            if (character == '[' || character == ']')
-                isInSubset = character == '[';
-            place = pastDoctypePart(place);
-        }
-        failPropertyList("the document type line at byte {} has no end", doctype);
-    }
-
-    std::size_t pastDoctypePart(std::size_t place)
-    {
-        const std::string_view rest = _text.substr(place);
-        if (rest.starts_with('"') || rest.starts_with('\''))
-            return pastQuoted(place);
-        const std::size_t doctype = std::exchange(_start, place);
-        _place = place + 1;
-        if (rest.starts_with("<!--"))
-            skipPast("-->", 4, "comment");
-        else if (rest.starts_with("<?"))
-            skipPast("?>", 2, "processing instruction");
-        _start = doctype;
-        return _place;
-    }
-
-    std::string_view _text;
-    std::size_t _maximumDepth;
-    std::size_t _start = 0; // of the markup at hand
-    std::size_t _place = 0; // where the search for the next goes on
-    std::size_t _depth = 0;
-    std::size_t _elementCount = 0;
-    XmlMarkup _markup;
-};
+constexpr bool isNamePart(char character)
+{
+    return isNameStart(character) || (character >= '0' && character <= '9') || character == '-' ||
+           character == '.';
+}
 
 } // namespace
 
-XmlMarkup scanXmlMarkup(std::string_view text, std::size_t maximumDepth)
+XmlMarkupScan::XmlMarkupScan(std::string_view document, std::size_t maximumDepth)
+    : _text(document),
+      _maximumDepth(maximumDepth),
+      _first(document.starts_with(byteOrderMark) ? byteOrderMark.size() : 0),
+      _place(_first)
 {
-    return MarkupScan(text, maximumDepth).run();
+}
+
+XmlPiece XmlMarkupScan::next()
+{
+    if (std::exchange(_isInEmptyElement, false))
+        return closeElement();
+    for (;;) {
+        _start = _place;
+        if (_start == _text.size())
+            return endDocument();
+        if (_text[_start] != '<')
+            return takeText();
+        switch (_start + 1 < _text.size() ? _text[_start + 1] : ' ') {
+        case '/':
+            return takeEndTag();
+        case '!':
+        case '?':
+            if (at("<![CDATA["))
+                return takeCdata();
+            skipMarkup();
+            break;
+        default:
+            return takeStartTag();
+        }
+    }
+}
+
+// Passes over what says nothing to us.
+void XmlMarkupScan::skipMarkup()
+{
+    if (at("<!--"))
+        skipPast("-->", 4, "comment");
+    else if (at("<?"))
+        skipInstruction();
+    else if (at("<!DOCTYPE"))
+        skipDoctype();
+    else
+        failTag();
+}
+
+void XmlMarkupScan::skipPast(std::string_view end, std::size_t from, std::string_view what)
+{
+    const std::size_t found = _text.find(end, _start + from);
+    if (found == npos)
+        failPropertyList("the {} at byte {} has no end", what, _start);
+    _place = found + end.size();
+}
+
+void XmlMarkupScan::skipInstruction()
+{
+    skipPast("?>", 2, "processing instruction");
+    const std::string_view body = _text.substr(_start + 2, _place - _start - 4);
+    if (body.empty() || !isNameStart(body.front()))
+        failPropertyList("the processing instruction at byte {} has no name", _start);
+    if (body.size() > 3 && body.starts_with("xml") && isXmlSpace(body[3]))
+        checkDeclaration(body);
+}
+
+void XmlMarkupScan::checkDeclaration(std::string_view body) const
+{
+    if (!isAllXmlSpace(_text.substr(_first, _start - _first)))
+        failPropertyList("the XML declaration at byte {} is not at the start", _start);
+    constexpr std::string_view keyword = "encoding";
+    const std::size_t found = body.find(keyword);
+    if (found == npos)
+        return;
+    const std::string_view name = declaredEncoding(body, found + keyword.size());
+    if (!isEncodingAccepted(name))
+        failPropertyList("the encoding \"{}\" declared at byte {} is not UTF-8", printable(name),
+                         _start);
+}
+
+void XmlMarkupScan::skipDoctype()
+{
+    if (_elementCount > 0 || std::exchange(_hasDoctype, true))
+        failPropertyList("a document type line at byte {}, where none may be", _start);
+    _place = endOfDoctype();
+}
+
+// Past the ">" that ends the line; those of the declarations between "[" and "]" do not.
+std::size_t XmlMarkupScan::endOfDoctype()
+{
+    const std::size_t doctype = _start;
+    bool isInSubset = false;
+    std::size_t place = _start + 1;
+    while ((place = _text.find_first_of("\"'[]<>", place)) != npos) {
+        const char character = _text[place];
+        if (character == '>' && !isInSubset)
+            return place + 1;
+        if (character == '[' || character == ']')
+            isInSubset = character == '[';
+        place = pastDoctypePart(place);
+    }
+    failPropertyList("the document type line at byte {} has no end", doctype);
+}
+
+std::size_t XmlMarkupScan::pastDoctypePart(std::size_t place)
+{
+    const std::string_view rest = _text.substr(place);
+    if (rest.starts_with('"') || rest.starts_with('\''))
+        return pastQuoted(place);
+    _start = place;
+    _place = place + 1;
+    if (rest.starts_with("<!--"))
+        skipPast("-->", 4, "comment");
+    else if (rest.starts_with("<?"))
+        skipPast("?>", 2, "processing instruction");
+    return _place;
+}
+
+XmlPiece XmlMarkupScan::takeText()
+{
+    _place = std::min(_text.find('<', _start), _text.size());
+    return {Kind::Text, _start, _text.substr(_start, _place - _start)};
+}
+
+XmlPiece XmlMarkupScan::takeCdata()
+{
+    constexpr std::size_t markLength = 9;
+    skipPast("]]>", markLength, "CDATA section");
+    const std::size_t content = _start + markLength;
+    return {Kind::Cdata, content, _text.substr(content, _place - 3 - content)};
+}
+
+XmlPiece XmlMarkupScan::takeStartTag()
+{
+    countElement();
+    _place = _start + 1;
+    const XmlPiece tag{Kind::StartTag, _start, takeName()};
+    if (!take('>')) {
+        skipAttributes();
+        _isInEmptyElement = take('/');
+        if (!take('>'))
+            failTag();
+    }
+    _open.push_back(tag);
+    return tag;
+}
+
+XmlPiece XmlMarkupScan::takeEndTag()
+{
+    _place = _start + 2;
+    const std::string_view name = takeName();
+    skipSpace();
+    if (!take('>'))
+        failTag();
+    if (_open.empty())
+        failPropertyList("</{}> at byte {} ends nothing", printable(name), _start);
+    if (_open.back().text != name)
+        failPropertyList("</{}> at byte {} does not end <{}> at byte {}", printable(name), _start,
+                         printable(_open.back().text), _open.back().offset);
+    return closeElement();
+}
+
+XmlPiece XmlMarkupScan::closeElement()
+{
+    const std::string_view name = _open.back().text;
+    _open.pop_back();
+    return {Kind::EndTag, _start, name};
+}
+
+XmlPiece XmlMarkupScan::endDocument() const
+{
+    if (!_open.empty())
+        failPropertyList("<{}> at byte {} has no end", printable(_open.back().text),
+                         _open.back().offset);
+    return {Kind::DocumentEnd, _text.size(), {}};
+}
+
+void XmlMarkupScan::countElement()
+{
+    if (++_elementCount > maximumElements)
+        failPropertyList("more than {} elements at byte {}", maximumElements, _start);
+    if (_open.size() == _maximumDepth)
+        failPropertyList("elements nested deeper than {} at byte {}", _maximumDepth, _start);
+}
+
+void XmlMarkupScan::skipAttributes()
+{
+    while (_place < _text.size() && isXmlSpace(_text[_place])) {
+        skipSpace();
+        if (_place < _text.size() && isNameStart(_text[_place]))
+            skipAttribute();
+    }
+}
+
+// Attributes say nothing to us, but a document with an unknown entity in one is damaged all the
+// same.
+void XmlMarkupScan::skipAttribute()
+{
+    takeName();
+    skipSpace();
+    const bool hasValue = take('=');
+    skipSpace();
+    if (!hasValue || _place == _text.size() || (_text[_place] != '"' && _text[_place] != '\''))
+        failTag();
+    const std::size_t value = _place + 1;
+    _place = pastQuoted(_place);
+    std::string unused;
+    appendUnescaped(unused, _text.substr(value, _place - 1 - value), value);
+}
+
+std::string_view XmlMarkupScan::takeName()
+{
+    const std::size_t name = _place;
+    if (name == _text.size() || !isNameStart(_text[name]))
+        failTag();
+    while (_place < _text.size() && isNamePart(_text[_place]))
+        ++_place;
+    return _text.substr(name, _place - name);
+}
+
+void XmlMarkupScan::skipSpace()
+{
+    while (_place < _text.size() && isXmlSpace(_text[_place]))
+        ++_place;
+}
+
+bool XmlMarkupScan::take(char character)
+{
+    const bool isThere = _place < _text.size() && _text[_place] == character;
+    _place += isThere ? 1 : 0;
+    return isThere;
+}
+
+std::size_t XmlMarkupScan::pastQuoted(std::size_t quote) const
+{
+    const std::size_t end = _text.find(_text[quote], quote + 1);
+    if (end == npos)
+        failPropertyList("the quoted text at byte {} has no end", quote);
+    return end + 1;
+}
+
+void XmlMarkupScan::failTag() const
+{
+    failPropertyList("the tag at byte {} {}", _start,
+                     _place == _text.size() ? "has no end" : "is malformed");
 }
 
 } // namespace ventrik

@@ -88,7 +88,7 @@ TEST(XmlReaderDamage, UnknownEntitiesAreNamed)
 {
     expectElementError("<string>a&lol;</string>", "unknown entity \"lol\" at byte 16");
     expectElementError("<dict><key>&nbsp;</key><true/></dict>", "unknown entity \"nbsp\"");
-    expectError("<plist version=\"&v;\"><true/></plist>", "unknown entity \"v\"");
+    expectError("<plist version=\"&v;\"><true/></plist>", "unknown entity \"v\" at byte 16");
     expectElementError("<string>a & b</string>", "\"&\" at byte 17 starts no reference");
     expectElementError("<string>&;</string>", "starts no reference");
 }
@@ -123,6 +123,31 @@ TEST(XmlReaderDamage, MarkupMustBeClosed)
     expectError("<plist><true a='></plist>", "the quoted text at byte 15 has no end");
     expectError("<!DOCTYPE plist [<!ENTITY a 'b'>", "the document type line at byte 0");
     expectError("</plist>", "at byte");
+}
+
+TEST(XmlReaderDamage, TagsMustPair)
+{
+    expectError("<plist><array></plist>", "</plist> at byte 14 does not end <array> at byte 7");
+    expectError("<plist><array>", "<array> at byte 7 has no end");
+    expectError("<true/></true>", "</true> at byte 7 ends nothing");
+    expectError("<true></truer>", "</truer> at byte 6 does not end <true> at byte 0");
+}
+
+TEST(XmlReaderDamage, TagsMustBeWellFormed)
+{
+    for (const char* tag : {"< true/>", "<true/ >", "<1a>", "<true a/>", "<true a=1/>",
+                            "<true a=''b=''/>", "<true '/>", "<true \xc2\xa0/>", "<>", "</>",
+                            "<!true/>", "<true></true a=''>", "<tr<ue/>"})
+        expectError(tag, "is malformed");
+    expectError("<plist><true a", "the tag at byte 7 has no end");
+    expectError("<plist><true", "the tag at byte 7 has no end");
+    expectError("<plist><?1?></plist>", "the processing instruction at byte 7 has no name");
+}
+
+TEST(XmlReaderDamage, MalformedMarkupIsToldBeforeWhatIsWrongWithTheValues)
+{
+    expectError("<plist><null/>x<true></plist>", "</plist> at byte 21 does not end <true>");
+    expectError("<plist><true/></plist><false/><!--", "the comment at byte 30 has no end");
 }
 
 TEST(XmlReaderDamage, ACharacterIsFoundWhereverItStands)

@@ -97,6 +97,14 @@ TEST(XmlReader, SkipsTheDocumentType)
               PlistValue(true));
 }
 
+TEST(XmlReader, PassesOverAttributesAndInstructions)
+{
+    EXPECT_EQ(
+        readXml("<plist version=\"1.0\" a = '>' >\n<?a <b>?><true b=\"/>\"/></plist ><?c?>").value,
+        PlistValue(true));
+    EXPECT_EQ(readXml("<string a.1-b='&lt;&#65;'>x<?a?>y</string>").value, PlistValue("xy"));
+}
+
 TEST(XmlReader, AcceptsAByteOrderMarkAndTheNamesOfItsEncoding)
 {
     EXPECT_EQ(

@@ -14,7 +14,12 @@ namespace ventrik
 namespace
 {
 
-void appendCharacter(std::string& text, char character)
+constexpr bool isPlain(char character)
+{
+    return static_cast<unsigned char>(character) >= 0x20 && character != '"' && character != '\\';
+}
+
+void appendEscape(std::string& text, char character)
 {
     switch (character) {
     case '"':
@@ -30,19 +35,23 @@ void appendCharacter(std::string& text, char character)
         text += "\\t";
         return;
     default:
-        break;
-    }
-    if (static_cast<unsigned char>(character) < 0x20)
         fmt::format_to(std::back_inserter(text), "\\u{:04x}", static_cast<int>(character));
-    else
-        text += character;
+    }
 }
 
 void appendString(std::string& text, std::string_view string)
 {
     text += '"';
-    for (const char character : string)
-        appendCharacter(text, character);
+    for (;;) {
+        std::size_t plain = 0;
+        while (plain < string.size() && isPlain(string[plain]))
+            ++plain;
+        text += string.substr(0, plain);
+        if (plain == string.size())
+            break;
+        appendEscape(text, string[plain]);
+        string.remove_prefix(plain + 1);
+    }
     text += '"';
 }
 

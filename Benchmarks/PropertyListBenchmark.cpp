@@ -31,8 +31,7 @@ BENCHMARK(writeXml)->Arg(8)->Arg(1000);
 
 void readXml(benchmark::State& state)
 {
-    const std::string text = *writeXmlPropertyList(cells(state.range(0))).text;
-    const Bytes bytes(text.begin(), text.end());
+    const Bytes bytes = propertyListBytes(cells(state.range(0))).value();
     for (auto _ : state)
         benchmark::DoNotOptimize(readPropertyList(bytes));
     state.SetBytesProcessed(state.iterations() * static_cast<std::int64_t>(bytes.size()));

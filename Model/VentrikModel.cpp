@@ -20,14 +20,6 @@ constexpr RemotePort::Seconds noReceiveTimeout{0.0};
 constexpr auto refreshInterval = 2s;
 constexpr auto retryDelay = 5s;
 
-std::optional<Bytes> serialized(const PlistValue& command)
-{
-    const auto writing = writeXmlPropertyList(command);
-    if (!writing)
-        return std::nullopt;
-    return Bytes(writing.text->begin(), writing.text->end());
-}
-
 ChannelFault faultOfSend(int error)
 {
     return error == PortError::invalidPort ? ChannelFault::NoService : ChannelFault::NoAnswer;
@@ -176,7 +168,7 @@ void VentrikModel::destroyPorts()
 void VentrikModel::configureGenerator()
 {
     setFault(ChannelFault::NoAnswer);
-    const auto command = serialized(PlistDictionary{{"GetTechnology", "GetTechnology"}});
+    const auto command = propertyListBytes(PlistDictionary{{"GetTechnology", "GetTechnology"}});
     if (!command) {
         _platform.log.error(" Could not generate GetTechnology command; cannot configure");
         return;
@@ -245,7 +237,7 @@ RemotePort::SendResult VentrikModel::sendCommand(const Bytes& command,
 
 bool VentrikModel::sendStartCommand()
 {
-    const auto command = serialized(_logGenerator->getStartCommand());
+    const auto command = propertyListBytes(_logGenerator->getStartCommand());
     if (!command) {
         _platform.log.error(" Could not generate PLIST");
         return false;

@@ -24,6 +24,10 @@ struct PropertyListWriting {
 /// outside the years 1 to 9999, nesting beyond `propertyListMaximumDepth`.
 PropertyListWriting writeXmlPropertyList(const PlistValue& value);
 
+/// The same as the bytes of a message; nothing when it is refused, for callers who cannot tell
+/// anybody why.
+std::optional<Bytes> propertyListBytes(const PlistValue& value);
+
 /// The same, and nothing is refused: in the place of each such character stands U+FFFD, and of each
 /// such date and container a string of that character.
 PropertyListWriting writeXmlPropertyListReplacing(const PlistValue& value);

@@ -192,6 +192,13 @@ PropertyListWriting writeXmlPropertyList(const PlistValue& value)
     return writeXml(value, Unfit::Refused);
 }
 
+std::optional<Bytes> propertyListBytes(const PlistValue& value)
+{
+    const PropertyListWriting writing = writeXmlPropertyList(value);
+    return writing ? std::optional<Bytes>(std::in_place, writing.text->begin(), writing.text->end())
+                   : std::nullopt;
+}
+
 PropertyListWriting writeXmlPropertyListReplacing(const PlistValue& value)
 {
     return writeXml(value, Unfit::Replaced);

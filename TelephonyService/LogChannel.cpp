@@ -18,12 +18,6 @@ constexpr int ticksBetweenReports = 20;
 constexpr int unpacedBatch = 5000;
 constexpr std::chrono::milliseconds unpacedInterval{2};
 
-Bytes serialized(const PlistValue& value)
-{
-    const auto writing = writeXmlPropertyList(value);
-    return writing ? Bytes(writing.text->begin(), writing.text->end()) : Bytes();
-}
-
 // The effective log code of a packet that is long enough to have one.
 std::optional<std::uint64_t> codeOf(ByteView message)
 {
@@ -70,7 +64,7 @@ std::optional<Bytes> LogChannel::handleCommand(ByteView command)
         return std::nullopt;
     }
     if (dictionary->contains("GetTechnology"))
-        return serialized(PlistDictionary{{"GetTechnology", _content.technology}});
+        return propertyListBytes(PlistDictionary{{"GetTechnology", _content.technology}});
     const PlistValue* state = dictionary->find("SetState");
     if (state && *state == "Streaming")
         startStreaming(*dictionary);

@@ -83,9 +83,7 @@ void Scenario::reportPropertyList(std::uint32_t logCode, const PlistValue& root)
 
 void Scenario::reportBarePropertyList(const PlistValue& root)
 {
-    const auto writing = writeXmlPropertyList(root);
-    const std::string text = writing ? *writing.text : std::string();
-    _messages.push_back({_step * stepDuration, Bytes(text.begin(), text.end())});
+    _messages.push_back({_step * stepDuration, propertyListBytes(root).value_or(Bytes())});
 }
 
 std::uint16_t rawOf(double value, unsigned bits)

@@ -64,8 +64,7 @@ bool TelephonyService::start(std::string& error)
 
 std::optional<Bytes> TelephonyService::handleRequest(const PortMessage& message)
 {
-    const auto answer = writeXmlPropertyList(openChannel(message));
-    return answer ? std::optional(Bytes(answer.text->begin(), answer.text->end())) : std::nullopt;
+    return propertyListBytes(openChannel(message));
 }
 
 PlistDictionary TelephonyService::openChannel(const PortMessage& message)

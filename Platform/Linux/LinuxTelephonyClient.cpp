@@ -85,14 +85,13 @@ class Connection : public ServerConnection
 
     LogChannelCreation networkMonitorCreateLogChannel(std::string_view localPortName) override
     {
-        const auto request = writeXmlPropertyList(
+        const auto request = propertyListBytes(
             PlistDictionary{{commandKey, createLogChannelCommand}, {localPortKey, localPortName}});
         if (!request)
             return failure(ClientError::requestNotWritten);
-        const Bytes data(request.text->begin(), request.text->end());
         constexpr RemotePort::Seconds timeout{1.0};
         const auto result =
-            _port->send(requestMessageId, data, timeout, timeout, RemotePort::Reply::Wanted);
+            _port->send(requestMessageId, *request, timeout, timeout, RemotePort::Reply::Wanted);
         if (result.error != PortError::success)
             return failure(clientErrorCode(result.error));
         if (!result.reply)

@@ -40,9 +40,8 @@ VentrikAppOptions AppFixture::options(const std::string& snapshotDirectory)
 void AppFixture::changeTechnology(std::string_view technology)
 {
     loseService();
-    const std::string answer =
-        writeXmlPropertyList(PlistDictionary{{"GetTechnology", technology}}).text.value();
-    fake.ports.setDefaultResult({PortError::success, Bytes(answer.begin(), answer.end())});
+    fake.ports.setDefaultResult(
+        {PortError::success, propertyListBytes(PlistDictionary{{"GetTechnology", technology}})});
     fake.ports.listen(remoteName);
     fake.telephony.setServiceAvailable(true);
 }

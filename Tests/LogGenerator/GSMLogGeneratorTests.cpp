@@ -18,8 +18,7 @@ using testing::KilledBySignal;
 
 Bytes message(const PlistValue& root)
 {
-    const std::string text = *writeXmlPropertyList(root).text;
-    return {text.begin(), text.end()};
+    return propertyListBytes(root).value();
 }
 
 // Lets the lines be seen from outside a process that ends.

@@ -35,8 +35,7 @@ void ModelFixture::answerTechnology(const PlistValue& technology)
 
 Bytes ModelFixture::xml(const PlistValue& value)
 {
-    const std::string text = writeXmlPropertyList(value).text.value();
-    return {text.begin(), text.end()};
+    return propertyListBytes(value).value();
 }
 
 void ModelFixture::arrive(const Bytes& message, std::int32_t id)

@@ -28,8 +28,7 @@ constexpr std::uint32_t cellInfoCode = 0xB0C2;
 
 Bytes serialized(const PlistValue& value)
 {
-    const std::string text = writeXmlPropertyList(value).text.value();
-    return {text.begin(), text.end()};
+    return propertyListBytes(value).value();
 }
 
 // A binary property list whose one array holds itself.

@@ -46,11 +46,9 @@ class LogChannelClient
     /// Asks for every message, whatever its code.
     void startStreaming()
     {
-        const auto command =
-            writeXmlPropertyList(PlistDictionary{{"SetState", "Streaming"}}).text.value();
+        const Bytes command = propertyListBytes(PlistDictionary{{"SetState", "Streaming"}}).value();
         constexpr RemotePort::Seconds time{1.0};
-        _remotePort->send(0, Bytes(command.begin(), command.end()), time, time,
-                          RemotePort::Reply::NotWanted);
+        _remotePort->send(0, command, time, time, RemotePort::Reply::NotWanted);
     }
 
     const std::string& remotePortName() const { return _remotePortName; }

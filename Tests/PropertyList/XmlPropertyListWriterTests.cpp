@@ -151,6 +151,18 @@ TEST(XmlWriter, RefusesAContainerThatHoldsItself)
     array.clear(); // breaks the loop, which would keep itself alive
 }
 
+TEST(XmlWriter, GivesTheBytesOfAMessage)
+{
+    const PlistValue value = PlistDictionary{{"a", "b"}};
+    const std::string text = writeXmlPropertyList(value).text.value();
+    EXPECT_EQ(propertyListBytes(value), Bytes(text.begin(), text.end()));
+}
+
+TEST(XmlWriter, GivesNoBytesOfWhatCannotBeWritten)
+{
+    EXPECT_EQ(propertyListBytes("\x01"), std::nullopt);
+}
+
 // What is replaced is counted.
 TEST(ReplacingXmlWriter, PutsAReplacementInThePlaceOfWhatXmlCannotCarry)
 {

@@ -19,8 +19,7 @@ using testing::ElementsAre;
 
 Bytes xml(const PlistValue& value)
 {
-    const std::string text = writeXmlPropertyList(value).text.value();
-    return {text.begin(), text.end()};
+    return propertyListBytes(value).value();
 }
 
 class LogChannelTest : public testing::Test

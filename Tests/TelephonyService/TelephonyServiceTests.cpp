@@ -22,8 +22,7 @@ using namespace std::chrono_literals;
 
 Bytes xml(const PlistValue& value)
 {
-    const std::string text = writeXmlPropertyList(value).text.value();
-    return {text.begin(), text.end()};
+    return propertyListBytes(value).value();
 }
 
 class TelephonyServiceTest : public testing::Test

@@ -1,5 +1,6 @@
 #include "PropertyList/XmlText.h"
 
+#include "PropertyList/CharacterRun.h"
 #include "PropertyList/PropertyListError.h"
 #include "PropertyList/Utf8.h"
 
@@ -22,33 +23,17 @@ constexpr bool isXmlCharacter(char32_t code)
            (code >= 0x10000 && code <= 0x10ffff);
 }
 
-// ASCII that XML can carry. Written without branches, so that the compiler looks at a whole chunk
-// at once.
+// Whether the character is ASCII that XML can carry. Nearly every text is, and its characters need
+// not be decoded.
 constexpr bool isPlain(char character)
 {
     const auto code = static_cast<unsigned char>(character);
     return (code < 0x80) & ((code >= 0x20) | (code == '\t') | (code == '\n') | (code == '\r'));
 }
 
-constexpr std::size_t chunkLength = 16;
-
-bool isPlainChunk(std::string_view text)
+constexpr bool standsAsItIs(char character)
 {
-    unsigned char isOther = 0;
-    for (std::size_t i = 0; i < chunkLength; ++i)
-        isOther |= !isPlain(text[i]);
-    return isOther == 0;
-}
-
-// Where the run of plain characters that starts at the place ends. Nearly every text is one, and
-// its characters need not be decoded.
-std::size_t endOfPlainRun(std::string_view text, std::size_t place)
-{
-    while (place + chunkLength <= text.size() && isPlainChunk(text.substr(place)))
-        place += chunkLength;
-    while (place < text.size() && isPlain(text[place]))
-        ++place;
-    return place;
+    return (character != '&') & (character != '<') & (character != '>') & (character != '\r');
 }
 
 struct NamedCharacter {
@@ -121,8 +106,8 @@ std::string_view trimXmlSpace(std::string_view text)
 
 std::optional<std::string> xmlTextProblem(std::string_view text)
 {
-    for (std::size_t place = endOfPlainRun(text, 0); place < text.size();
-         place = endOfPlainRun(text, place)) {
+    for (std::size_t place = endOfRun<isPlain>(text, 0); place < text.size();
+         place = endOfRun<isPlain>(text, place)) {
         const Utf8Character character = decodeUtf8(text.substr(place));
         if (character.length == 0)
             return fmt::format("byte {} is not UTF-8", place);
@@ -150,14 +135,13 @@ std::string replaceUnfit(std::string_view text, std::size_t& count)
 
 void appendEscaped(std::string& written, std::string_view text)
 {
-    while (!text.empty()) {
-        const std::size_t plain = std::min(text.find_first_of("&<>\r"), text.size());
+    for (;;) {
+        const std::size_t plain = endOfRun<standsAsItIs>(text, 0);
         written += text.substr(0, plain);
-        text.remove_prefix(plain);
-        if (text.empty())
+        if (plain == text.size())
             return;
-        written += escapeOf(text.front());
-        text.remove_prefix(1);
+        written += escapeOf(text[plain]);
+        text.remove_prefix(plain + 1);
     }
 }
 

@@ -1,6 +1,7 @@
 #include "Tools/Json.h"
 
 #include "PropertyList/Base64.h"
+#include "PropertyList/CharacterRun.h"
 #include "PropertyList/IsoDate.h"
 
 #include <cmath>
@@ -14,9 +15,14 @@ namespace ventrik
 namespace
 {
 
-constexpr bool isPlain(char character)
+using namespace std::string_view_literals;
+
+constexpr std::string_view separator = ", ";
+
+constexpr bool standsAsItIs(char character)
 {
-    return static_cast<unsigned char>(character) >= 0x20 && character != '"' && character != '\\';
+    return (static_cast<unsigned char>(character) >= 0x20) & (character != '"') &
+           (character != '\\');
 }
 
 void appendEscape(std::string& text, char character)
@@ -43,9 +49,7 @@ void appendString(std::string& text, std::string_view string)
 {
     text += '"';
     for (;;) {
-        std::size_t plain = 0;
-        while (plain < string.size() && isPlain(string[plain]))
-            ++plain;
+        const std::size_t plain = endOfRun<standsAsItIs>(string, 0);
         text += string.substr(0, plain);
         if (plain == string.size())
             break;
@@ -74,7 +78,7 @@ void appendArray(std::string& text, const PlistArray& array)
     text += '[';
     for (const PlistValue& element : array) {
         if (&element != array.begin())
-            text += ", ";
+            text += separator;
         appendJson(text, element);
     }
     text += ']';
@@ -85,9 +89,9 @@ void appendDictionary(std::string& text, const PlistDictionary& dictionary)
     text += '{';
     for (const auto& entry : dictionary) {
         if (&entry != dictionary.begin())
-            text += ", ";
+            text += separator;
         appendString(text, entry.key);
-        text += ": ";
+        text += ": "sv;
         appendJson(text, entry.value);
     }
     text += '}';
@@ -106,7 +110,7 @@ void appendJson(std::string& text, const PlistValue& value)
     case PlistValue::Kind::Real:
         return appendReal(text, *value.real());
     case PlistValue::Kind::Boolean:
-        text += *value.boolean() ? "true" : "false";
+        text += *value.boolean() ? "true"sv : "false"sv;
         return;
     case PlistValue::Kind::Date:
         return appendDate(text, *value.date());

@@ -151,6 +151,16 @@ TEST(XmlWriter, RefusesAContainerThatHoldsItself)
     array.clear(); // breaks the loop, which would keep itself alive
 }
 
+TEST(XmlWriter, EscapesACharacterWhereverItStands)
+{
+    for (std::size_t place = 0; place < 40; ++place) {
+        const std::string before(place, 'a');
+        const std::string after(39 - place, 'b');
+        EXPECT_THAT(writeXmlPropertyList(before + "&" + after).text.value(),
+                    testing::HasSubstr("<string>" + before + "&amp;" + after + "</string>"));
+    }
+}
+
 TEST(XmlWriter, GivesTheBytesOfAMessage)
 {
     const PlistValue value = PlistDictionary{{"a", "b"}};

@@ -53,6 +53,15 @@ TEST(Json, EscapesWhatJsonDemands)
     EXPECT_EQ(json(PlistDictionary{{"a\"b", "\xe2\x82\xac"}}), "{\"a\\\"b\": \"\xe2\x82\xac\"}");
 }
 
+TEST(Json, EscapesACharacterWhereverItStands)
+{
+    for (std::size_t place = 0; place < 40; ++place) {
+        const std::string before(place, 'a');
+        const std::string after(39 - place, 'b');
+        EXPECT_EQ(json(before + "\"" + after), "\"" + before + "\\\"" + after + "\"");
+    }
+}
+
 TEST(Json, WritesNullForWhatItDoesNotHave)
 {
     EXPECT_EQ(json(std::numeric_limits<double>::infinity()), "null");

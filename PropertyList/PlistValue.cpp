@@ -30,7 +30,7 @@ struct KeyHash {
 
 std::string PlistInteger::decimal() const
 {
-    return _negative ? fmt::format("{}", signedBits()) : fmt::format("{}", _bits);
+    return _negative ? fmt::format_int(signedBits()).str() : fmt::format_int(_bits).str();
 }
 
 PlistArray::PlistArray() : _values(std::make_shared<Storage>()) {}

@@ -70,7 +70,24 @@ class XmlWriter
 
     void writeElement(std::string_view name, std::string_view content)
     {
-        writeLine(fmt::format("<{0}>{1}</{0}>", name, content));
+        writeStartTag(name);
+        _text += content;
+        writeEndTag(name);
+    }
+
+    void writeStartTag(std::string_view name)
+    {
+        indent();
+        _text += '<';
+        _text += name;
+        _text += '>';
+    }
+
+    void writeEndTag(std::string_view name)
+    {
+        _text += "</";
+        _text += name;
+        _text += ">\n";
     }
 
     void writeText(std::string_view name, std::string_view text)
@@ -78,9 +95,12 @@ class XmlWriter
         const auto problem = xmlTextProblem(text);
         if (problem && _unfit == Unfit::Refused)
             fail(fmt::format("in the {}, {}", name, *problem));
-        std::string escaped;
-        appendEscaped(escaped, problem ? replaceUnfit(text, _replaced) : text);
-        writeElement(name, escaped);
+        writeStartTag(name);
+        if (problem)
+            appendEscaped(_text, replaceUnfit(text, _replaced));
+        else
+            appendEscaped(_text, text);
+        writeEndTag(name);
     }
 
     // Writes U+FFFD for a value that cannot be written, where that is wanted.

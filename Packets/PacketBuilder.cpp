@@ -101,16 +101,8 @@ void PacketBuilder::put(std::size_t offset, std::size_t width, std::uint64_t val
 
 Bytes propertyListPacket(std::uint32_t logCode, const PlistValue& root)
 {
-<<<<<<< HEAD:Packets/PacketBuilder.cpp
-    const auto writing = writeXmlPropertyList(root);
-    const std::string text = writing ? *writing.text : std::string();
-    return PacketBuilder(logCode)
-        .bytes(logPacketHeaderSize, Bytes(text.begin(), text.end()))
-        .build();
-=======
     const Bytes content = propertyListBytes(root).value_or(Bytes());
-    return PacketBuilder(logCode).bytes(headerSize, content).build();
->>>>>>> 11fb349 (Turn a property list into a message's bytes in one place):TelephonyService/PacketBuilder.cpp
+    return PacketBuilder(logCode).bytes(logPacketHeaderSize, content).build();
 }
 
 } // namespace ventrik

@@ -41,7 +41,12 @@ class C2KProcessTemplateTest : public testing::Test
 class C2KOutputTest : public testing::Test
 {
   protected:
-    void publish() { C2KOutput(&lookup, state, log).publish("k", "v"); }
+    void publish()
+    {
+        C2KLabels labels;
+        labels.useLookup(&lookup);
+        C2KOutput(labels, state, log).publish("k", "v");
+    }
 
     CapturingSystemLog log;
     PlistDictionary state;
@@ -255,7 +260,9 @@ TEST_F(C2KProcessTemplateTest, OnePublishedValueFillsAllItsLabels)
 {
     process({{"Channel", "kChannel"}, {"Status", PlistDictionary{{"Number", "kChannel"}}}});
     PlistDictionary state;
-    C2KOutput(&lookup, state, log).publish("kChannel", "283");
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    C2KOutput(labels, state, log).publish("kChannel", "283");
     EXPECT_EQ(textAt(display, {"Channel"}), "283");
     EXPECT_EQ(textAt(display, {"Status", "Number"}), "283");
 }
@@ -293,6 +300,55 @@ TEST_F(C2KOutputTest, AKeyWithoutLabelsIsDropped)
     lookup.set("k", "no array");
     publish();
     EXPECT_TRUE(display.empty());
+}
+
+// Whoever changes the display behind the labels' back sees what they store.
+TEST_F(C2KOutputTest, AnUnchangedValueIsNotStoredAgain)
+{
+    constexpr Field field{"k", u8(0)};
+    lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    labels.publish(field, nullptr, 5);
+    EXPECT_EQ(textAt(display, {"A"}), "5");
+    display.set("A", "mine");
+    labels.publish(field, nullptr, 5);
+    EXPECT_EQ(textAt(display, {"A"}), "mine");
+    labels.publish(field, nullptr, 6);
+    EXPECT_EQ(textAt(display, {"A"}), "6");
+    labels.publish("k", "N/A");
+    labels.publish(field, nullptr, 6);
+    EXPECT_EQ(textAt(display, {"A"}), "6");
+}
+
+TEST_F(C2KOutputTest, AnotherLookupIsFilledAnew)
+{
+    constexpr Field field{"k", u8(0)};
+    lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    labels.publish(field, nullptr, 5);
+    PlistDictionary second;
+    const PlistDictionary other{{"k", PlistArray{PlistDictionary{{"key", "B"}, {"dict", second}}}}};
+    labels.useLookup(&other);
+    labels.publish(field, nullptr, 5);
+    EXPECT_EQ(second, (PlistDictionary{{"B", "5"}}));
+}
+
+TEST_F(C2KOutputTest, AGroupOfPilotsThatChangesIsANewGroup)
+{
+    lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    labels.publish("k", {{0, 12, -3.5}}, "(none)");
+    const PlistDictionary before = *display.find("A")->dictionary();
+    labels.publish("k", {{0, 12, -3.5}}, "(none)");
+    EXPECT_TRUE(display.find("A")->dictionary()->isSameContainer(before));
+    labels.publish("k", {{0, 12, -4}}, "(none)");
+    EXPECT_EQ(textAt(before, {"0;12"}), "-3.50 dB");
+    EXPECT_EQ(textAt(display, {"A", "0;12"}), "-4.00 dB");
+    labels.publish("k", std::vector<ShownPilot>(), "(none)");
+    EXPECT_EQ(textAt(display, {"A"}), "(none)");
 }
 
 TEST_F(C2KOutputTest, AnEntryThatIsNoneEndsThePublishing)

@@ -40,13 +40,14 @@ inline constexpr Field fingerPNOffset{"PN offset", u16(0)};
 inline constexpr Field fingerRatio{"C/I", u16(6), pilotStrength};
 inline constexpr std::array<Field, 2> fingerFields{fingerPNOffset, fingerRatio};
 inline constexpr List fingers{
-    .key = "kFingerC2I",
+    .key = "",
     .offset = 23,
     .stride = 14,
     .needed = 14,
     .count = {u8(22)},
     .fields = fingerFields,
 };
+inline constexpr Field fingerGroup{"kFingerC2I", {}};
 inline constexpr Record fingerC2I{0x108A, "1x finger C/I", 23, {}, {&fingers}};
 
 // EV-DO status, exactly 50 bytes
@@ -98,13 +99,14 @@ inline constexpr Field pilotPNOffset{"PN offset", u16(0)};
 inline constexpr Field pilotLevel{"strength", u16(2), pilotStrength};
 inline constexpr std::array<Field, 2> activeSetPilotFields{pilotPNOffset, pilotLevel};
 inline constexpr List activeSetPilotList{
-    .key = "kActiveSetPilots",
+    .key = "",
     .offset = 25,
     .stride = 12,
     .needed = 12,
     .count = {u8(15)},
     .fields = activeSetPilotFields,
 };
+inline constexpr Field activeSetPilotGroup{"kActiveSetPilots", {}};
 inline constexpr Record activeSetPilots{
     0x12B6, "EV-DO active-set pilot strengths", 25, {}, {&activeSetPilotList}};
 
@@ -149,6 +151,7 @@ inline constexpr Field furtherFields{"F", u8(9)};
 inline constexpr Field referencePNOffset{"reference PN offset", u16(10)};
 inline constexpr std::array<Field, 6> activeSetFields{scaleN,     scaleM,        scaleE,
                                                       pilotCount, furtherFields, referencePNOffset};
+inline constexpr Field activeSetInfo{"k1xActiveSetInfo", {}};
 inline constexpr Subpacket activeSetPart{3, activeSetFields};
 inline constexpr std::size_t firstPilot = 12;
 inline constexpr std::size_t pilotSize(std::size_t fieldCount)
@@ -162,7 +165,7 @@ inline constexpr std::array<Field, 2> pilotFields(std::size_t fieldCount)
 }
 
 inline constexpr Subpacket fingerPart{4}; // of which nothing shows
-inline constexpr Record oneXStatus{0x119C, "1x status", Subpackets::minimumSize, {stateFields}};
+inline constexpr Record oneXStatus{0x119C, "1x status", Subpackets::minimumSize};
 
 // 1x traffic frame erasure, a record of subpackets
 inline constexpr Field frameErasure{"frame erased", u8(24)};

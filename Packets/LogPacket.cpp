@@ -15,8 +15,26 @@ ByteView LogPacket::payload() const
 const PropertyListReading& LogPacket::propertyList() const
 {
     if (!_propertyList)
-        _propertyList = std::make_shared<const PropertyListReading>(readPropertyList(payload()));
+        _propertyList =
+            _memory ? _memory->read(effectiveLogCode(*this), payload())
+                    : std::make_shared<const PropertyListReading>(readPropertyList(payload()));
     return *_propertyList;
+}
+
+std::shared_ptr<const PropertyListReading> PropertyListMemory::read(std::uint32_t logCode,
+                                                                    ByteView payload)
+{
+    auto known = std::ranges::find(_known, logCode, &Known::logCode);
+    if (known != _known.end() && std::ranges::equal(known->payload, payload))
+        return known->reading;
+    auto reading = std::make_shared<const PropertyListReading>(readPropertyList(payload));
+    if (known == _known.end())
+        known = _known.insert(known, {logCode, {}, {}});
+    if (payload.size() <= maximumSize)
+        *known = {logCode, Bytes(payload.begin(), payload.end()), reading};
+    else
+        _known.erase(known);
+    return reading;
 }
 
 LogPacket LogPacket::from(std::size_t offset) const

@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <vector>
 
 namespace ventrik
 {
@@ -21,12 +22,33 @@ inline constexpr std::uint8_t ordinaryPacketType = 1;
 inline constexpr std::uint8_t extraCodePacketType = 255;
 inline constexpr std::uint32_t extraCodeBase = 0xFF0000;
 
+/// The property lists that the last packets of a few codes carried. A service repeats much of what
+/// it tells, byte for byte.
+class PropertyListMemory
+{
+  public:
+    /// The reading of a packet's payload; what it gave the last time when the bytes are the same.
+    std::shared_ptr<const PropertyListReading> read(std::uint32_t logCode, ByteView payload);
+
+  private:
+    static constexpr std::size_t maximumSize = 65536; ///< of a payload that is kept
+
+    struct Known {
+        std::uint32_t logCode;
+        Bytes payload;
+        std::shared_ptr<const PropertyListReading> reading;
+    };
+    std::vector<Known> _known;
+};
+
 /// A log packet after its transport prefix was removed, with bounded reads: a byte past the end
 /// reads as 0. Offsets count from the type byte. It does not own the bytes.
 class LogPacket
 {
   public:
     explicit LogPacket(ByteView bytes) : _bytes(bytes) {}
+    /// With what was read before, which spares reading the same property list again.
+    LogPacket(ByteView bytes, PropertyListMemory& memory) : _bytes(bytes), _memory(&memory) {}
 
     std::size_t size() const { return _bytes.size(); }
     ByteView bytes() const { return _bytes; }
@@ -58,10 +80,44 @@ class LogPacket
     std::int16_t i16(std::size_t offset) const { return static_cast<std::int16_t>(u16(offset)); }
     std::int32_t i32(std::size_t offset) const { return static_cast<std::int32_t>(u32(offset)); }
 
+    /// The eight bytes from an offset on, for numbers of any width.
+    std::uint64_t littleEndianWord(std::size_t offset) const;
+    /// So many bytes (up to eight) from an offset on.
+    std::uint64_t bigEndianWord(std::size_t offset, std::size_t count) const;
+
   private:
     ByteView _bytes;
+    PropertyListMemory* _memory = nullptr;
     mutable std::shared_ptr<const PropertyListReading> _propertyList;
 };
+
+inline std::uint64_t LogPacket::littleEndianWord(std::size_t offset) const
+{
+    constexpr std::size_t wordSize = sizeof(std::uint64_t);
+    const auto wordAt = [&](std::size_t start) {
+        std::uint64_t word = 0;
+        for (std::size_t i = 0; i < wordSize; ++i)
+            word |= std::uint64_t{_bytes[start + i]} << (8 * i);
+        return word;
+    };
+    if (offset + wordSize <= size())
+        return wordAt(offset);
+    // The last eight bytes, shifted, end in the zeros that stand for bytes past the end.
+    if (offset < size() && size() >= wordSize)
+        return wordAt(size() - wordSize) >> (8 * (offset + wordSize - size()));
+    std::uint64_t word = 0;
+    for (std::size_t i = 0; i < wordSize; ++i)
+        word |= std::uint64_t{u8(offset + i)} << (8 * i);
+    return word;
+}
+
+inline std::uint64_t LogPacket::bigEndianWord(std::size_t offset, std::size_t count) const
+{
+    std::uint64_t word = 0;
+    for (std::size_t i = 0; i < count; ++i)
+        word = word << 8 | u8(offset + i);
+    return word;
+}
 
 /// The elements of a repeated record: `count` of them, one every `stride` bytes from `offset`. An
 /// element is complete when its first `needed` bytes lie inside the packet.

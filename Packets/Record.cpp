@@ -1,8 +1,6 @@
 #include "Packets/Record.h"
 
 #include <algorithm>
-#include <bit>
-#include <cstring>
 
 #include <fmt/compile.h>
 #include <fmt/format.h>
@@ -12,30 +10,6 @@ namespace ventrik
 
 namespace
 {
-
-std::uint64_t littleEndianWord(const LogPacket& packet, const Place& place)
-{
-    constexpr std::size_t wordSize = sizeof(std::uint64_t);
-    const ByteView bytes = packet.bytes();
-    if constexpr (std::endian::native == std::endian::little)
-        if (place.offset + wordSize <= bytes.size()) {
-            std::uint64_t word = 0;
-            std::memcpy(&word, bytes.data() + place.offset, wordSize);
-            return word;
-        }
-    std::uint64_t word = 0;
-    for (std::size_t i = 0; i < place.bytes(); ++i)
-        word |= std::uint64_t{packet.u8(place.offset + i)} << (8 * i);
-    return word;
-}
-
-std::uint64_t bigEndianWord(const LogPacket& packet, const Place& place)
-{
-    std::uint64_t word = 0;
-    for (std::size_t i = 0; i < place.bytes(); ++i)
-        word = word << 8 | packet.u8(place.offset + i);
-    return word;
-}
 
 std::string withRawNumber(std::string_view text, std::int64_t raw)
 {
@@ -72,17 +46,6 @@ void appendNumber(fmt::memory_buffer& text, Digits digits, double number)
 }
 
 } // namespace
-
-std::int64_t numberAt(const LogPacket& packet, const Place& place)
-{
-    const std::uint64_t word =
-        place.isBigEndian ? bigEndianWord(packet, place) : littleEndianWord(packet, place);
-    const std::uint64_t sign = std::uint64_t{1} << (place.width - 1);
-    const std::uint64_t number = word >> place.bit & (2 * sign - 1);
-    // Subtracting the sign bit twice spreads it over all bits above.
-    return static_cast<std::int64_t>(place.isSigned && (number & sign) ? number - 2 * sign
-                                                                       : number);
-}
 
 std::optional<double> Shown::number(std::int64_t raw) const
 {

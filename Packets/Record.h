@@ -111,7 +111,17 @@ struct Record {
 const Field* findField(std::span<const std::span<const Field>> groups, std::string_view key);
 
 /// The number at a place of the packet; bytes past its end read as 0.
-std::int64_t numberAt(const LogPacket& packet, const Place& place);
+inline std::int64_t numberAt(const LogPacket& packet, const Place& place)
+{
+    const std::uint64_t word = place.isBigEndian
+                                   ? packet.bigEndianWord(place.offset, place.bytes())
+                                   : packet.littleEndianWord(place.offset) >> place.bit;
+    const std::uint64_t sign = std::uint64_t{1} << (place.width - 1);
+    const std::uint64_t number = word & (2 * sign - 1);
+    // Subtracting the sign bit twice spreads it over all bits above.
+    return static_cast<std::int64_t>(place.isSigned && (number & sign) ? number - 2 * sign
+                                                                       : number);
+}
 
 inline std::int64_t numberOf(const LogPacket& packet, const Field& field)
 {

@@ -87,6 +87,7 @@ inline constexpr List transportChannels{
     .fields = transportChannelFields,
 };
 // The signal-to-interference ratios of a composite channel's slots are one byte each.
+inline constexpr Field slotRatio{"", u8(0)};
 inline constexpr std::size_t slotCount = 6;
 inline constexpr std::array<Field, 3> compositeChannelFields{{
     {"CCTRCH ID", u8(0)},

@@ -19,7 +19,7 @@ void decodeActiveSetPilots(const LogPacket& packet, const C2KOutput& output)
         const LogPacket pilot = elements.element(packet, i);
         pilots.push_back(shownPilot(i, pilot, C2KRecords::pilotPNOffset, C2KRecords::pilotLevel));
     }
-    output.publish(C2KRecords::activeSetPilotList.key, pilots, "(none)");
+    output.publish(C2KRecords::activeSetPilotGroup, pilots, "(none)");
 }
 
 } // namespace ventrik

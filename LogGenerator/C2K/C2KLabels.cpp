@@ -55,15 +55,15 @@ void C2KLabels::publish(const Field& field, const Record* record, std::int64_t r
     if (_memory.shows(slot, field, raw, false))
         return;
     _memory.keep(slot, field, record, raw, false);
-    Labels& labels = labelsOf(slot, field.key);
+    Labels& labels = labelsOf(slot, field);
     labels.text.clear();
-    store(labels, field.shown.textOf(raw).value_or(""));
+    store(labels, _texts.textOf(field, raw).value_or(""));
 }
 
-void C2KLabels::publish(std::string_view lookupKey, std::string_view text)
+void C2KLabels::publish(const Field& field, std::string_view text)
 {
-    const std::size_t slot = _memory.slotOf(lookupKey);
-    Labels& labels = labelsOf(slot, lookupKey);
+    const std::size_t slot = _memory.slotOf(field);
+    Labels& labels = labelsOf(slot, field);
     if (labels.text == text && !text.empty() && !labels.isGroup)
         return;
     _memory.keepNone(slot);
@@ -72,13 +72,13 @@ void C2KLabels::publish(std::string_view lookupKey, std::string_view text)
     store(labels, text);
 }
 
-void C2KLabels::publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilots,
                         std::string_view textOfNone)
 {
     if (pilots.empty() && !textOfNone.empty())
-        return publish(lookupKey, textOfNone);
-    const std::size_t slot = _memory.slotOf(lookupKey);
-    Labels& labels = labelsOf(slot, lookupKey);
+        return publish(field, textOfNone);
+    const std::size_t slot = _memory.slotOf(field);
+    Labels& labels = labelsOf(slot, field);
     if (labels.isGroup && labels.pilots == pilots)
         return;
     _memory.keepNone(slot);
@@ -97,11 +97,11 @@ std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
     return std::nullopt;
 }
 
-C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, std::string_view lookupKey)
+C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, const Field& field)
 {
     if (slot >= _labels.size()) {
         _labels.resize(slot + 1);
-        _labels[slot].targets = targetsOf(lookupKey);
+        _labels[slot].targets = targetsOf(field.key);
     }
     return _labels[slot];
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Orbel/FieldMemory.h"
+#include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
 #include <cstdint>
@@ -35,8 +36,10 @@ class C2KLabels
     void useLookup(const PlistDictionary* lookup);
 
     void publish(const Field& field, const Record* record, std::int64_t raw);
-    void publish(std::string_view lookupKey, std::string_view text);
-    void publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+    /// A text in the place of the field's number.
+    void publish(const Field& field, std::string_view text);
+    /// A group of pilots, or the text while there is none; an empty one means the empty group.
+    void publish(const Field& field, const std::vector<ShownPilot>& pilots,
                  std::string_view textOfNone);
 
     /// Where the value under a label of a group comes from; none where no field shows there.
@@ -54,12 +57,13 @@ class C2KLabels
         bool isGroup = false;
     };
 
-    Labels& labelsOf(std::size_t slot, std::string_view lookupKey);
+    Labels& labelsOf(std::size_t slot, const Field& field);
     std::vector<Target> targetsOf(std::string_view lookupKey) const;
     static void store(Labels& labels, const PlistValue& value);
 
     std::optional<PlistDictionary> _lookup;
     FieldMemory _memory;
+    TextMemory _texts;
     std::vector<Labels> _labels; // of each slot
 };
 

@@ -16,15 +16,15 @@ void C2KOutput::publish(std::span<const Field> fields, const LogPacket& part) co
         publish(field, part);
 }
 
-void C2KOutput::publish(std::string_view lookupKey, std::string_view text) const
+void C2KOutput::publish(const Field& field, std::string_view text) const
 {
-    _labels.publish(lookupKey, text);
+    _labels.publish(field, text);
 }
 
-void C2KOutput::publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+void C2KOutput::publish(const Field& field, const std::vector<ShownPilot>& pilots,
                         std::string_view textOfNone) const
 {
-    _labels.publish(lookupKey, pilots, textOfNone);
+    _labels.publish(field, pilots, textOfNone);
 }
 
 void C2KOutput::keepExtra(std::string_view key, const PlistValue& value) const

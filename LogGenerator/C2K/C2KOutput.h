@@ -25,10 +25,11 @@ class C2KOutput
     /// Shows a field of a part of the record under every label that the template gives to its key.
     void publish(const Field& field, const LogPacket& part) const;
     void publish(std::span<const Field> fields, const LogPacket& part) const;
-    // The same with what no field describes.
-    void publish(std::string_view lookupKey, std::string_view text) const;
-    /// A group of pilots, or the text while there is none; an empty one means the empty group.
-    void publish(std::string_view lookupKey, const std::vector<ShownPilot>& pilots,
+    /// Shows a text in the place of the field's number.
+    void publish(const Field& field, std::string_view text) const;
+    /// Shows a group of pilots, or the text while there is none; an empty one means the empty
+    /// group.
+    void publish(const Field& field, const std::vector<ShownPilot>& pilots,
                  std::string_view textOfNone = {}) const;
 
     PlistDictionary& state() const { return _state; }

@@ -26,7 +26,7 @@ constexpr std::array<std::int64_t, C2KRecords::payloadSizeCount> reverseBits{
 
 /// Where a direction keeps its last record, and where its rate is shown.
 struct Direction {
-    std::string_view lookupKey;
+    const Field& rate;
     std::string_view sequenceKey;
     std::string_view sentKey;
     // In the extra information: the last record and the one before it.
@@ -36,11 +36,14 @@ struct Direction {
     std::string_view sent2Key;
 };
 
+constexpr Field forwardRate{"kFLDataRate", {}};
+constexpr Field reverseRate{"kRLDataRate", {}};
+
 constexpr Direction forward{
-    "kFLDataRate", StateKey::forwardSequence, StateKey::forwardSent, "FLDataSeqNum1",
+    forwardRate,   StateKey::forwardSequence, StateKey::forwardSent, "FLDataSeqNum1",
     "FLDataSent1", "FLDataSeqNum2",           "FLDataSent2"};
 constexpr Direction reverse{
-    "kRLDataRate", StateKey::reverseSequence, StateKey::reverseSent, "RLDataSeqNum1",
+    reverseRate,   StateKey::reverseSequence, StateKey::reverseSent, "RLDataSeqNum1",
     "RLDataSent1", "RLDataSeqNum2",           "RLDataSent2"};
 
 const PlistInteger* keptNumber(const PlistDictionary& state, std::string_view key)
@@ -60,12 +63,11 @@ void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t
             sequence - static_cast<std::uint32_t>(previousSequence->bits()));
         const auto added = static_cast<double>(sent - previousSent->signedBits());
         if (steps >= 1)
-            output.publish(direction.lookupKey,
-                           fmt::format("{:.2f} kbps", added / (steps * 1024.0)));
+            output.publish(direction.rate, fmt::format("{:.2f} kbps", added / (steps * 1024.0)));
         output.keepExtra(direction.sequence2Key, *previousSequence);
         output.keepExtra(direction.sent2Key, *previousSent);
     } else {
-        output.publish(direction.lookupKey, "");
+        output.publish(direction.rate, "");
     }
     state.set(direction.sequenceKey, sequence);
     state.set(direction.sentKey, sent);

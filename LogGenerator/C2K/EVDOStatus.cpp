@@ -16,7 +16,7 @@ void decodeEVDOStatus(const LogPacket& packet, const C2KOutput& output)
         if (isActive)
             output.publish(field, packet);
         else
-            output.publish(field.key, "N/A");
+            output.publish(field, "N/A");
     }
 }
 

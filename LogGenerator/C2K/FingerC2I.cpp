@@ -22,7 +22,7 @@ void decodeFingerC2I(const LogPacket& packet, const C2KOutput& output)
             pilots.push_back(
                 shownPilot(i, finger, C2KRecords::fingerPNOffset, C2KRecords::fingerRatio));
     }
-    output.publish(C2KRecords::fingers.key, pilots, "(none)");
+    output.publish(C2KRecords::fingerGroup, pilots, "(none)");
 }
 
 } // namespace ventrik

@@ -25,7 +25,7 @@ void decodeOneXServingSystem(const LogPacket& packet, const C2KOutput& output)
         if (type == typeWithIdentity)
             output.publish(field, packet);
         else
-            output.publish(field.key, fmt::format("(unknown system type {})", type));
+            output.publish(field, fmt::format("(unknown system type {})", type));
     }
     output.publish(C2KRecords::packetZone, packet);
     if (packet.size() >= C2KRecords::sizeWithBaseStation)

@@ -21,7 +21,7 @@ void publishRadio(const LogPacket& radio, bool isInTraffic, const C2KOutput& out
         if (isInTraffic)
             output.publish(field, radio);
         else
-            output.publish(field.key, "N/A");
+            output.publish(field, "N/A");
     }
 }
 
@@ -76,7 +76,7 @@ void decodeOneXStatus(const LogPacket& packet, const C2KOutput& output)
     const bool isInTraffic = numberOf(*state, C2KRecords::deviceState) == trafficState;
     output.publish(C2KRecords::deviceState, *state);
     publishRadio(*radio, isInTraffic, output);
-    output.publish("k1xActiveSetInfo", pilotsOf(*activeSet));
+    output.publish(C2KRecords::activeSetInfo, pilotsOf(*activeSet));
     if (!isInTraffic)
         endTrafficFER(output);
 }

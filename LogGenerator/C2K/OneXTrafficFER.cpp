@@ -5,6 +5,8 @@
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/C2KRecords.h"
 
+#include <fmt/compile.h>
+
 namespace ventrik
 {
 
@@ -15,7 +17,7 @@ namespace
 constexpr float newShare = 0.015625F;
 constexpr float oldShare = 0.984375F;
 
-constexpr std::string_view lookupKey = "k1xTrafficFER";
+constexpr Field frameErasureRate{"k1xTrafficFER", {}};
 
 std::optional<float> keptRate(const PlistDictionary& state)
 {
@@ -26,7 +28,7 @@ std::optional<float> keptRate(const PlistDictionary& state)
 
 std::string percent(float rate)
 {
-    return fmt::format("{:.2f}%", static_cast<double>(rate * 100.0F));
+    return fmt::format(FMT_COMPILE("{:.2f}%"), static_cast<double>(rate * 100.0F));
 }
 
 } // namespace
@@ -42,7 +44,7 @@ void decodeOneXTrafficFER(const LogPacket& packet, const C2KOutput& output)
     if (const auto previous = keptRate(output.state()))
         rate += *previous * oldShare;
     output.state().set(StateKey::trafficFER, static_cast<double>(rate));
-    output.publish(lookupKey, percent(rate));
+    output.publish(frameErasureRate, percent(rate));
 }
 
 void endTrafficFER(const C2KOutput& output)
@@ -50,7 +52,7 @@ void endTrafficFER(const C2KOutput& output)
     const auto rate = keptRate(output.state());
     if (!rate)
         return;
-    output.publish(lookupKey, percent(*rate) + " (old)");
+    output.publish(frameErasureRate, percent(*rate) + " (old)");
     output.state().remove(StateKey::trafficFER);
 }
 

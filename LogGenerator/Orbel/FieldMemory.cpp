@@ -8,11 +8,12 @@ namespace ventrik
 std::size_t FieldMemory::slotOf(const Field& field)
 {
     // Fields come in the order of their tables.
-    if (_next < _slots.size() && _slots[_next].field == &field)
+    if (_next < _slots.size() && _slots[_next].asked == &field)
         return _next++;
-    const auto slot = std::ranges::find(_slots, &field, &Slot::field);
+    const auto slot = std::ranges::find(_slots, &field, &Slot::asked);
     const auto index =
         slot == _slots.end() ? slotOf(field.key) : static_cast<std::size_t>(slot - _slots.begin());
+    _slots[index].asked = &field;
     _next = index + 1;
     return index;
 }
@@ -35,7 +36,11 @@ bool FieldMemory::shows(std::size_t slot, const Field& field, std::int64_t raw,
 void FieldMemory::keep(std::size_t slot, const Field& field, const Record* record, std::int64_t raw,
                        bool isWorkedOut)
 {
-    _slots[slot] = {_slots[slot].key, &field, record, raw, isWorkedOut};
+    Slot& known = _slots[slot];
+    known.field = &field;
+    known.record = record;
+    known.raw = raw;
+    known.isWorkedOut = isWorkedOut;
 }
 
 std::optional<ValueOrigin> FieldMemory::originOf(std::size_t slot) const

@@ -34,7 +34,8 @@ class FieldMemory
   private:
     struct Slot {
         std::string_view key;
-        const Field* field = nullptr;
+        const Field* asked = nullptr; // the field that the slot was last asked for
+        const Field* field = nullptr; // whose number shows
         const Record* record = nullptr;
         std::int64_t raw = 0;
         bool isWorkedOut = false;

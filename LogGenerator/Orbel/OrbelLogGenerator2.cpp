@@ -49,7 +49,7 @@ void OrbelLogGenerator2::updateWithData(ByteView data)
 {
     if (data.size() < logPacketHeaderSize)
         return;
-    const LogPacket packet(stripPrefix(data));
+    const LogPacket packet(stripPrefix(data), _propertyLists);
     const std::uint8_t type = packet.u8(0);
     if (type != ordinaryPacketType && type != extraCodePacketType) {
         log().error("Invalid log type: {:x}. Dropping.", type);

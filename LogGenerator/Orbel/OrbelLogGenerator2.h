@@ -54,6 +54,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
 
     std::string pListName;
     std::shared_ptr<ClassIndex> cIndex;
+    PropertyListMemory _propertyLists;
     // The display that our sections are bound to.
     WeakContainer _boundDisplay;
     bool _cannotBuild = false; // the template holds what no template may hold

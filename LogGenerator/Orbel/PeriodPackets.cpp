@@ -46,6 +46,8 @@ Bytes PeriodPackets::take()
     // The history keeps them for long.
     if (packets.capacity() > 2 * packets.size())
         packets.shrink_to_fit();
+    // The next period will be much like this one.
+    _bytes.reserve(packets.size());
     return packets;
 }
 

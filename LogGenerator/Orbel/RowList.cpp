@@ -58,7 +58,7 @@ void RowList::Rewrite::nextText(const Field& field, std::int64_t raw, std::size_
     if (!isNew && isShown(field, raw, false))
         return;
     copyArray();
-    std::string text = field.shown.textOf(raw).value_or("");
+    std::string text = _list._texts.textOf(field, raw).value_or("");
     if (isNew)
         _array.append(std::move(text));
     else
@@ -82,8 +82,8 @@ void RowList::Rewrite::show(const Field& field, std::int64_t raw)
 {
     if (isShown(field, raw, false))
         return;
-    if (auto text = field.shown.textOf(raw))
-        store(field.key, std::move(*text), {&field, raw, false});
+    if (const auto& text = _list._texts.textOf(field, raw))
+        store(field.key, *text, {&field, raw, false});
 }
 
 void RowList::Rewrite::showWorkedOut(const Field& field, std::int64_t number)
@@ -104,11 +104,18 @@ void RowList::Rewrite::show(std::span<const Field> fields, const LogPacket& elem
         show(field, numberOf(element, field));
 }
 
-void RowList::Rewrite::show(const Field& field, std::int64_t raw,
-                            PlistArray (*texts)(std::int64_t raw))
+void RowList::Rewrite::showTexts(const Field& field, std::int64_t raw, const Field& element)
 {
-    if (!isShown(field, raw, false))
-        store(field.key, texts(raw), {&field, raw, false});
+    if (isShown(field, raw, false))
+        return;
+    const unsigned width = element.place.width;
+    PlistArray texts;
+    texts.reserve(field.place.width / width);
+    for (unsigned bit = 0; bit + width <= field.place.width; bit += width) {
+        const std::int64_t part = raw >> bit & ((std::int64_t{1} << width) - 1);
+        texts.append(_list._texts.textOf(element, part).value_or(""));
+    }
+    store(field.key, texts, {&field, raw, false});
 }
 
 PlistArray RowList::Rewrite::showElements(const List& list, const LogPacket& packet)

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Core/ValueOrigin.h"
 #include "LogGenerator/Orbel/ArrayLock.h"
+#include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
 #include <string_view>
@@ -44,6 +45,7 @@ class RowList
     };
 
     std::vector<Row> _rows;
+    TextMemory _texts;
 };
 
 /// Writes a list anew, from its first row on, under the array lock. What it is not given goes: rows
@@ -71,8 +73,8 @@ class RowList::Rewrite
     void showValue(std::string_view key, PlistValue value);
 
     void show(std::span<const Field> fields, const LogPacket& element);
-    /// Shows the texts that are made of the raw number.
-    void show(const Field& field, std::int64_t raw, PlistArray (*texts)(std::int64_t raw));
+    /// Shows a list of texts: so many as the element's places, one behind the other, the field has.
+    void showTexts(const Field& field, std::int64_t raw, const Field& element);
 
     /// Adds the elements of a list, a row for each that is complete, or a text; and ends the list.
     /// Gives the array that holds it now.

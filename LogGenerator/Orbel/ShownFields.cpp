@@ -25,9 +25,9 @@ void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int
     const std::size_t slot = _memory.slotOf(field);
     if (_memory.shows(slot, field, raw, false))
         return;
-    if (auto text = field.shown.textOf(raw)) {
+    if (const auto& text = _texts.textOf(field, raw)) {
         _memory.keep(slot, field, _record, raw, false);
-        store(dictionary, slot, field.key, std::move(*text));
+        store(dictionary, slot, field.key, *text);
     }
 }
 

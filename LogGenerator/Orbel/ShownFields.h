@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Orbel/FieldMemory.h"
+#include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
 #include <string_view>
@@ -37,6 +38,7 @@ class ShownFields
                PlistValue value);
 
     FieldMemory _memory;
+    TextMemory _texts;
     std::vector<std::size_t> _places; // of each slot's key in the dictionary
     const Record* _record = nullptr;
     std::size_t _removals = 0; // of the dictionary, as far as is known

@@ -38,6 +38,9 @@ class C2KProcessTemplateTest : public testing::Test
     PlistDictionary lookup;
 };
 
+constexpr Field valueField{"k", u8(0)};
+constexpr Field channelField{"kChannel", u8(0)};
+
 class C2KOutputTest : public testing::Test
 {
   protected:
@@ -45,7 +48,7 @@ class C2KOutputTest : public testing::Test
     {
         C2KLabels labels;
         labels.useLookup(&lookup);
-        C2KOutput(labels, state, log).publish("k", "v");
+        C2KOutput(labels, state, log).publish(valueField, "v");
     }
 
     CapturingSystemLog log;
@@ -262,7 +265,7 @@ TEST_F(C2KProcessTemplateTest, OnePublishedValueFillsAllItsLabels)
     PlistDictionary state;
     C2KLabels labels;
     labels.useLookup(&lookup);
-    C2KOutput(labels, state, log).publish("kChannel", "283");
+    C2KOutput(labels, state, log).publish(channelField, "283");
     EXPECT_EQ(textAt(display, {"Channel"}), "283");
     EXPECT_EQ(textAt(display, {"Status", "Number"}), "283");
 }
@@ -316,7 +319,7 @@ TEST_F(C2KOutputTest, AnUnchangedValueIsNotStoredAgain)
     EXPECT_EQ(textAt(display, {"A"}), "mine");
     labels.publish(field, nullptr, 6);
     EXPECT_EQ(textAt(display, {"A"}), "6");
-    labels.publish("k", "N/A");
+    labels.publish(field, "N/A");
     labels.publish(field, nullptr, 6);
     EXPECT_EQ(textAt(display, {"A"}), "6");
 }
@@ -337,17 +340,18 @@ TEST_F(C2KOutputTest, AnotherLookupIsFilledAnew)
 
 TEST_F(C2KOutputTest, AGroupOfPilotsThatChangesIsANewGroup)
 {
+    constexpr Field field{"k", u8(0)};
     lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
     C2KLabels labels;
     labels.useLookup(&lookup);
-    labels.publish("k", {{0, 12, -3.5}}, "(none)");
+    labels.publish(field, {{0, 12, -3.5}}, "(none)");
     const PlistDictionary before = *display.find("A")->dictionary();
-    labels.publish("k", {{0, 12, -3.5}}, "(none)");
+    labels.publish(field, {{0, 12, -3.5}}, "(none)");
     EXPECT_TRUE(display.find("A")->dictionary()->isSameContainer(before));
-    labels.publish("k", {{0, 12, -4}}, "(none)");
+    labels.publish(field, {{0, 12, -4}}, "(none)");
     EXPECT_EQ(textAt(before, {"0;12"}), "-3.50 dB");
     EXPECT_EQ(textAt(display, {"A", "0;12"}), "-4.00 dB");
-    labels.publish("k", std::vector<ShownPilot>(), "(none)");
+    labels.publish(field, std::vector<ShownPilot>(), "(none)");
     EXPECT_EQ(textAt(display, {"A"}), "(none)");
 }
 

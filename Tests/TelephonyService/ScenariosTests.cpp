@@ -42,7 +42,7 @@ TEST(Scenarios, TheSeedReachesTheScenario)
 
 TEST(Scenarios, ATechnologyWithoutAScenarioGetsNone)
 {
-    EXPECT_EQ(makeScenario({200, "kQXLogChannelTechnology_Other", "other"}, 1), nullptr);
+    EXPECT_EQ(makeScenario({"kQXLogChannelTechnology_Other", "other", 200, "Other"}, 1), nullptr);
 }
 
 } // namespace ventrik

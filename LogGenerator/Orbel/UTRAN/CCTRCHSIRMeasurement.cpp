@@ -2,8 +2,6 @@
 
 #include "Packets/UTRANRecords.h"
 
-#include <fmt/format.h>
-
 namespace ventrik
 {
 
@@ -16,14 +14,6 @@ constexpr SectionTable table{
     .records = {{{.record = &UTRANRecords::transportChannelMeasurement}}},
     .unknownCode = UnknownCode::Ignored,
 };
-
-PlistArray slotRatios(std::int64_t bytes)
-{
-    PlistArray ratios;
-    for (std::size_t slot = 0; slot < UTRANRecords::slotCount; ++slot)
-        ratios.append(fmt::format("{}", bytes >> (8 * slot) & 0xFF));
-    return ratios;
-}
 
 } // namespace
 
@@ -38,7 +28,7 @@ void CCTRCHSIRMeasurement::decode(const ShownRecord& shown, const LogPacket& pac
         const LogPacket channel = channels.element(packet, i);
         rows.nextRow(channels.offset + channels.stride * i);
         rows.show(fields.first(2), channel);
-        rows.show(fields.back(), numberOf(channel, fields.back()), slotRatios);
+        rows.showTexts(fields.back(), numberOf(channel, fields.back()), UTRANRecords::slotRatio);
     }
 }
 

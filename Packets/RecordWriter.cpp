@@ -50,7 +50,9 @@ const Field& FieldWriter::find(std::string_view name) const
 {
     if (const Field* field = findField(_groups, name))
         return *field;
-    throw std::invalid_argument(fmt::format("no field \"{}\" in the part at {}", name, _start));
+    throw std::invalid_argument(fmt::format("record 0x{:04X} has no field \"{}\" in the part at {}",
+                                            effectiveLogCode(LogPacket(_packet.written())), name,
+                                            _start));
 }
 
 RecordWriter::RecordWriter(const Record& record) : _record(record), _packet(record.logCode)

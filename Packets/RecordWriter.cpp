@@ -75,7 +75,7 @@ FieldWriter RecordWriter::add(const List& list)
 {
     const std::size_t index = _elements[&list]++;
     const std::size_t start = startOf(list) + list.stride * index;
-    _packet.size(start + list.stride);
+    fillUpTo(start + list.stride);
     // Another list of the record may have counted as many with the same number.
     const auto count =
         static_cast<std::int64_t>(index + 1) - static_cast<std::int64_t>(list.count.more);
@@ -86,7 +86,8 @@ FieldWriter RecordWriter::add(const List& list)
 
 RecordWriter& RecordWriter::begin(const List& list)
 {
-    return size(startOf(list));
+    fillUpTo(startOf(list));
+    return *this;
 }
 
 FieldWriter RecordWriter::at(const RecordElements& elements, std::size_t index,
@@ -117,6 +118,11 @@ const Field& RecordWriter::find(std::string_view name) const
     if (const Field* field = _record.find(name))
         return *field;
     throw std::invalid_argument(fmt::format("{} has no field \"{}\"", _record.name, name));
+}
+
+void RecordWriter::fillUpTo(std::size_t size)
+{
+    _packet.size(std::max(size, _packet.written().size()));
 }
 
 std::size_t RecordWriter::startOf(const List& list) const

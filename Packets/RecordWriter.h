@@ -54,8 +54,8 @@ class RecordWriter
     RecordWriter& set(std::string_view field, std::int64_t raw);
     RecordWriter& level(std::string_view field, double value);
 
-    /// Appends an element of zeros to a list of the record, and counts it. A list that begins
-    /// behind another one is written after that one.
+    /// Appends an element to a list of the record, and counts it: zeros, but where another list
+    /// lies in its place. A list that begins behind another one is written after that one.
     FieldWriter add(const List& list);
     /// Fills the packet up to where the list begins.
     RecordWriter& begin(const List& list);
@@ -71,6 +71,7 @@ class RecordWriter
 
   private:
     const Field& find(std::string_view name) const;
+    void fillUpTo(std::size_t size);
     std::size_t startOf(const List& list) const;
 
     const Record& _record;

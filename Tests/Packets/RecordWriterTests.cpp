@@ -197,6 +197,31 @@ TEST(RecordWriter, OneNumberCountsTwoLists)
     EXPECT_EQ(payloadOf(writer), (Bytes{3, /**/ 7, 8, 9, /**/ 2, 1, 4, 3, 6, 5}));
 }
 
+TEST(RecordWriter, AListOverAnotherLeavesWhatReachesBehindIt)
+{
+    const List wide{
+        .key = "", .offset = 15, .stride = 3, .needed = 3, .count = {u8(13)}, .fields = cellFields};
+    const List narrow{.key = "",
+                      .offset = 15,
+                      .stride = 2,
+                      .needed = 2,
+                      .count = {u8(14)},
+                      .fields = carrierFields};
+    const Record record{0x1234, "Sample", 15, {}, {&wide, &narrow}};
+    RecordWriter writer(record);
+    writer.add(wide).set("Cell", 7).set("RSSI", 8);
+    writer.add(wide).set("Cell", 9).set("RSSI", 10);
+    writer.add(narrow).set("Carrier", 0x0102);
+    EXPECT_EQ(payloadOf(writer), (Bytes{2, 1, /**/ 2, 1, 0, 9, 10, 0}));
+}
+
+TEST(RecordWriter, BeginningAListLeavesWhatReachesBehindItsPlace)
+{
+    RecordWriter record(sample);
+    record.add(cells).set("Cell", 7);
+    EXPECT_EQ(payloadOf(record.begin(cells)), (Bytes{0, 0, 0, 0, 0, 0, 0, 1, 0, /**/ 7, 0, 0}));
+}
+
 TEST(RecordWriter, BeginningAListFillsThePacketUpToIt)
 {
     const List list{.key = "", .offset = 20, .stride = 1, .needed = 1, .count = {u8(13)}};

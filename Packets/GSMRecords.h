@@ -337,7 +337,7 @@ inline constexpr std::array<Field, 1> rrcStateFields{{
 }};
 inline constexpr Record rrcState{0x4125, "UMTS RRC state", 14, {rrcStateFields}};
 
-// Transmit power: samples in tenths of a dB above -121.2 dBm, 0: no sample. Their mean shows.
+// Transmit power: samples in tenths of a dB above -18.8 dBm, 0: no sample. Their mean shows.
 inline constexpr Field transmitPowerMean{"Transmit Power", {}, dbm()};
 inline constexpr std::array<Field, 1> powerSampleFields{{{"power", i16(4)}}};
 inline constexpr List powerSamples{

@@ -3,8 +3,10 @@
 #include "PropertyList/PlistValue.h"
 #include "PropertyList/PropertyListReader.h"
 
+#include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <memory>
 #include <vector>
 
@@ -70,7 +72,7 @@ class LogPacket
     }
     std::uint32_t u32(std::size_t offset) const
     {
-        return std::uint32_t{u16(offset)} | std::uint32_t{u16(offset + 2)} << 16;
+        return static_cast<std::uint32_t>(littleEndianWord(offset));
     }
     std::uint16_t u16BigEndian(std::size_t offset) const
     {
@@ -96,8 +98,11 @@ inline std::uint64_t LogPacket::littleEndianWord(std::size_t offset) const
     constexpr std::size_t wordSize = sizeof(std::uint64_t);
     const auto wordAt = [&](std::size_t start) {
         std::uint64_t word = 0;
-        for (std::size_t i = 0; i < wordSize; ++i)
-            word |= std::uint64_t{_bytes[start + i]} << (8 * i);
+        if constexpr (std::endian::native == std::endian::little)
+            std::memcpy(&word, _bytes.data() + start, wordSize);
+        else
+            for (std::size_t i = 0; i < wordSize; ++i)
+                word |= std::uint64_t{_bytes[start + i]} << (8 * i);
         return word;
     };
     if (offset + wordSize <= size())

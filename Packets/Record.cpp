@@ -1,5 +1,7 @@
 #include "Packets/Record.h"
 
+#include "Packets/DecimalText.h"
+
 #include <algorithm>
 
 #include <fmt/compile.h>
@@ -19,7 +21,7 @@ std::string withRawNumber(std::string_view text, std::int64_t raw)
     return fmt::format(FMT_COMPILE("{}{}{}"), text.substr(0, gap), raw, text.substr(gap + 2));
 }
 
-void appendNumber(fmt::memory_buffer& text, Digits digits, double number)
+void appendNumber(std::string& text, Digits digits, double number)
 {
     const auto out = std::back_inserter(text);
     const auto whole = [&] { return static_cast<std::int64_t>(number); };
@@ -31,10 +33,10 @@ void appendNumber(fmt::memory_buffer& text, Digits digits, double number)
         fmt::format_to(out, FMT_COMPILE("{:+}"), whole());
         break;
     case Digits::TwoDecimals:
-        fmt::format_to(out, FMT_COMPILE("{:>4.2f}"), number);
+        appendTwoDecimals(text, number);
         break;
     case Digits::SignedTwoDecimals:
-        fmt::format_to(out, FMT_COMPILE("{:+.2f}"), number);
+        appendTwoDecimals(text, number, true);
         break;
     case Digits::SixDecimals:
         fmt::format_to(out, FMT_COMPILE("{:f}"), number);
@@ -72,13 +74,13 @@ std::optional<std::string> Shown::textOf(std::int64_t raw) const
 
 std::string Shown::textOfNumber(double number) const
 {
-    fmt::memory_buffer shown;
+    std::string shown;
     appendNumber(shown, digits, number);
     if (!unit.empty()) {
-        shown.push_back(' ');
-        shown.append(unit);
+        shown += ' ';
+        shown += unit;
     }
-    return {shown.data(), shown.size()};
+    return shown;
 }
 
 RecordElements List::elementsOf(const LogPacket& packet) const

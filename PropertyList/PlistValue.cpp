@@ -26,6 +26,12 @@ struct KeyHash {
     }
 };
 
+// Keys of one length mostly differ in their last character already.
+bool isSame(std::string_view a, std::string_view b)
+{
+    return a.size() == b.size() && (a.empty() || (a.back() == b.back() && a == b));
+}
+
 } // namespace
 
 std::string PlistInteger::decimal() const
@@ -117,7 +123,7 @@ struct PlistDictionary::Storage {
             return found == places.end() ? std::nullopt : std::optional(found->second);
         }
         for (std::size_t i = 0; i < entries.size(); ++i)
-            if (entries[i].key == key)
+            if (isSame(entries[i].key, key))
                 return i;
         return std::nullopt;
     }
@@ -244,6 +250,11 @@ const PlistDictionary::Entry* PlistDictionary::end() const
 PlistDictionary PlistDictionary::copy() const
 {
     return PlistDictionary(std::make_shared<Storage>(*_storage));
+}
+
+std::size_t PlistDictionary::handleCount() const
+{
+    return static_cast<std::size_t>(_storage.use_count());
 }
 
 bool PlistDictionary::operator==(const PlistDictionary& other) const

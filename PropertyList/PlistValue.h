@@ -126,6 +126,8 @@ class PlistDictionary
 
     /// A new dictionary of the same entries; nested containers stay shared.
     PlistDictionary copy() const;
+    /// How many handles share the container, this one included.
+    std::size_t handleCount() const;
     bool isSameContainer(const PlistDictionary& other) const { return _storage == other._storage; }
     /// Equal keys with equal values, in any order.
     bool operator==(const PlistDictionary& other) const;

@@ -3,7 +3,9 @@
 #include "Packets/ShownNumbers.h"
 
 #include <bit>
+#include <utility>
 
+#include <fmt/compile.h>
 #include <fmt/format.h>
 
 namespace ventrik
@@ -14,14 +16,35 @@ namespace
 
 constexpr Shown pilotLevel{.digits = Digits::SignedTwoDecimals, .unit = "dB"};
 
-PlistDictionary groupOf(const std::vector<ShownPilot>& pilots)
+std::string textOf(const ShownPilot& pilot)
 {
-    // The display sorts the group.
-    PlistDictionary group{{"_sorted", "_sorted"}};
-    for (const ShownPilot& pilot : pilots)
-        group.set(fmt::format("{};{}", pilot.index, pilot.pnOffset),
-                  (pilot.isReference ? "(ref pilot) " : "") + pilotLevel.textOfNumber(pilot.level));
-    return group;
+    std::string level = pilotLevel.textOfNumber(pilot.level);
+    return pilot.isReference ? "(ref pilot) " + level : level;
+}
+
+std::string keyOf(const ShownPilot& pilot)
+{
+    return fmt::format(FMT_COMPILE("{};{}"), pilot.index, pilot.pnOffset);
+}
+
+// Brings the group from the pilots that it shows to others.
+void update(PlistDictionary& group, const std::vector<ShownPilot>& pilotsBefore,
+            const std::vector<ShownPilot>& pilots)
+{
+    constexpr std::string_view marker = "_sorted"; // the display sorts the group
+    if (group.empty())
+        group.set(marker, marker);
+    std::size_t i = 0;
+    for (; i < pilots.size() && i < pilotsBefore.size(); ++i) {
+        if (pilots[i].index != pilotsBefore[i].index ||
+            pilots[i].pnOffset != pilotsBefore[i].pnOffset)
+            break;
+        if (!(pilots[i] == pilotsBefore[i]))
+            group.entryAt(i + 1)->value = textOf(pilots[i]);
+    }
+    group.truncate(i + 1);
+    for (; i < pilots.size(); ++i)
+        group.set(keyOf(pilots[i]), textOf(pilots[i]));
 }
 
 } // namespace
@@ -82,9 +105,14 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
     if (labels.isGroup && labels.pilots == pilots)
         return;
     _memory.keepNone(slot);
+    // Whoever else holds the group keeps it as it was.
+    const bool isOurs = labels.group.handleCount() <= 1 + labels.targets.size();
+    if (!isOurs)
+        labels.group = labels.group.copy();
+    update(labels.group, labels.pilots, pilots);
     labels.pilots = pilots;
-    labels.isGroup = true;
-    store(labels, groupOf(pilots));
+    if (!isOurs || !std::exchange(labels.isGroup, true))
+        store(labels, labels.group);
 }
 
 std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
@@ -120,15 +148,24 @@ std::vector<C2KLabels::Target> C2KLabels::targetsOf(std::string_view lookupKey) 
         const PlistValue* group = entry ? entry->find("dict") : nullptr;
         if (!label || !label->string() || !group || !group->dictionary())
             break;
-        targets.push_back({*group->dictionary(), *label->string()});
+        targets.push_back({*group->dictionary(), *label->string(), 0});
     }
     return targets;
 }
 
-void C2KLabels::store(Labels& labels, const PlistValue& value)
+void C2KLabels::store(Labels& labels, PlistValue value)
 {
-    for (Target& target : labels.targets)
-        target.group.set(target.label, value);
+    for (Target& target : labels.targets) {
+        const bool isLast = &target == &labels.targets.back();
+        PlistValue stored = isLast ? std::move(value) : value;
+        PlistDictionary::Entry* entry = target.group.entryAt(target.place);
+        if (entry && entry->key == target.label) {
+            entry->value = std::move(stored);
+        } else {
+            target.group.set(target.label, std::move(stored));
+            target.place = target.group.placeOf(target.label).value_or(0);
+        }
+    }
 }
 
 } // namespace ventrik

@@ -49,17 +49,19 @@ class C2KLabels
     struct Target {
         PlistDictionary group;
         std::string label;
+        std::size_t place; // of the label in the group, as far as is known
     };
     struct Labels {
         std::vector<Target> targets;
         std::string text;               // that no field describes; else empty
         std::vector<ShownPilot> pilots; // likewise
+        PlistDictionary group;          // of the pilots
         bool isGroup = false;
     };
 
     Labels& labelsOf(std::size_t slot, const Field& field);
     std::vector<Target> targetsOf(std::string_view lookupKey) const;
-    static void store(Labels& labels, const PlistValue& value);
+    static void store(Labels& labels, PlistValue value);
 
     std::optional<PlistDictionary> _lookup;
     FieldMemory _memory;

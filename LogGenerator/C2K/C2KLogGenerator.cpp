@@ -71,8 +71,9 @@ PlistDictionary C2KLogGenerator::getStartCommand() const
 void C2KLogGenerator::updateState(PlistDictionary& state, ByteView data)
 {
     ensureDisplay(state);
-    const PlistValue* lookup = state.find(StateKey::lookup);
-    updateFromLog(data, lookup ? lookup->dictionary() : nullptr, state);
+    const PlistDictionary::Entry* entry = state.entryAt(_lookupPlace);
+    const bool isKnown = entry && entry->key == StateKey::lookup;
+    updateFromLog(data, isKnown ? entry->value.dictionary() : nullptr, state);
 }
 
 void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup,
@@ -123,9 +124,14 @@ std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& 
 
 const PlistValue* C2KLogGenerator::ensureDisplay(PlistDictionary& state)
 {
+    const PlistDictionary::Entry* entry = state.entryAt(_displayPlace);
+    if (entry && _display.refersTo(entry->value) && entry->key == StateKey::display)
+        return &entry->value;
     claimDisplay(state, templateName);
-    if (const PlistValue* display = state.find(StateKey::display))
+    if (const PlistValue* display = state.find(StateKey::display)) {
+        useDisplay(state);
         return display;
+    }
     const auto displayTemplate =
         loadTemplate(state, templateName, "Cannot load C2K template for display");
     if (!displayTemplate)
@@ -136,7 +142,15 @@ const PlistValue* C2KLogGenerator::ensureDisplay(PlistDictionary& state)
     state.set(StateKey::display, display);
     state.set(StateKey::lookup, lookup);
     state.set(StateKey::extraInfo, PlistDictionary());
+    useDisplay(state);
     return state.find(StateKey::display);
+}
+
+void C2KLogGenerator::useDisplay(const PlistDictionary& state)
+{
+    _display = WeakContainer(*state.find(StateKey::display));
+    _displayPlace = state.placeOf(StateKey::display).value_or(0);
+    _lookupPlace = state.placeOf(StateKey::lookup).value_or(0);
 }
 
 void C2KLogGenerator::processTemplate(const PlistDictionary& displayTemplate,

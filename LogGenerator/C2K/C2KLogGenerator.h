@@ -38,8 +38,14 @@ class C2KLogGenerator : public OrbelLogGenerator
 
     /// The display in the state, built on first use; null when the template cannot be loaded.
     const PlistValue* ensureDisplay(PlistDictionary& state);
+    /// The display in the state is ours from now on.
+    void useDisplay(const PlistDictionary& state);
 
     C2KLabels _labels;
+    // The display that was made of our template; and where it and its lookup are in the state.
+    WeakContainer _display;
+    std::size_t _displayPlace = 0;
+    std::size_t _lookupPlace = 0;
 };
 
 } // namespace ventrik

@@ -7,6 +7,9 @@
 
 #include <array>
 
+#include <fmt/compile.h>
+#include <fmt/format.h>
+
 namespace ventrik
 {
 
@@ -63,7 +66,8 @@ void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t
             sequence - static_cast<std::uint32_t>(previousSequence->bits()));
         const auto added = static_cast<double>(sent - previousSent->signedBits());
         if (steps >= 1)
-            output.publish(direction.rate, fmt::format("{:.2f} kbps", added / (steps * 1024.0)));
+            output.publish(direction.rate,
+                           fmt::format(FMT_COMPILE("{:.2f} kbps"), added / (steps * 1024.0)));
         output.keepExtra(direction.sequence2Key, *previousSequence);
         output.keepExtra(direction.sent2Key, *previousSent);
     } else {
@@ -84,11 +88,10 @@ std::uint32_t sequenceNumber(const LogPacket& packet, const Field& field)
 
 void decodeForwardDataRate(const LogPacket& packet, const C2KOutput& output)
 {
-    constexpr const Field& counter = C2KRecords::packetCounterFields.front();
+    const RecordElements& kinds = C2KRecords::forwardCounters;
     std::int64_t sent = 0;
-    for (std::size_t kind = 0; kind < forwardBits.size(); ++kind)
-        sent += numberOf(C2KRecords::forwardCounters.element(packet, kind), counter) *
-                forwardBits.at(kind);
+    for (std::size_t kind = 0; kind < kinds.count; ++kind)
+        sent += packet.u32(kinds.offset + kinds.stride * kind) * forwardBits.at(kind);
     updateRate(forward, sequenceNumber(packet, C2KRecords::forwardPacketsUnshown.front()), sent,
                output);
 }
@@ -98,9 +101,11 @@ void decodeReverseDataRate(const LogPacket& packet, const C2KOutput& output)
     const RecordElements& sizes = C2KRecords::reverseCounters;
     std::int64_t sent = 0;
     for (std::size_t i = 0; i < sizes.count; ++i) {
-        const LogPacket counters = sizes.element(packet, i);
-        for (const Field& counter : C2KRecords::payloadCounterFields)
-            sent += numberOf(counters, counter) * reverseBits.at(i % reverseBits.size());
+        const std::size_t start = sizes.offset + sizes.stride * i;
+        std::int64_t packets = 0;
+        for (std::size_t counter = 0; counter < C2KRecords::payloadCounterFields.size(); ++counter)
+            packets += packet.u32(start + C2KRecords::payloadCounterFields[counter].place.offset);
+        sent += packets * reverseBits.at(i % reverseBits.size());
     }
     updateRate(reverse, sequenceNumber(packet, C2KRecords::reversePacketsUnshown.front()), sent,
                output);

@@ -4,8 +4,7 @@
 #include "LogGenerator/C2K/SubpacketSearch.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/C2KRecords.h"
-
-#include <fmt/compile.h>
+#include "Packets/DecimalText.h"
 
 namespace ventrik
 {
@@ -28,7 +27,9 @@ std::optional<float> keptRate(const PlistDictionary& state)
 
 std::string percent(float rate)
 {
-    return fmt::format(FMT_COMPILE("{:.2f}%"), static_cast<double>(rate * 100.0F));
+    std::string text;
+    appendTwoDecimals(text, static_cast<double>(rate * 100.0F));
+    return text += '%';
 }
 
 } // namespace
@@ -41,9 +42,13 @@ void decodeOneXTrafficFER(const LogPacket& packet, const C2KOutput& output)
         return;
     }
     float rate = numberOf(*demodulation, C2KRecords::frameErasure) != 0 ? newShare : 0.0F;
-    if (const auto previous = keptRate(output.state()))
-        rate += *previous * oldShare;
-    output.state().set(StateKey::trafficFER, static_cast<double>(rate));
+    PlistValue* kept = output.state().find(StateKey::trafficFER);
+    if (kept && kept->real()) {
+        rate += static_cast<float>(*kept->real()) * oldShare;
+        *kept = static_cast<double>(rate);
+    } else {
+        output.state().set(StateKey::trafficFER, static_cast<double>(rate));
+    }
     output.publish(frameErasureRate, percent(rate));
 }
 

@@ -5,6 +5,7 @@
 
 #include <array>
 
+#include <fmt/compile.h>
 #include <fmt/format.h>
 
 namespace ventrik
@@ -28,7 +29,7 @@ PlistDictionary makeHistoryEntry(const PlistDictionary& state, const std::string
         entry.set(key, value->copy());
     }
     entry.set(HistoryKey::date, date);
-    entry.set(HistoryKey::description, fmt::format("Snapshot ({})", date));
+    entry.set(HistoryKey::description, fmt::format(FMT_COMPILE("Snapshot ({})"), date));
     return entry;
 }
 

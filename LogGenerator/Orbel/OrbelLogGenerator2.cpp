@@ -88,16 +88,17 @@ std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionar
 
 const PlistValue* OrbelLogGenerator2::ensureDisplay(PlistDictionary& state)
 {
-    const PlistValue* display = state.find(StateKey::display);
-    if (display && _boundDisplay.refersTo(*display))
-        return display;
+    const PlistDictionary::Entry* entry = state.entryAt(_displayPlace);
+    if (entry && _boundDisplay.refersTo(entry->value) && entry->key == StateKey::display)
+        return &entry->value;
     claimDisplay(state, pListName);
-    display = state.find(StateKey::display);
+    const PlistValue* display = state.find(StateKey::display);
+    _displayPlace = state.placeOf(StateKey::display).value_or(0);
     if (display) {
         // After a restart the display of the generator before us is still in the state: values go
         // on where they stood, so our sections take over its containers.
         const PlistValue* displayTemplate = state.find(StateKey::displayTemplate);
-        if (displayTemplate && display->dictionary()) {
+        if (displayTemplate && display->dictionary() && !_boundDisplay.refersTo(*display)) {
             bindSections(*displayTemplate, *display);
             _boundDisplay = WeakContainer(*display);
         }

@@ -57,7 +57,8 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     PropertyListMemory _propertyLists;
     // The display that our sections are bound to.
     WeakContainer _boundDisplay;
-    bool _cannotBuild = false; // the template holds what no template may hold
+    std::size_t _displayPlace = 0; // in the state, as far as is known
+    bool _cannotBuild = false;     // the template holds what no template may hold
 };
 
 } // namespace ventrik

@@ -265,6 +265,15 @@ TEST(PlistDictionary, CountsHowOftenEntriesWereRemoved)
     EXPECT_EQ(dictionary.removalCount(), 3U);
 }
 
+TEST(PlistDictionary, CountsTheHandlesThatShareIt)
+{
+    const PlistDictionary dictionary;
+    EXPECT_EQ(dictionary.handleCount(), 1U);
+    const PlistArray holder{dictionary};
+    EXPECT_EQ(dictionary.handleCount(), 2U);
+    EXPECT_EQ(dictionary.copy().handleCount(), 1U);
+}
+
 TEST(PlistDictionary, TruncatingRemovesTheEntriesBehindTheFirstOnes)
 {
     PlistDictionary dictionary{{"a", 1}, {"b", 2}, {"c", 3}};

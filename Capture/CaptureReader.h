@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Platform/Technology.h"
 #include "Platform/Clock.h"
+#include "Platform/Technology.h"
 #include "PropertyList/PlistValue.h"
 
 #include <memory>

@@ -28,8 +28,7 @@ CaptureWriter::CaptureWriter(PrivateFile file, std::unique_ptr<pcap, Closer> han
 }
 
 std::optional<CaptureWriter> CaptureWriter::create(const std::string& path,
-                                                   const Technology& technology,
-                                                   std::string& error)
+                                                   const Technology& technology, std::string& error)
 {
     auto file = PrivateFile::create(path, error);
     if (!file)

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "Platform/Technology.h"
 #include "Files/PrivateFile.h"
 #include "Platform/Clock.h"
+#include "Platform/Technology.h"
 #include "PropertyList/PlistValue.h"
 
 #include <memory>
@@ -25,8 +25,8 @@ class CaptureWriter
 
     /// Begins a file that takes its name, and the place of what has it, at `commit`. On failure
     /// `error` says why in one line.
-    static std::optional<CaptureWriter>
-    create(const std::string& path, const Technology& technology, std::string& error);
+    static std::optional<CaptureWriter> create(const std::string& path,
+                                               const Technology& technology, std::string& error);
 
     /// False, with nothing written, for a message above `maximumMessageSize`; false also when the
     /// file cannot be written, which `commit` explains.

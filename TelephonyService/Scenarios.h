@@ -10,7 +10,6 @@ namespace ventrik
 {
 
 /// The built-in scenario of a technology; none where there is no such scenario.
-std::unique_ptr<MessageSource> makeScenario(const Technology& technology,
-                                            std::uint32_t seed);
+std::unique_ptr<MessageSource> makeScenario(const Technology& technology, std::uint32_t seed);
 
 } // namespace ventrik

@@ -222,7 +222,7 @@ class Decoding
 };
 
 std::optional<Technology> chooseTechnology(const DecodeOptions& options,
-                                                  const CaptureReader& reader)
+                                           const CaptureReader& reader)
 {
     const auto technology = options.technology ? options.technology : reader.technology();
     if (!technology)

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Platform/Technology.h"
 #include "Platform/SystemLog.h"
+#include "Platform/Technology.h"
 
 #include <cstdio>
 #include <optional>

@@ -1,5 +1,5 @@
-#include "Platform/Technology.h"
 #include "LogGenerator/Core/LogGenerator.h"
+#include "Platform/Technology.h"
 #include "Tests/Support/FixedClock.h"
 #include "Tests/Support/MemoryResources.h"
 #include "Tests/Support/ResourceFiles.h"

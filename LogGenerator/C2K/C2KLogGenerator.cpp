@@ -72,8 +72,9 @@ void C2KLogGenerator::updateState(PlistDictionary& state, ByteView data)
 {
     ensureDisplay(state);
     const PlistDictionary::Entry* entry = state.entryAt(_lookupPlace);
-    const bool isKnown = entry && entry->key == StateKey::lookup;
-    updateFromLog(data, isKnown ? entry->value.dictionary() : nullptr, state);
+    const PlistValue* lookup =
+        entry && entry->key == StateKey::lookup ? &entry->value : state.find(StateKey::lookup);
+    updateFromLog(data, lookup ? lookup->dictionary() : nullptr, state);
 }
 
 void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup,

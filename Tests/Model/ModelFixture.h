@@ -1,8 +1,8 @@
 #pragma once
 
 #include "Model/VentrikModel.h"
-#include "Platform/TelephonyConstants.h"
 #include "Packets/PacketBuilder.h"
+#include "Platform/TelephonyConstants.h"
 #include "Tests/Support/FakePlatform.h"
 
 #include <gmock/gmock.h>

@@ -1,5 +1,7 @@
 #include "LogGenerator/Orbel/ETLDLF.h"
 
+#include "Packets/SharedRecords.h"
+
 #include <algorithm>
 #include <cstring>
 #include <span>
@@ -54,7 +56,7 @@ int ETLDLFAddVersionReport(std::uint8_t* buffer, std::size_t capacity, std::size
 
     RecordWriter record({buffer, etlDLFVersionReportSize});
     record.number(0, 2, etlDLFVersionReportSize);
-    record.number(2, 2, 0x1FFD);
+    record.number(2, 2, ventrik::SharedRecords::versionReport.logCode);
     record.number(16, 2, firstVersion);
     record.number(18, 2, secondVersion);
     record.text(20, 7, versionText);

@@ -34,8 +34,9 @@ class PacketSource
   public:
     explicit PacketSource(const LogGenerator& generator)
     {
+        const PlistDictionary command = generator.getStartCommand();
         for (const char* key : {"SetOrbelLogCodes", "SetQxExtraCodes"})
-            for (const PlistValue& code : *generator.getStartCommand().find(key)->array()) {
+            for (const PlistValue& code : *command.find(key)->array()) {
                 const auto number = static_cast<std::uint32_t>(code.integer()->bits());
                 _packets.push_back(key == std::string_view("SetOrbelLogCodes")
                                        ? PacketBuilder(number).size(64).build()

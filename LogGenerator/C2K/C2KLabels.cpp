@@ -106,12 +106,14 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
         return;
     _memory.keepNone(slot);
     // Whoever else holds the group keeps it as it was.
-    const bool isOurs = labels.group.handleCount() <= 1 + labels.targets.size();
-    if (!isOurs)
+    const bool wasShown = std::exchange(labels.isGroup, true);
+    const std::size_t ours = 1 + (wasShown ? labels.targets.size() : 0);
+    const bool isShared = labels.group.handleCount() > ours;
+    if (isShared)
         labels.group = labels.group.copy();
     update(labels.group, labels.pilots, pilots);
     labels.pilots = pilots;
-    if (!isOurs || !std::exchange(labels.isGroup, true))
+    if (isShared || !wasShown)
         store(labels, labels.group);
 }
 

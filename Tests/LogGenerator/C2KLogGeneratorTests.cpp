@@ -344,15 +344,33 @@ TEST_F(C2KOutputTest, AGroupOfPilotsThatChangesIsANewGroup)
     lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
     C2KLabels labels;
     labels.useLookup(&lookup);
-    labels.publish(field, {{0, 12, -3.5}}, "(none)");
+    labels.publish(field, {{0, 12, -3.5}}, "nothing");
     const PlistDictionary before = *display.find("A")->dictionary();
-    labels.publish(field, {{0, 12, -3.5}}, "(none)");
+    labels.publish(field, {{0, 12, -3.5}}, "nothing");
     EXPECT_TRUE(display.find("A")->dictionary()->isSameContainer(before));
-    labels.publish(field, {{0, 12, -4}}, "(none)");
+    labels.publish(field, {{0, 12, -4}}, "nothing");
     EXPECT_EQ(textAt(before, {"0;12"}), "-3.50 dB");
     EXPECT_EQ(textAt(display, {"A", "0;12"}), "-4.00 dB");
-    labels.publish(field, std::vector<ShownPilot>(), "(none)");
-    EXPECT_EQ(textAt(display, {"A"}), "(none)");
+    labels.publish(field, std::vector<ShownPilot>(), "nothing");
+    EXPECT_EQ(textAt(display, {"A"}), "nothing");
+}
+
+TEST_F(C2KOutputTest, PilotsThatComeAndGoLeaveAGroupThatSomebodyHolds)
+{
+    constexpr Field field{"k", u8(0)};
+    lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    labels.publish(field, {{0, 12, -3.5}}, "nothing");
+    const PlistDictionary held = *display.find("A")->dictionary();
+    const PlistDictionary heldAsWell = held;
+    for (int round = 0; round < 2; ++round) {
+        labels.publish(field, std::vector<ShownPilot>(), "nothing");
+        EXPECT_EQ(textAt(display, {"A"}), "nothing");
+        labels.publish(field, {{0, 12, -4}}, "nothing");
+        EXPECT_EQ(textAt(display, {"A", "0;12"}), "-4.00 dB");
+    }
+    EXPECT_EQ(textAt(held, {"0;12"}), "-3.50 dB");
 }
 
 TEST_F(C2KOutputTest, AnEntryThatIsNoneEndsThePublishing)

@@ -40,7 +40,6 @@ inline constexpr Field fingerPNOffset{"PN offset", u16(0)};
 inline constexpr Field fingerRatio{"C/I", u16(6), pilotStrength};
 inline constexpr std::array<Field, 2> fingerFields{fingerPNOffset, fingerRatio};
 inline constexpr List fingers{
-    .key = "",
     .offset = 23,
     .stride = 14,
     .needed = 14,
@@ -99,7 +98,6 @@ inline constexpr Field pilotPNOffset{"PN offset", u16(0)};
 inline constexpr Field pilotLevel{"strength", u16(2), pilotStrength};
 inline constexpr std::array<Field, 2> activeSetPilotFields{pilotPNOffset, pilotLevel};
 inline constexpr List activeSetPilotList{
-    .key = "",
     .offset = 25,
     .stride = 12,
     .needed = 12,

@@ -41,7 +41,6 @@ inline constexpr std::array<Field, 2> equivalentPLMNFields{{
 }};
 inline constexpr std::array<Field, 1> equivalentPLMNUnshown{{{"digits", bits(0, 0, 48)}}};
 inline constexpr List equivalentPLMNList{
-    .key = "",
     .offset = 17,
     .stride = 3,
     .needed = 6,
@@ -220,7 +219,6 @@ inline constexpr std::array<Field, 3> idleNeighborFields{{
     {"C1 Value", i32(3)},
 }};
 inline constexpr List idleNeighbors{
-    .key = "",
     .offset = 29,
     .stride = 14,
     .needed = 7,
@@ -246,7 +244,6 @@ inline constexpr std::array<Field, 2> bsicFields{{
     {"BSIC", u8(2)},
 }};
 inline constexpr List bsics{
-    .key = "",
     .offset = 15,
     .stride = 4,
     .needed = 3,
@@ -341,7 +338,6 @@ inline constexpr Record rrcState{0x4125, "UMTS RRC state", 14, {rrcStateFields}}
 inline constexpr Field transmitPowerMean{"Transmit Power", {}, dbm()};
 inline constexpr std::array<Field, 1> powerSampleFields{{{"power", i16(4)}}};
 inline constexpr List powerSamples{
-    .key = "",
     .offset = 16,
     .stride = 14,
     .needed = 6,
@@ -386,7 +382,6 @@ inline constexpr std::array<Field, 3> activeSetFields{{
 inline constexpr std::array<Field, 1> cellListUnshown{{{"receive AGC", i16(13)}}};
 inline constexpr Place listedCellCount = u8(15);
 inline constexpr List listedCells{
-    .key = "",
     .offset = 16,
     .stride = 15,
     .needed = 9,
@@ -394,7 +389,6 @@ inline constexpr List listedCells{
     .fields = listedCellFields,
 };
 inline constexpr List energies{
-    .key = "",
     .offset = 16,
     .stride = 44,
     .needed = 44,
@@ -422,7 +416,6 @@ inline constexpr std::array<Field, 4> rankedGSMCellFields{{
     {"Ranking Value", i16(5)},
 }};
 inline constexpr List rankedUMTSCells{
-    .key = "",
     .offset = 15,
     .stride = 10,
     .needed = 10,
@@ -430,7 +423,6 @@ inline constexpr List rankedUMTSCells{
     .fields = rankedUMTSCellFields,
 };
 inline constexpr List rankedGSMCells{
-    .key = "",
     .offset = 15,
     .stride = 7,
     .needed = 7,

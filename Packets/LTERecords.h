@@ -21,9 +21,9 @@ inline constexpr std::array<Mark, 6> bandwidths{{
 }}; // by resource blocks
 inline constexpr Shown bandwidth = marked(labels({}, "Unknown"), bandwidths);
 inline constexpr std::array<Field, 8> cellInfoFields{{
-    {"Physical Cell ID", u16(14)},
-    {"Download Frequency", u16(16)},
-    {"Upload Frequency", u16(18)},
+    {"Physical Cell ID", u16(14), physicalCellIdentity},
+    {"Download Frequency", u16(16), downlinkEARFCN},
+    {"Upload Frequency", u16(18), uplinkEARFCN},
     {"Download Bandwidth", u8(20), bandwidth},
     {"Upload Bandwidth", u8(21), bandwidth},
     {"Cell Identity", i32(22)},
@@ -45,13 +45,13 @@ inline constexpr std::array<Mark, 1> noThreshold{{{32, "Not Present"}}};
 inline constexpr std::array<std::string_view, 1> falseLabel{"False"};
 inline constexpr std::array<Field, 18> servingCellMeasurementFields{{
     {"Version", u8(13)},
-    {"E-ARFCN", u16(17)},
-    {"Physical Cell ID", bits(19, 0, 9)},
+    {"E-ARFCN", u16(17), downlinkEARFCN},
+    {"Physical Cell ID", bits(19, 0, 9), physicalCellIdentity},
     {"Serving Layer Priority", bits(19, 9, 4)},
-    {"Measured RSRP", bits(21, 0, 9), dbm(0.25, -140)},
-    {"Average RSRP", bits(22, 1, 9), dbm(0.25, -140)},
-    {"Measured RSRQ", bits(23, 2, 7), db(0.25, -30)},
-    {"Average RSRQ", bits(24, 1, 7), db(0.25, -30)},
+    {"Measured RSRP", bits(21, 0, 9), rsrp(0.25, -140)},
+    {"Average RSRP", bits(22, 1, 9), rsrp(0.25, -140)},
+    {"Measured RSRQ", bits(23, 2, 7), rsrq(0.25, -30)},
+    {"Average RSRQ", bits(24, 1, 7), rsrq(0.25, -30)},
     {"Measured RSSI", bits(25, 0, 9), dbm(0.5, -140)},
     {"Qrxlevmin", bits(26, 1, 6), wholeDbm(2, -140)},
     {"P_Max", bits(26, 7, 7), marked(wholeDbm(1, -30), noPower)},
@@ -69,20 +69,20 @@ inline constexpr Record servingCellMeasurement{
 
 // Connected-mode intra-frequency measurement
 inline constexpr std::array<Field, 5> connectedModeFields{{
-    {"E-ARFCN", u16(17)},
-    {"Serving Physical Cell ID", u16(19)},
+    {"E-ARFCN", u16(17), downlinkEARFCN},
+    {"Serving Physical Cell ID", u16(19), physicalCellIdentity},
     {"Subframe Number", u16(21)},
-    {"Serving Filtered RSRP", u16(23), dbm(0.25, -140)},
-    {"Serving Filtered RSRQ", u16(25), db(0.125, -20)},
+    {"Serving Filtered RSRP", u16(23), rsrp(0.25, -140)},
+    {"Serving Filtered RSRQ", u16(25), rsrq(0.125, -20)},
 }};
 inline constexpr std::array<Field, 3> measuredNeighborFields{{
-    {"Physical Cell ID", u16(0)},
-    {"Filtered RSRP", u16(2), dbm(0.25, -140)},
-    {"Filtered RSRQ", u16(4), db(0.125, -20)},
+    {"Physical Cell ID", u16(0), physicalCellIdentity},
+    {"Filtered RSRP", u16(2), rsrp(0.25, -140)},
+    {"Filtered RSRQ", u16(4), rsrq(0.125, -20)},
 }};
-inline constexpr std::array<Field, 1> detectedCellFields{{{"Physical Cell ID", u16(0)}}};
+inline constexpr std::array<Field, 1> detectedCellFields{
+    {{"Physical Cell ID", u16(0), physicalCellIdentity}}};
 inline constexpr List measuredNeighbors{
-    .key = "",
     .offset = 29,
     .stride = 6,
     .needed = 6,
@@ -90,7 +90,6 @@ inline constexpr List measuredNeighbors{
     .fields = measuredNeighborFields,
 };
 inline constexpr List detectedCells{
-    .key = "",
     .offset = 29,
     .stride = 2,
     .needed = 2,
@@ -108,18 +107,18 @@ inline constexpr Record connectedMode{0xB179,
 // Idle-mode neighbour measurements
 inline constexpr std::array<Field, 3> idleNeighborFields{{
     {"Version", u8(13)},
-    {"E-ARFCN", u16(17)},
+    {"E-ARFCN", u16(17), downlinkEARFCN},
     {"Qrxlevmin", bits(19, 0, 6), wholeDbm(2, -140)},
 }};
 // The levels have half-dB steps here, the serving cell's have quarters. The antenna 1 values repeat
 // the antenna 0 bits: the record carries no others.
 inline constexpr std::array<Field, 12> idleNeighborCellFields{{
-    {"Physical Cell ID", bits(0, 0, 9)},
+    {"Physical Cell ID", bits(0, 0, 9), physicalCellIdentity},
     {"Measured RSSI", bits(1, 1, 8), dbm(0.5, -140)},
-    {"Measured RSRP", bits(2, 1, 9), dbm(0.5, -140)},
-    {"Average RSRP", bits(4, 0, 9), dbm(0.5, -140)},
-    {"Measured RSRQ", bits(5, 1, 7), db(0.25, -30)},
-    {"Average RSRQ", bits(6, 0, 7), db(0.25, -30)},
+    {"Measured RSRP", bits(2, 1, 9), rsrp(0.5, -140)},
+    {"Average RSRP", bits(4, 0, 9), rsrp(0.5, -140)},
+    {"Measured RSRQ", bits(5, 1, 7), rsrq(0.25, -30)},
+    {"Average RSRQ", bits(6, 0, 7), rsrq(0.25, -30)},
     {"Srxlev", bits(6, 7, 7), wholeDbm(1, -30)},
     {"Frequency Offset", u16(8)},
     {"Ant 0 Frame Offset", bits(12, 0, 11)},
@@ -128,7 +127,6 @@ inline constexpr std::array<Field, 12> idleNeighborCellFields{{
     {"Ant 1 Sample Offset", bits(12, 11, 19)},
 }};
 inline constexpr List idleNeighborCells{
-    .key = "",
     .offset = 21,
     .stride = 20,
     .needed = 16,
@@ -143,8 +141,8 @@ inline constexpr Record idleNeighbors{
 // where the next one begins. Their count is taken as 8 bits.
 inline constexpr std::array<Field, 3> reselectionFields{{
     {"Version", u8(13)},
-    {"Serving EARFCN", u16(15)},
-    {"Serving Cell ID", u16(17)},
+    {"Serving EARFCN", u16(15), downlinkEARFCN},
+    {"Serving Cell ID", u16(17), physicalCellIdentity},
 }};
 inline constexpr std::array<std::string_view, 5> candidateTechnologies{"LTE", "UTRAN", "GERAN",
                                                                        "CDMA1XRTT", "CDMAHRPD"};
@@ -153,8 +151,8 @@ inline constexpr std::array<Field, 2> candidateFields{{
     {"Candidate RAT Type", u16(2), labels(candidateTechnologies, "??")},
 }};
 inline constexpr std::array<Field, 2> lteCandidateFields{{
-    {"E ARFCN", u16(4)},
-    {"Cell ID", bits(6, 7, 9)},
+    {"E ARFCN", u16(4), downlinkEARFCN},
+    {"Cell ID", bits(6, 7, 9), physicalCellIdentity},
 }};
 inline constexpr std::array<Field, 2> utranCandidateFields{{
     {"U ARFCN", u16(4)},
@@ -186,7 +184,6 @@ inline constexpr std::array<CandidatePart, 6> candidateParts{{
     {4, {}},
 }};
 inline constexpr List candidates{
-    .key = "",
     .offset = 21,
     .stride = 4,
     .needed = 4,

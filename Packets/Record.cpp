@@ -63,7 +63,7 @@ std::optional<std::string> Shown::textOf(std::int64_t raw) const
         return text(raw);
     for (const Mark& mark : marks)
         if (mark.raw == raw)
-            return std::string(mark.text);
+            return mark.text.empty() ? std::nullopt : std::optional(std::string(mark.text));
     if (labels.empty() && otherwise.empty())
         return textOfNumber(scale ? scale(raw) : static_cast<double>(raw) * factor + offset);
     const auto index = static_cast<std::size_t>(raw);

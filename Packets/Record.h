@@ -30,7 +30,17 @@ enum class Digits : std::uint8_t {
 /// What a single raw number means, whatever the others mean.
 struct Mark {
     std::int64_t raw;
-    std::string_view text;
+    std::string_view text; ///< empty: nothing shows
+};
+
+/// What a number measures, as far as its limits are known.
+enum class Quantity : std::uint8_t {
+    Any,
+    RSRP,                 ///< dBm
+    RSRQ,                 ///< dB
+    PhysicalCellIdentity, ///< of LTE
+    DownlinkEARFCN,
+    UplinkEARFCN,
 };
 
 /// How a raw number shows: as the text that its mark or its label gives, else as a number, which is
@@ -50,6 +60,7 @@ struct Shown {
     double (*scale)(std::int64_t raw) = nullptr;
     /// For texts that no number stands for, such as digits in nibbles.
     std::string (*text)(std::int64_t raw) = nullptr;
+    Quantity quantity = Quantity::Any;
 
     /// The number that the raw one stands for; none where a text shows in its place.
     std::optional<double> number(std::int64_t raw) const;
@@ -76,7 +87,8 @@ struct ElementCount {
 /// A repeated part of a record, one element every `stride` bytes. Where a list follows on another,
 /// it begins `before.bytesEach` bytes later for each that `before.count` counts.
 struct List {
-    std::string_view key; ///< the list's key in the section's dictionary; empty: it is the section
+    /// In the section's dictionary; where there is none, the list is the section.
+    std::string_view key = {};
     std::size_t offset;
     std::size_t stride;
     std::size_t needed; ///< the bytes that a complete element has

@@ -34,6 +34,26 @@ constexpr Shown signedDbm(double factor, double offset)
     return {.digits = Digits::SignedTwoDecimals, .factor = factor, .offset = offset, .unit = "dBm"};
 }
 
+/// The same number, with what it measures.
+constexpr Shown of(Quantity quantity, Shown shown = decimal)
+{
+    shown.quantity = quantity;
+    return shown;
+}
+
+// What LTE cells are told by.
+constexpr Shown rsrp(double factor, double offset)
+{
+    return of(Quantity::RSRP, dbm(factor, offset));
+}
+constexpr Shown rsrq(double factor, double offset)
+{
+    return of(Quantity::RSRQ, db(factor, offset));
+}
+inline constexpr Shown physicalCellIdentity = of(Quantity::PhysicalCellIdentity);
+inline constexpr Shown downlinkEARFCN = of(Quantity::DownlinkEARFCN);
+inline constexpr Shown uplinkEARFCN = of(Quantity::UplinkEARFCN);
+
 /// The label of the raw number; the other text for one that has none.
 constexpr Shown labels(std::span<const std::string_view> labels, std::string_view otherwise)
 {

@@ -41,7 +41,6 @@ inline constexpr std::array<Field, 5> neighborFields{{
     {"inJDCS", bits(3, 7, 1), labels(truths, {})},
 }};
 inline constexpr List neighbors{
-    .key = "",
     .offset = 168,
     .stride = 16,
     .needed = 4,
@@ -62,7 +61,6 @@ inline constexpr std::array<Field, 7> gsmNeighborFields{{
     {"RSSI", i16(6)},
 }};
 inline constexpr List gsmNeighbors{
-    .key = "",
     .offset = 17,
     .stride = 8,
     .needed = 8,
@@ -79,7 +77,6 @@ inline constexpr std::array<Field, 2> transportChannelFields{{
     {"TRCH BLER Measurement", u8(1)},
 }};
 inline constexpr List transportChannels{
-    .key = "",
     .offset = 17,
     .stride = 2,
     .needed = 2,
@@ -95,7 +92,6 @@ inline constexpr std::array<Field, 3> compositeChannelFields{{
     {"SIR", bits(2, 0, 8 * slotCount)},
 }};
 inline constexpr List compositeChannels{
-    .key = "",
     .offset = 289,
     .stride = 8,
     .needed = 8,

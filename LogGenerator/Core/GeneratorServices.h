@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "Platform/Clock.h"
 #include "Platform/Resources.h"
 #include "Platform/SystemLog.h"
@@ -19,6 +20,7 @@ struct GeneratorServices {
     const Resources& resources;
     const Clock& clock;
     AssertionPolicy assertions = AssertionPolicy::EndProcess;
+    RecordsMode records = RecordsMode::Newer;
 };
 
 } // namespace ventrik

@@ -46,6 +46,12 @@ std::optional<ValueOrigin> LogGenerator::originOf(const PlistDictionary&,
     return std::nullopt;
 }
 
+std::vector<ReadLayout> LogGenerator::layoutsAt(const PlistDictionary&,
+                                                std::span<const std::string_view>) const
+{
+    return {};
+}
+
 void LogGenerator::recordDisplay(PlistDictionary& state) const
 {
     if (state.contains(StateKey::display))

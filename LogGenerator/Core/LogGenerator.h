@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Core/GeneratorServices.h"
 #include "LogGenerator/Core/ValueOrigin.h"
+#include "Packets/Layouts.h"
 #include "PropertyList/PlistValue.h"
 
 #include <memory>
@@ -9,6 +10,7 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace ventrik
 {
@@ -42,6 +44,11 @@ class LogGenerator
     /// field of a record shows there.
     virtual std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                                 std::span<const std::string_view> path) const;
+
+    /// How the records were read, the last one of each log code, that the section shows which
+    /// stands at that path or holds it; empty outside of sections.
+    virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
+                                              std::span<const std::string_view> path) const;
 
     /// A new generator for the service's technology identifier, or none if it is unknown.
     static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,

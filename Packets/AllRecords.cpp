@@ -2,7 +2,8 @@
 
 #include "Packets/C2KRecords.h"
 #include "Packets/GSMRecords.h"
-#include "Packets/LTERecords.h"
+#include "Packets/LTESignalRecords.h"
+#include "Packets/LTEStateRecords.h"
 #include "Packets/SharedRecords.h"
 #include "Packets/UTRANRecords.h"
 
@@ -49,12 +50,17 @@ constexpr std::array records{
     &GSMRecords::registration,
     &GSMRecords::servingPLMN,
     &GSMRecords::equivalentPLMNs,
+    &LTEStateRecords::message2,
     &LTERecords::antennaCount,
     &LTERecords::cellInfo,
+    &LTEStateRecords::emm,
     &LTERecords::connectedMode,
     &LTERecords::servingCellMeasurement,
     &LTERecords::idleNeighbors,
     &LTERecords::reselection,
+    &LTESignalRecords::idleNeighbors,
+    &LTESignalRecords::servingCellSignal,
+    &LTESignalRecords::connectedNeighbors,
     &UTRANRecords::neighborMeasurements,
     &UTRANRecords::transportChannelMeasurement,
     &UTRANRecords::gsmNeighborMeasurements,

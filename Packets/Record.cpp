@@ -51,7 +51,7 @@ void appendNumber(std::string& text, Digits digits, double number)
 
 std::optional<double> Shown::number(std::int64_t raw) const
 {
-    if (text || std::ranges::find(marks, raw, &Mark::raw) != marks.end() || !labels.empty() ||
+    if (text || raw == none || std::ranges::find(marks, raw, &Mark::raw) != marks.end() || !labels.empty() ||
         !otherwise.empty())
         return std::nullopt;
     return scale ? scale(raw) : static_cast<double>(raw) * factor + offset;
@@ -61,9 +61,11 @@ std::optional<std::string> Shown::textOf(std::int64_t raw) const
 {
     if (text)
         return text(raw);
+    if (raw == none)
+        return std::nullopt;
     for (const Mark& mark : marks)
         if (mark.raw == raw)
-            return mark.text.empty() ? std::nullopt : std::optional(std::string(mark.text));
+            return std::string(mark.text);
     if (labels.empty() && otherwise.empty())
         return textOfNumber(scale ? scale(raw) : static_cast<double>(raw) * factor + offset);
     const auto index = static_cast<std::size_t>(raw);

@@ -30,7 +30,7 @@ enum class Digits : std::uint8_t {
 /// What a single raw number means, whatever the others mean.
 struct Mark {
     std::int64_t raw;
-    std::string_view text; ///< empty: nothing shows
+    std::string_view text;
 };
 
 /// What a number measures, as far as its limits are known.
@@ -61,6 +61,8 @@ struct Shown {
     /// For texts that no number stands for, such as digits in nibbles.
     std::string (*text)(std::int64_t raw) = nullptr;
     Quantity quantity = Quantity::Any;
+    /// The raw number that stands for none: nothing shows.
+    std::optional<std::int64_t> none = {};
 
     /// The number that the raw one stands for; none where a text shows in its place.
     std::optional<double> number(std::int64_t raw) const;
@@ -114,6 +116,13 @@ struct Record {
     std::array<const List*, 2> lists = {};
     /// Where it carries its version.
     std::optional<Place> version = {};
+    /// The number of the carrier that it tells of, where several share a record. The fields are the
+    /// first carrier's, 0: the others leave them as they are.
+    std::optional<Place> carrier = {};
+    /// Only read by those who ask for more than the base records.
+    bool isExtension = false;
+    /// Of a record of subpackets: the identifier of the kind whose version tells the layout.
+    std::optional<std::uint8_t> subpacket = {};
 
     /// Null when the record has no field of that name.
     const Field* find(std::string_view key) const;

@@ -252,7 +252,7 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
     const LinuxClock systemClock;
     CaptureClock clock(systemClock);
     const auto generator = LogGenerator::generatorFromTechnology(
-        technology->identifier, {log, resources, clock, AssertionPolicy::Throw});
+        technology->identifier, {log, resources, clock, AssertionPolicy::Throw, options.records});
     if (!generator) {
         complain(fmt::format("{}: there is no decoder for the technology {}", options.capture,
                              technology->name));

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "Platform/SystemLog.h"
 #include "Platform/Technology.h"
 
@@ -17,6 +18,7 @@ struct DecodeOptions {
     std::string capture; ///< a file, or "-" for standard input
     std::optional<Technology> technology;
     DecodeFormat format = DecodeFormat::Text;
+    RecordsMode records = RecordsMode::Newer;
     std::optional<std::string> systemLogFile;
     std::optional<std::string> snapshotFile;
     std::string description;

@@ -78,6 +78,14 @@ Technology technologyValue(const std::string& text)
     return *technology;
 }
 
+RecordsMode recordsValue(const std::string& text)
+{
+    const auto mode = recordsModeNamed(text);
+    if (!mode)
+        throw WrongValue(fmt::format("'{}' is none of base, newer and extended", text));
+    return *mode;
+}
+
 int logLevelValue(const std::string& text)
 {
     const auto* level = std::ranges::find(logLevels, text, &LogLevel::name);
@@ -92,6 +100,13 @@ std::string technologyNames()
     for (const Technology& technology : technologies())
         names.emplace_back(technology.name);
     return alternatives(std::move(names));
+}
+
+std::string recordsNames()
+{
+    return "base: each by its first layout; newer: by the layout that its version and its size "
+           "tell "
+           "(default); extended: also those that have no first layout";
 }
 
 std::string logLevelNames(int defaultLevel)

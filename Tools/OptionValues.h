@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "Platform/Technology.h"
 
 #include <cstdint>
@@ -21,10 +22,12 @@ std::uint32_t wholeNumberValue(const std::string& text);
 double positiveNumberValue(const std::string& text);
 std::string directoryValue(const std::string& text); ///< one that is there
 Technology technologyValue(const std::string& text);
+RecordsMode recordsValue(const std::string& text);
 int logLevelValue(const std::string& text); ///< see LogPriority
 
 /// What the help says of them, as in "a, b or c".
 std::string technologyNames();
+std::string recordsNames();
 std::string logLevelNames(int defaultLevel);
 
 } // namespace ventrik

@@ -37,6 +37,7 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    "text: the display tree at the end (default); json: one document; jsonl: a "
                    "line for every message",
                    result.format, formatValue);
+    line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     line.addOption("--system-log FILE",
                    "writes every system-log line to FILE: its priority, a tab, its text",
                    result.systemLogFile, textValue);

@@ -74,6 +74,7 @@ class LogGenerator
     const Resources& resources() const { return _services.resources; }
     const Clock& clock() const { return _services.clock; }
     AssertionPolicy assertions() const { return _services.assertions; }
+    RecordsMode records() const { return _services.records; }
 
   private:
     GeneratorServices _services;

@@ -27,11 +27,43 @@ constexpr std::array<EcnoStep, 33> ecnoSteps{{
     {814, -30},   {757, -31},   {706, -31},
 }};
 
+// The same parts of a record by another of its layouts: groups and lists have the same places.
+ShownRecord shownBy(const Record& layout, const ShownRecord& shown)
+{
+    const Record& base = *shown.record;
+    ShownRecord other = shown;
+    other.record = &layout;
+    for (std::size_t i = 0; i < base.groups.size(); ++i)
+        if (!shown.fields.empty() && base.groups[i].data() == shown.fields.data())
+            other.fields = layout.groups[i];
+    for (std::size_t i = 0; i < base.lists.size(); ++i)
+        for (ShownList& list : other.lists)
+            if (list.list && list.list == base.lists[i])
+                list.list = layout.lists[i];
+    return other;
+}
+
 } // namespace
 
-Base::Base(SystemLog& log, const SectionTable& table)
-    : _log(log), _table(table), _records(table.shownRecords()), _versions(_records.size())
+Base::Base(SystemLog& log, const SectionTable& table) : _log(log), _table(table)
 {
+    readRecords(RecordsMode::Newer);
+}
+
+void Base::readRecords(RecordsMode mode)
+{
+    _records.clear();
+    for (const ShownRecord& shown : _table.shownRecords()) {
+        if (shown.record->isExtension && mode != RecordsMode::Extended)
+            continue;
+        KnownRecord& known = _records.emplace_back(KnownRecord{shown, {}, {}, {}});
+        if (mode == RecordsMode::Base)
+            continue;
+        known.layouts = layoutsOf(shown.record->logCode);
+        for (const Layout& layout : known.layouts)
+            if (layout.record != shown.record)
+                known.newer.push_back(shownBy(*layout.record, shown));
+    }
 }
 
 void Base::initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDictionary)
@@ -52,28 +84,30 @@ void Base::updateSectionRef(const PlistValue& container)
 void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
 {
     _log.log(_table.tracePriority, "{}", _table.trace.empty() ? _table.name : _table.trace);
-    const auto shown = std::ranges::find(
-        _records, logCode, [](const ShownRecord& known) { return known.record->logCode; });
-    if (shown == _records.end()) {
+    const auto known = std::ranges::find(
+        _records, logCode, [](const KnownRecord& record) { return record.shown.record->logCode; });
+    if (known == _records.end()) {
         if (_table.unknownCode == UnknownCode::Reported)
             logUnknownMessage(logCode);
         return;
     }
-    const Record& record = *shown->record;
-    if (packet.size() < record.minimumSize && !_table.decodesShortRecords)
+    const Record& base = *known->shown.record;
+    if (packet.size() < base.minimumSize && !_table.decodesShortRecords)
         return;
-    if (record.version)
-        _versions[static_cast<std::size_t>(shown - _records.begin())] =
-            static_cast<std::uint8_t>(numberAt(packet, *record.version));
-    _current = &record;
-    decode(*shown, packet);
+    const ChosenLayout chosen = chooseLayout(base, known->layouts, packet);
+    known->last = {logCode, versionOf(*chosen.record, packet), packet.size(), chosen.kind};
+    if (base.isExtension && chosen.kind == LayoutKind::NotKnown)
+        return; // it has no base layout to fall back on
+    _current = chosen.record;
+    const auto newer = std::ranges::find(known->newer, chosen.record, &ShownRecord::record);
+    decode(newer == known->newer.end() ? known->shown : *newer, packet);
 }
 
 std::vector<std::uint32_t> Base::getLogCodeArray() const
 {
     std::vector<std::uint32_t> codes;
-    for (const ShownRecord& shown : _records)
-        codes.push_back(shown.record->logCode);
+    for (const KnownRecord& known : _records)
+        codes.push_back(known.shown.record->logCode);
     return codes;
 }
 
@@ -119,6 +153,15 @@ std::optional<ValueOrigin> Base::originOf(std::string_view listKey, std::size_t 
     return rows ? withVersion(rows->originOf(row, key)) : std::nullopt;
 }
 
+std::vector<ReadLayout> Base::layouts() const
+{
+    std::vector<ReadLayout> layouts;
+    for (const KnownRecord& known : _records)
+        if (known.last)
+            layouts.push_back(*known.last);
+    return layouts;
+}
+
 void Base::decode(const ShownRecord& shown, const LogPacket& packet)
 {
     showFields(shown, packet);
@@ -136,10 +179,10 @@ void Base::decode(const ShownRecord& shown, const LogPacket& packet)
         rewriteRows(*shown.record);
 }
 
-void Base::show(const Field& field, std::int64_t raw)
+void Base::show(const Field& field, std::int64_t raw, std::size_t start)
 {
     if (auto dictionary = beginFields())
-        _fields.show(*dictionary, field, raw);
+        _fields.show(*dictionary, field, raw, start);
 }
 
 void Base::showNumber(const Field& field, double number)
@@ -158,6 +201,8 @@ void Base::showFields(const ShownRecord& shown, const LogPacket& packet)
 {
     if (shown.fields.empty())
         return;
+    if (shown.record->carrier && numberAt(packet, *shown.record->carrier) != 0)
+        return; // an added carrier's are not the serving cell's
     if (!shown.superseded.empty())
         withdraw(shown.superseded);
     if (auto dictionary = beginFields())
@@ -249,9 +294,11 @@ const RowList* Base::rowsUnder(std::string_view listKey) const
 
 std::optional<ValueOrigin> Base::withVersion(std::optional<ValueOrigin> origin) const
 {
-    for (std::size_t i = 0; origin && i < _records.size(); ++i)
-        if (_records[i].record == origin->record && origin->record->version)
-            origin->version = _versions[i];
+    if (!origin)
+        return origin;
+    for (const KnownRecord& known : _records)
+        if (known.last && known.last->logCode == origin->record->logCode)
+            origin->version = known.last->version;
     return origin;
 }
 

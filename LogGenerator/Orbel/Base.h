@@ -4,6 +4,7 @@
 #include "LogGenerator/Orbel/RowList.h"
 #include "LogGenerator/Orbel/SectionTable.h"
 #include "LogGenerator/Orbel/ShownFields.h"
+#include "Packets/Layouts.h"
 #include "Packets/LogPacket.h"
 #include "Platform/SystemLog.h"
 #include "PropertyList/PlistValue.h"
@@ -39,6 +40,11 @@ class Base
     Base(const Base&) = delete;
     Base& operator=(const Base&) = delete;
 
+    /// By which layouts the section reads its records; the newer ones where nobody says. Comes
+    /// before it is registered: only those who ask for more get its records that have no base
+    /// layout.
+    void readRecords(RecordsMode mode);
+
     /// Registers the section under its name and for its codes.
     void initWithDict(ClassDictionary& classDictionary, CodeDictionary& codeDictionary);
 
@@ -68,14 +74,19 @@ class Base
     std::optional<ValueOrigin> originOf(std::string_view listKey, std::size_t row,
                                         std::string_view key) const;
 
+    /// How the records were read that the section shows, the last one of each code.
+    std::vector<ReadLayout> layouts() const;
+
   protected:
-    /// Decodes a packet of the record, which is long enough: shows what the table says.
+    /// Decodes a packet of the record, which is long enough: shows what the table says. The record
+    /// is the one whose layout the packet has.
     virtual void decode(const ShownRecord& shown, const LogPacket& packet);
 
     SystemLog& log() const { return _log; }
 
-    // Each shows a value in the section's dictionary. Keys are constants.
-    void show(const Field& field, std::int64_t raw);
+    // Each shows a value in the section's dictionary. Keys are constants. The field's place counts
+    // from the start.
+    void show(const Field& field, std::int64_t raw, std::size_t start = 0);
     void showNumber(const Field& field, double number);
     void showValue(std::string_view key, PlistValue value);
 
@@ -89,6 +100,14 @@ class Base
     WeakContainer sectionRef;
 
   private:
+    /// A record of the section's table, with what is known of its layouts.
+    struct KnownRecord {
+        ShownRecord shown;
+        std::span<const Layout> layouts;
+        std::vector<ShownRecord> newer; // the same by each layout but the base one
+        std::optional<ReadLayout> last; // how the last packet was read
+    };
+
     /// A list under a key of the section's dictionary.
     struct KeyedRows {
         std::string_view key;
@@ -108,12 +127,11 @@ class Base
 
     SystemLog& _log;
     const SectionTable& _table;
-    std::span<const ShownRecord> _records;
+    std::vector<KnownRecord> _records;
     const Record* _current = nullptr; // which is being decoded
     ShownFields _fields;
     RowList _rows;
     std::list<KeyedRows> _keyedRows;
-    std::vector<std::uint8_t> _versions; // of the last packet of each of the table's records
 };
 
 /// A section that only shows what its table says.

@@ -15,7 +15,10 @@ namespace ventrik
 class ClassIndex
 {
   public:
-    explicit ClassIndex(SystemLog& log) : _log(log) {}
+    explicit ClassIndex(SystemLog& log, RecordsMode records = RecordsMode::Newer)
+        : _log(log), _recordsMode(records)
+    {
+    }
     /// Says farewell on standard output.
     virtual ~ClassIndex();
     ClassIndex(const ClassIndex&) = delete;
@@ -37,12 +40,14 @@ class ClassIndex
     Base& add(Args&&... args)
     {
         _sections.push_back(std::make_unique<Section>(_log, std::forward<Args>(args)...));
+        _sections.back()->readRecords(_recordsMode);
         _sections.back()->initWithDict(classDict, codeDictionary);
         return *_sections.back();
     }
 
   private:
     SystemLog& _log;
+    RecordsMode _recordsMode;
     ClassDictionary classDict;
     CodeDictionary codeDictionary;
     std::vector<std::unique_ptr<Base>> _sections;

@@ -48,7 +48,7 @@ std::optional<ValueOrigin> FieldMemory::originOf(std::size_t slot) const
     const Slot& known = _slots[slot];
     if (!known.field || !known.record || known.isWorkedOut)
         return std::nullopt;
-    return ValueOrigin{known.record, std::nullopt, known.field, 0, known.raw};
+    return ValueOrigin{known.record, std::nullopt, known.field, known.start, known.raw};
 }
 
 std::optional<ValueOrigin> FieldMemory::originOf(std::string_view key) const

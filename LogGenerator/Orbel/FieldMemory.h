@@ -24,6 +24,8 @@ class FieldMemory
     bool shows(std::size_t slot, const Field& field, std::int64_t raw, bool isWorkedOut) const;
     void keep(std::size_t slot, const Field& field, const Record* record, std::int64_t raw,
               bool isWorkedOut);
+    /// What the place of the field that the slot's key shows counts from.
+    void place(std::size_t slot, std::size_t start) { _slots[slot].start = start; }
     /// The key shows what no field describes.
     void keepNone(std::size_t slot) { _slots[slot].field = nullptr; }
 
@@ -38,6 +40,7 @@ class FieldMemory
         const Field* field = nullptr; // whose number shows
         const Record* record = nullptr;
         std::int64_t raw = 0;
+        std::size_t start = 0;
         bool isWorkedOut = false;
     };
 

@@ -46,12 +46,25 @@ std::optional<PlistValue> OrbelLogGenerator::loadTemplate(PlistDictionary& state
 {
     if (const PlistValue* loaded = state.find(StateKey::displayTemplate))
         return *loaded;
-    auto loaded = _isTemplateBad ? std::nullopt : readTemplate(name);
+    auto loaded = _isTemplateBad ? std::nullopt : readWholeTemplate(name);
     if (loaded)
         state.set(StateKey::displayTemplate, *loaded);
     else
         log().error("{}", failureLine);
     return loaded;
+}
+
+std::optional<PlistValue> OrbelLogGenerator::readWholeTemplate(const std::string& name)
+{
+    auto whole = readTemplate(name);
+    if (!whole || _templateExtension.empty())
+        return whole;
+    const auto extension = readTemplate(_templateExtension);
+    if (!extension)
+        return std::nullopt;
+    for (const auto& [key, entry] : *extension->dictionary())
+        whole->dictionary()->set(key, entry);
+    return whole;
 }
 
 // One that is missing may come; looking for it costs little.

@@ -33,15 +33,20 @@ class OrbelLogGenerator : public LogGenerator
     /// at error level, when it cannot be used: one that is there and broken is read only once.
     std::optional<PlistValue> loadTemplate(PlistDictionary& state, const std::string& name,
                                            std::string_view failureLine);
+    /// The template ends with the entries of another one, the resource of that name.
+    void extendTemplate(std::string name) { _templateExtension = std::move(name); }
+    const std::string& templateExtension() const { return _templateExtension; }
     /// From now on there is no display of this template.
     void rejectTemplate(std::string_view reason);
 
   private:
     std::optional<Bytes> makeVersionReport() const;
     std::optional<PlistValue> readTemplate(const std::string& name);
+    std::optional<PlistValue> readWholeTemplate(const std::string& name);
 
     // The packets since the last display; none in a generator that was never initialised.
     std::optional<PeriodPackets> _binData;
+    std::string _templateExtension;
     std::string _templatePath;   // where the template was read
     std::string _templateFault;  // why it cannot be used, in one line; empty when it can
     bool _isTemplateBad = false; // it was read; reading it again would give the same

@@ -91,7 +91,7 @@ const PlistValue* OrbelLogGenerator2::ensureDisplay(PlistDictionary& state)
     const PlistDictionary::Entry* entry = state.entryAt(_displayPlace);
     if (entry && _boundDisplay.refersTo(entry->value) && entry->key == StateKey::display)
         return &entry->value;
-    claimDisplay(state, pListName);
+    claimDisplay(state, displayOwner());
     const PlistValue* display = state.find(StateKey::display);
     _displayPlace = state.placeOf(StateKey::display).value_or(0);
     if (display) {
@@ -131,6 +131,22 @@ OrbelLogGenerator2::originOf(const PlistDictionary&, std::span<const std::string
                                  rest.back());
     }
     return std::nullopt;
+}
+
+std::vector<ReadLayout> OrbelLogGenerator2::layoutsAt(const PlistDictionary&,
+                                                      std::span<const std::string_view> path) const
+{
+    for (const std::string_view name : path)
+        if (const Base* section = cIndex ? cIndex->getClass(name) : nullptr)
+            return section->layouts();
+    return {};
+}
+
+// An extended display has places that the plain one has not.
+std::string OrbelLogGenerator2::displayOwner() const
+{
+    return templateExtension().empty() ? pListName
+                                       : fmt::format("{}+{}", pListName, templateExtension());
 }
 
 std::optional<PlistValue> OrbelLogGenerator2::buildDisplay(PlistDictionary& state)

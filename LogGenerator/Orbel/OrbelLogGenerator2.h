@@ -27,6 +27,9 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                         std::span<const std::string_view> path) const override;
 
+    std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
+                                      std::span<const std::string_view> path) const override;
+
     /// Routes one packet, as it arrived, to the subscribed sections.
     void updateWithData(ByteView data);
     /// The copy of a template value, its sections bound to their containers; none when it holds a
@@ -47,6 +50,8 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     /// The display in the state; null in the call that builds it, and when there is none.
     const PlistValue* ensureDisplay(PlistDictionary& state);
     std::optional<PlistValue> buildDisplay(PlistDictionary& state);
+    /// Of which displays this one may go on with.
+    std::string displayOwner() const;
     void bindSection(std::string_view name, const PlistValue& container);
     /// Binds the sections that the template names, and nothing that a record brought into the
     /// display under such a name.

@@ -20,9 +20,11 @@ void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
     forgetAll();
 }
 
-void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw)
+void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw,
+                       std::size_t start)
 {
     const std::size_t slot = _memory.slotOf(field);
+    _memory.place(slot, start);
     if (_memory.shows(slot, field, raw, false))
         return;
     if (const auto& text = _texts.textOf(field, raw)) {

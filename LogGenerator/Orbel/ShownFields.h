@@ -23,7 +23,9 @@ class ShownFields
     void begin(const PlistDictionary& dictionary, const Record* record);
 
     /// Shows the raw number as the field says, or nothing new where that shows nothing.
-    void show(PlistDictionary& dictionary, const Field& field, std::int64_t raw);
+    /// The field's place counts from the start.
+    void show(PlistDictionary& dictionary, const Field& field, std::int64_t raw,
+              std::size_t start = 0);
     void show(PlistDictionary& dictionary, std::span<const Field> fields, const LogPacket& packet);
     /// Shows a number that was worked out from the record, in the field's format.
     void showNumber(PlistDictionary& dictionary, const Field& field, double number);

@@ -216,13 +216,13 @@ TEST_F(C2KOneXStatusTest, EveryPilotOfTheReferencesOffsetIsMarked)
 
 TEST_F(C2KOneXStatusTest, TheFieldCountSetsLengthAndPlace)
 {
-    struct Layout {
+    struct FieldLayout {
         std::uint8_t fields;
         std::size_t stride;
         std::size_t energyOffset;
     };
-    for (const Layout& layout :
-         {Layout{0, 12, 12}, {1, 20, 16}, {2, 24, 20}, {3, 32, 24}, {255, 1544, 1032}}) {
+    for (const FieldLayout& layout :
+         {FieldLayout{0, 12, 12}, {1, 20, 16}, {2, 24, 20}, {3, 32, 24}, {255, 1544, 1032}}) {
         // The active set comes last and has room for two pilots.
         Bytes content(8 + 2 * layout.stride + 4);
         content[0] = content[2] = 1;

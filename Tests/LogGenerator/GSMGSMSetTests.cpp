@@ -40,6 +40,7 @@ TEST_F(GSMSetTest, NamesItselfAndItsCode)
 
 TEST_F(GSMSetTest, EachFieldIsReadFromItsBytesAlone)
 {
+    section.readRecords(RecordsMode::Base);
     expectElementFields(fields, rankedCells(2), 22, 7,
                         [this](const PacketBuilder& packet, std::string_view key) {
                             feed(packet);

@@ -75,6 +75,7 @@ TEST_F(UMTSSetTest, NamesItselfAndItsCodes)
 
 TEST_F(UMTSSetTest, EachFieldIsReadFromItsBytesAlone)
 {
+    section.readRecords(RecordsMode::Base);
     expectElementFields(fields, rankedCells(2), 25, 10,
                         [this](const PacketBuilder& packet, std::string_view key) {
                             feed(packet);

@@ -1,4 +1,5 @@
 #include "Platform/Technology.h"
+#include "Tests/LogGenerator/DisplayTexts.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 #include "Tests/Support/ResourceFiles.h"
 
@@ -37,26 +38,6 @@ std::vector<std::string> readLines(const std::filesystem::path& file)
     for (std::string line; std::getline(input, line);)
         lines.push_back(line);
     return lines;
-}
-
-// "path: value" for each text below the value that the template has not put there.
-void collectTexts(const PlistValue& value, const std::string& path, std::vector<std::string>& texts)
-{
-    const auto below = [&](std::string_view name) {
-        return path.empty() ? std::string(name) : fmt::format("{}/{}", path, name);
-    };
-    if (value.string()) {
-        if (!value.string()->empty() && *value.string() != "-")
-            texts.push_back(fmt::format("{}: {}", path, *value.string()));
-    } else if (value.dictionary()) {
-        for (const auto& [key, entry] : *value.dictionary()) {
-            if (key != "_sorted")
-                collectTexts(entry, below(key), texts);
-        }
-    } else if (value.array()) {
-        for (std::size_t i = 0; i < value.array()->size(); ++i)
-            collectTexts((*value.array())[i], below(std::to_string(i)), texts);
-    }
 }
 
 std::vector<std::string> goldenNames()
@@ -101,10 +82,8 @@ TEST_P(GoldenPacketTest, ShowsItsValues)
     const auto generator = makeGenerator();
     for (const Bytes& packet : packets)
         generator->updateState(state, packet);
-    std::vector<std::string> texts;
-    collectTexts(*state.find("Display"), "", texts);
-    std::ranges::sort(texts);
-    EXPECT_EQ(texts, readLines(goldenDirectory / (GetParam() + ".txt")));
+    EXPECT_EQ(displayTexts(*state.find("Display")),
+              readLines(goldenDirectory / (GetParam() + ".txt")));
 }
 
 // The sanitizers watch over what is read.

@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/NeighborCellsList.h"
+#include "LogGenerator/Orbel/LTE/NeighborSignal.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 
 namespace ventrik

@@ -25,12 +25,13 @@ const std::vector<std::uint32_t> utranCodes{0xD00A, 0xD00C,   0xD00E,   0xD0E0,
                                             0xD0E2, 0xFF0000, 0xFF0001, 0xFF0002};
 const std::vector<std::uint32_t> c2kCodes{0x108A, 0x1183, 0x1192, 0x119C,
                                           0x119D, 0x127E, 0x12B6, 0x134F};
+const std::vector<std::uint32_t> extensionCodes{0xB0C0, 0xB0EE, 0xB192, 0xB193, 0xB195};
 constexpr std::uint32_t dlfVersionReport = 0x1FFD; // which nobody asks for
 
 std::set<std::uint32_t> askedCodes()
 {
     std::set<std::uint32_t> codes;
-    for (const auto& of : {gsmCodes, lteCodes, utranCodes, c2kCodes})
+    for (const auto& of : {gsmCodes, lteCodes, utranCodes, c2kCodes, extensionCodes})
         codes.insert(of.begin(), of.end());
     return codes;
 }
@@ -106,6 +107,15 @@ TEST(AllRecords, NoRecordIsThereForACodeThatNobodyAsksFor)
     for (const Record* record : allRecords())
         ofRecords.push_back(record->logCode);
     EXPECT_THAT(ofRecords, testing::ElementsAreArray(codes)); // which a set keeps sorted
+}
+
+TEST(AllRecords, OnlyTheExtensionsAreMarkedAsSuch)
+{
+    std::vector<std::uint32_t> marked;
+    for (const Record* record : allRecords())
+        if (record->isExtension)
+            marked.push_back(record->logCode);
+    EXPECT_EQ(marked, extensionCodes);
 }
 
 TEST(AllRecords, AnotherCodeHasNoRecord)

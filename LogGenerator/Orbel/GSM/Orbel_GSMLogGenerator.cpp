@@ -16,7 +16,7 @@ Orbel_GSMLogGenerator::generator(const GeneratorServices& services)
 void Orbel_GSMLogGenerator::init()
 {
     log().error("Creating Orbel_GSMLogGenerator object");
-    initWithPListName("Orbel_GSM", std::make_shared<Orbel_GSMClassIndex>(log()));
+    initWithPListName("Orbel_GSM", std::make_shared<Orbel_GSMClassIndex>(log(), records()));
 }
 
 Orbel_GSMLogGenerator::~Orbel_GSMLogGenerator()

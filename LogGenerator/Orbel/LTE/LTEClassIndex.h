@@ -1,11 +1,14 @@
 #pragma once
 
 #include "LogGenerator/Orbel/ClassIndex.h"
+#include "LogGenerator/Orbel/LTE/EPSRegistration.h"
 #include "LogGenerator/Orbel/LTE/LTESections.h"
 #include "LogGenerator/Orbel/LTE/LTEServingCellInfo.h"
 #include "LogGenerator/Orbel/LTE/MeasuredNeighborCells.h"
 #include "LogGenerator/Orbel/LTE/NeighborCellsList.h"
+#include "LogGenerator/Orbel/LTE/NeighborSignal.h"
 #include "LogGenerator/Orbel/LTE/ReselectionCandidatesList.h"
+#include "LogGenerator/Orbel/LTE/ServingCellSignal.h"
 #include "LogGenerator/Orbel/PDPContextList.h"
 #include "LogGenerator/Orbel/SimInfo.h"
 
@@ -16,7 +19,18 @@ namespace ventrik
 class LTEClassIndex : public ClassIndex
 {
   public:
-    using ClassIndex::ClassIndex;
+    explicit LTEClassIndex(SystemLog& log, RecordsMode records = RecordsMode::Newer)
+        : ClassIndex(log, records)
+    {
+        if (records != RecordsMode::Extended)
+            return;
+        add<ServingCellSignal>();
+        add<SignalByCell>();
+        add<ConnectedNeighbors>();
+        add<ConnectedNeighborCells>();
+        add<EPSRegistration>();
+        add<LastRRCMessage>();
+    }
 
   private:
     Base& objLTEServingCellInfo = add<LTEServingCellInfo>();

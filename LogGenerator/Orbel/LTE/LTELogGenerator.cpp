@@ -15,7 +15,9 @@ std::unique_ptr<LTELogGenerator> LTELogGenerator::generator(const GeneratorServi
 void LTELogGenerator::init()
 {
     log().error("Creating LTELogGenerator object");
-    initWithPListName("LTE", std::make_shared<LTEClassIndex>(log()));
+    initWithPListName("LTE", std::make_shared<LTEClassIndex>(log(), records()));
+    if (records() == RecordsMode::Extended)
+        extendTemplate("LTEMore");
 }
 
 LTELogGenerator::~LTELogGenerator()

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Orbel/Base.h"
 #include "Packets/LTERecords.h"
+#include "Packets/LTEStateRecords.h"
 
 namespace ventrik
 {
@@ -29,18 +30,18 @@ inline constexpr SectionTable servingCellMeasurement{
 };
 using ServingCellMeasurement = TableSection<servingCellMeasurement>;
 
-/// What the idle-mode measurements of the neighbour cells have in common.
-inline constexpr SectionTable neighborMeasurementMisc{
-    .name = "Neighbor Measurements",
-    .records = {{{&LTERecords::idleNeighbors, LTERecords::idleNeighborFields}}},
-};
-using NeighborMeasurementMisc = TableSection<neighborMeasurementMisc>;
-
 /// The serving cell from which the reselection candidates were ranked.
 inline constexpr SectionTable reselectionCandidatesMisc{
     .name = "Reselection Candidates",
     .records = {{{&LTERecords::reselection, LTERecords::reselectionFields}}},
 };
 using ReselectionCandidatesMisc = TableSection<reselectionCandidatesMisc>;
+
+/// The last message of the radio resource layer: what stands in front of it.
+inline constexpr SectionTable lastRRCMessage{
+    .name = "Last RRC Message",
+    .records = {{{&LTEStateRecords::message2, LTEStateRecords::messageFields2}}},
+};
+using LastRRCMessage = TableSection<lastRRCMessage>;
 
 } // namespace ventrik

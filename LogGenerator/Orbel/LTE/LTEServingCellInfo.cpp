@@ -40,10 +40,24 @@ LTEServingCellInfo::LTEServingCellInfo(SystemLog& log) : Base(log, table) {}
 
 void LTEServingCellInfo::decode(const ShownRecord& shown, const LogPacket& packet)
 {
-    Base::decode(shown, packet);
+    const Record& record = *shown.record;
+    if (!isOfOtherCell(record, packet))
+        Base::decode(shown, packet);
+    if (record.logCode == LTERecords::cellInfo.logCode)
+        _servingCell = {numberOf(packet, *record.find("Physical Cell ID")),
+                        numberOf(packet, *record.find("Download Frequency"))};
     // This path has always reported its own record as unknown; readers of the log expect the line.
-    if (shown.record == &LTERecords::antennaCount)
-        logUnknownMessage(shown.record->logCode);
+    if (record.logCode == LTERecords::antennaCount.logCode)
+        logUnknownMessage(record.logCode);
+}
+
+// The antenna count also comes of cells that are only scanned; its newer layouts tell of which.
+bool LTEServingCellInfo::isOfOtherCell(const Record& record, const LogPacket& packet) const
+{
+    const Field* identity = record.find("physical cell identity");
+    const Field* earfcn = record.find("EARFCN");
+    return _servingCell && identity && earfcn &&
+           *_servingCell != Cell{numberOf(packet, *identity), numberOf(packet, *earfcn)};
 }
 
 } // namespace ventrik

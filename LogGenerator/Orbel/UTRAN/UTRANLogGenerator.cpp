@@ -38,7 +38,7 @@ void UTRANLogGenerator::init()
     if (path == paths.end())
         return;
     initWithPListName(std::filesystem::path(*path).stem().string(),
-                      std::make_shared<UTRANClassIndex>(log()));
+                      std::make_shared<UTRANClassIndex>(log(), records()));
     log().error("Created UTRANLogGenerator object");
 }
 

@@ -114,7 +114,10 @@ inline constexpr List equivalentPLMNList{
     .fields = equivalentPLMNFields,
     .unshown = equivalentPLMNUnshown,
 };
-inline constexpr Record equivalentPLMNs{0x7150, "Equivalent PLMNs", 32, {}, {&equivalentPLMNList}};
+inline constexpr std::array<Field, 1> equivalentPLMNsUnshown{
+    {{"registered network", bits(13, 0, 24)}}};
+inline constexpr Record equivalentPLMNs{
+    0x7150, "Equivalent PLMNs", 32, {equivalentPLMNsUnshown}, {&equivalentPLMNList}};
 
 } // namespace GSMLayouts
 

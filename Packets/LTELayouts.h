@@ -44,7 +44,7 @@ inline constexpr std::array<Field, 1> antennaCountFields2{{{"Num Tx Antennas", u
 inline constexpr std::array<Field, 5> antennaCountUnshown2{{
     {"version", u8(13)},
     {"physical cell identity", u16(14)},
-    {"EARFCN", u32(16)},
+    {"frequency", u32(16), downlinkEARFCN},
     {"system frame number", u16(20)},
     {"bandwidth", u8(23), LTERecords::bandwidth},
 }};
@@ -92,21 +92,30 @@ constexpr std::array<Field, 16> servingCellMeasurementFields(Place earfcn, std::
         {"S Non Intra Search", bits(at(20), 6, 6), marked(wholeDbm(2), noThresholds)},
     }};
 }
-inline constexpr std::array<Field, 1> servingCellMeasurementUnshown{{{"release", u8(14)}}};
+constexpr std::array<Field, 3> servingCellMeasurementUnshown(std::uint16_t levels)
+{
+    return {{
+        {"release", u8(14)},
+        {"repeated RSRP", bits(static_cast<std::uint16_t>(levels + 1), 4, 12)},
+        {"repeated RSRQ", bits(static_cast<std::uint16_t>(levels + 9), 2, 10)},
+    }};
+}
 // Version 3 may have its criteria elsewhere.
 inline constexpr auto servingCellMeasurementFields4 = servingCellMeasurementFields(u16(17), 19, 21);
 inline constexpr auto servingCellMeasurementFields5 = servingCellMeasurementFields(u32(17), 21, 25);
+inline constexpr auto servingCellMeasurementUnshown4 = servingCellMeasurementUnshown(21);
+inline constexpr auto servingCellMeasurementUnshown5 = servingCellMeasurementUnshown(25);
 inline constexpr Record servingCellMeasurement3{
     0xB17F, "LTE serving cell measurement",
-    45,     {std::span(servingCellMeasurementFields4).first(8), servingCellMeasurementUnshown},
+    45,     {std::span(servingCellMeasurementFields4).first(8), servingCellMeasurementUnshown4},
     {},     u8(13)};
 inline constexpr Record servingCellMeasurement4{
     0xB17F, "LTE serving cell measurement",
-    45,     {servingCellMeasurementFields4, servingCellMeasurementUnshown},
+    45,     {servingCellMeasurementFields4, servingCellMeasurementUnshown4},
     {},     u8(13)};
 inline constexpr Record servingCellMeasurement5{
     0xB17F, "LTE serving cell measurement",
-    49,     {servingCellMeasurementFields5, servingCellMeasurementUnshown},
+    49,     {servingCellMeasurementFields5, servingCellMeasurementUnshown5},
     {},     u8(13)};
 
 // Connected-mode intra-frequency measurement. The number of the subframe counts on from the
@@ -128,8 +137,8 @@ constexpr std::array<Field, 4> connectedModeUnshown(std::uint16_t cell)
     return {{
         {"version", u8(13)},
         {"carrier", bits(17, 0, 3)},
-        {"RSRP again", u16(at(6))},
-        {"RSRQ again", u16(at(10))},
+        {"repeated RSRP", u16(at(6))},
+        {"repeated RSRQ", u16(at(10))},
     }};
 }
 inline constexpr std::array<Field, 3> measuredNeighborFields{{
@@ -138,8 +147,8 @@ inline constexpr std::array<Field, 3> measuredNeighborFields{{
     {"Filtered RSRQ", u16(6), rsrqLevel},
 }};
 inline constexpr std::array<Field, 2> measuredNeighborUnshown{{
-    {"RSRP again", u16(4)},
-    {"RSRQ again", u16(8)},
+    {"repeated RSRP", u16(4)},
+    {"repeated RSRQ", u16(8)},
 }};
 inline constexpr std::array<Field, 2> detectedCellUnshown{{
     {"correlation", u32(4)},
@@ -218,10 +227,10 @@ inline constexpr std::array<Field, 12> idleNeighborCellFields{{
     {"Ant 1 Sample Offset", bits(24, 11, 19)},
 }};
 inline constexpr std::array<Field, 4> idleNeighborCellUnshown{{
-    {"RSRP again", bits(4, 0, 12)},
-    {"average RSRP again", bits(8, 0, 12)},
-    {"RSRQ again", bits(10, 6, 10)},
-    {"average RSRQ again", bits(13, 2, 10)},
+    {"repeated RSRP", bits(4, 0, 12)},
+    {"repeated average RSRP", bits(8, 0, 12)},
+    {"repeated RSRQ", bits(10, 6, 10)},
+    {"repeated average RSRQ", bits(13, 2, 10)},
 }};
 constexpr List idleNeighborCells(Place count, std::uint16_t offset, std::size_t stride)
 {

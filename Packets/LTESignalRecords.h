@@ -15,8 +15,16 @@ namespace LTESignalRecords
 
 // ---- Neighbour cells: the response of a measurement, cells of 52 bytes behind a header
 
-inline constexpr std::array<Field, 1> narrowNeighborHeader{{{"E-ARFCN", u16(4), downlinkEARFCN}}};
-inline constexpr std::array<Field, 1> wideNeighborHeader{{{"E-ARFCN", u32(4), downlinkEARFCN}}};
+constexpr std::array<Field, 3> neighborHeader(Place earfcn, std::uint16_t counts)
+{
+    return {{
+        {"E-ARFCN", earfcn, downlinkEARFCN},
+        {"subpacket version", Subpackets::version},
+        {"cells", bits(counts, 0, 6)},
+    }};
+}
+inline constexpr auto narrowNeighborHeader = neighborHeader(u16(4), 6);
+inline constexpr auto wideNeighborHeader = neighborHeader(u32(4), 8);
 // Of two antennas and, under the plain names, of the better one.
 inline constexpr std::array<Field, 10> neighborFields{{
     {"Physical Cell ID", bits(0, 0, 9), physicalCellIdentity},
@@ -174,11 +182,13 @@ struct SignalFields {
     std::array<std::array<Field, 4>, 4>
         ofAntennas{}; ///< RSRP, RSRQ, RSSI and, where it stands, SNR
     std::size_t ofAntennaCount = 0;
-    Field earfcn{};
+    std::array<Field, 4> ofHeader{}; ///< the frequency first
     Field carrier{};
     Field serving{};
     std::size_t needed = 0; ///< the bytes that a complete cell has
 
+    constexpr std::span<const Field> header() const { return ofHeader; }
+    constexpr const Field& earfcn() const { return ofHeader.front(); }
     constexpr std::span<const Field> cell() const { return std::span(ofCell).first(ofCellCount); }
     constexpr std::span<const Field> antenna(std::size_t index) const
     {
@@ -239,7 +249,12 @@ constexpr SignalFields signalFields(const SignalVersion& version)
         }};
     }
 
-    fields.earfcn = {"E-ARFCN", version.earfcn, downlinkEARFCN};
+    fields.ofHeader = {{
+        {"E-ARFCN", version.earfcn, downlinkEARFCN},
+        {"subpacket version", Subpackets::version},
+        {"cells", signalCellCount},
+        {"antennas", headerMask},
+    }};
     fields.carrier = {"Carrier Index",
                       bits(static_cast<std::uint16_t>(version.identity + 1), 1, 3)};
     fields.serving = {"Serving", bits(version.identity, version.servingBit, 1),
@@ -256,6 +271,12 @@ inline constexpr auto signalFieldsOfVersions = [] {
         all[i] = signalFields(signalVersions[i]);
     return all;
 }();
+
+/// The fields of a version of the table.
+constexpr const SignalFields& signalFieldsOf(const SignalVersion& version)
+{
+    return signalFieldsOfVersions[static_cast<std::size_t>(&version - signalVersions.data())];
+}
 
 inline constexpr Record servingCellSignal{.logCode = 0xB193,
                                           .name = "LTE serving cell signal",

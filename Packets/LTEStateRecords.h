@@ -108,12 +108,13 @@ constexpr std::array<Field, 7> messageFields(const MessageHeader& header,
         {"Length", u16(header.length)},
     }};
 }
+inline constexpr std::array<Field, 1> messageUnshown{{{"version", u8(13)}}};
 constexpr Record message(std::size_t size, std::span<const Field> fields)
 {
     return {.logCode = 0xB0C0,
             .name = "LTE radio resource message",
             .minimumSize = size,
-            .groups = {fields},
+            .groups = {fields, messageUnshown},
             .version = u8(13),
             .isExtension = true};
 }

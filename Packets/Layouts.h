@@ -39,6 +39,7 @@ struct Layout {
     std::size_t minimumSize = 0;
     std::size_t maximumSize = std::numeric_limits<std::size_t>::max();
     bool (*fits)(const Record& record, const LogPacket& packet) = nullptr;
+    std::string_view condition = {}; ///< what that asks, for people
 
     bool isOf(const LogPacket& packet) const;
 };

@@ -51,8 +51,8 @@ void appendNumber(std::string& text, Digits digits, double number)
 
 std::optional<double> Shown::number(std::int64_t raw) const
 {
-    if (text || raw == none || std::ranges::find(marks, raw, &Mark::raw) != marks.end() || !labels.empty() ||
-        !otherwise.empty())
+    if (text || raw == none || std::ranges::find(marks, raw, &Mark::raw) != marks.end() ||
+        !labels.empty() || !otherwise.empty())
         return std::nullopt;
     return scale ? scale(raw) : static_cast<double>(raw) * factor + offset;
 }

@@ -1,6 +1,6 @@
 #include "TelephonyService/GSMScenario.h"
 
-#include "Packets/GSMRecords.h"
+#include "Packets/GSMLayouts.h"
 #include "Packets/RecordWriter.h"
 #include "Packets/SharedRecords.h"
 #include "Platform/TelephonyConstants.h"
@@ -219,9 +219,27 @@ void GSMScenario::reportServingPLMN()
 // 262, 203. Behind the last one stand its other three bytes.
 void GSMScenario::reportEquivalentPLMNs()
 {
+    if (_isNewer)
+        return reportEquivalentPLMNsInNibbles();
     RecordWriter record(GSMRecords::equivalentPLMNs);
     for (const std::int64_t digits : {0x060202060002, 0x030200060202})
         record.add(GSMRecords::equivalentPLMNList).set("digits", digits);
+    report(record);
+}
+
+// 262, 01 and 262, 03; the low nibble of a byte comes first. Slots that are empty are all ones.
+void GSMScenario::reportEquivalentPLMNsInNibbles()
+{
+    constexpr std::size_t slots = 5;
+    constexpr std::int64_t empty = 0xFFFFFF;
+    const List& list = GSMLayouts::equivalentPLMNList;
+    RecordWriter record(GSMLayouts::equivalentPLMNs);
+    record.set("registered network", 0x70F262);
+    for (const std::int64_t digits : {0x10F262, 0x30F262})
+        record.add(list).set("digits", digits);
+    const RecordElements all{list.offset, list.stride, slots, list.needed};
+    for (std::size_t i = 2; i < slots; ++i)
+        record.at(all, i, list.unshown).set("digits", empty);
     report(record);
 }
 
@@ -266,6 +284,14 @@ void GSMScenario::reportGSMState()
 void GSMScenario::reportGSMCell()
 {
     const GSMRideCell& cell = _ride.gsmCell();
+    if (_isNewer) {
+        constexpr int gsm900 = 8;
+        report(RecordWriter(GSMLayouts::cellIdentityWithBand)
+                   .set("ARFCN", cell.arfcn)
+                   .set("band", gsm900)
+                   .set("Cell ID", cell.cellIdentity));
+        return;
+    }
     report(RecordWriter(GSMRecords::cellIdentity)
                .set("ARFCN", cell.arfcn)
                .set("BSIC", cell.bsic)
@@ -348,11 +374,14 @@ void GSMScenario::reportUMTSCell()
 {
     constexpr std::uint16_t duplexSpacing = 950; // channels of 200 kHz: 190 MHz
     const UMTSRideCell& cell = _ride.umtsCell();
-    report(RecordWriter(GSMRecords::umtsCell)
-               .set("Uplink Frequency", cell.uarfcn - duplexSpacing)
-               .set("Downlink Frequency", cell.uarfcn)
-               .set("Cell ID", cell.cellIdentity)
-               .set("URA ID", cell.uraId));
+    RecordWriter record(_isNewer ? GSMLayouts::umtsCell45 : GSMRecords::umtsCell);
+    record.set("Uplink Frequency", cell.uarfcn - duplexSpacing)
+        .set("Downlink Frequency", cell.uarfcn)
+        .set("Cell ID", cell.cellIdentity)
+        .set("URA ID", cell.uraId);
+    if (_isNewer)
+        record.set("Scrambling Code", cell.scramblingCode);
+    report(record);
     report(RecordWriter(GSMRecords::security).set("Ciphering", 1));
 }
 
@@ -391,35 +420,51 @@ void GSMScenario::reportTransmitPower()
 }
 
 // Either list begins at the same place, so a record holds one: cells of the own technology while
-// they are good enough, GSM cells towards the end of the rest.
+// they are good enough, GSM cells towards the end of the rest. In newer layouts they follow each
+// other.
 void GSMScenario::reportRankedCells()
 {
     constexpr int stepsOnOwnTechnology = 100;
-    RecordWriter record(GSMRecords::rankedCells);
-    if (_ride.phase() == Phase::umtsCamping && _ride.stepsInPhase() > stepsOnOwnTechnology) {
-        for (const GSMRideCell* cell : _ride.gsmNeighbors()) {
-            const double level = _ride.rssi(*cell);
-            record.add(GSMRecords::rankedGSMCells)
-                .set("ARFCN", cell->arfcn)
-                .set("BSIC", cell->bsic)
-                .level("RSSI", level)
-                .level("Ranking Value", level);
-        }
-    } else {
-        auto cells = _ride.umtsNeighbors();
-        cells.insert(cells.begin(), &_ride.umtsCell());
-        for (const UMTSRideCell* cell : cells) {
-            const double level = _ride.rscp(*cell);
-            record.add(GSMRecords::rankedUMTSCells)
-                .set("Downlink Frequency", cell->uarfcn)
-                .set("Scrambling Code", cell->scramblingCode)
-                .level("RSCP", level)
-                .level("Rank Cell RSCP", level)
-                .level("Energy Per Chip", _ride.ecno(*cell))
-                .level("Ranking Value", level);
-        }
-    }
+    const bool isWithGSM =
+        _ride.phase() == Phase::umtsCamping && _ride.stepsInPhase() > stepsOnOwnTechnology;
+    RecordWriter record(_isNewer ? GSMLayouts::rankedCells2 : GSMRecords::rankedCells);
+    if (_isNewer)
+        record.set("version", 2);
+    if (_isNewer || !isWithGSM)
+        addRankedUMTSCells(record,
+                           _isNewer ? GSMLayouts::rankedUMTSCells2 : GSMRecords::rankedUMTSCells);
+    if (isWithGSM)
+        addRankedGSMCells(record,
+                          _isNewer ? GSMLayouts::rankedGSMCells2 : GSMRecords::rankedGSMCells);
     report(record);
+}
+
+void GSMScenario::addRankedUMTSCells(RecordWriter& record, const List& list)
+{
+    auto cells = _ride.umtsNeighbors();
+    cells.insert(cells.begin(), &_ride.umtsCell());
+    for (const UMTSRideCell* cell : cells) {
+        const double level = _ride.rscp(*cell);
+        record.add(list)
+            .set("Downlink Frequency", cell->uarfcn)
+            .set("Scrambling Code", cell->scramblingCode)
+            .level("RSCP", level)
+            .level("Rank Cell RSCP", level)
+            .level("Energy Per Chip", _ride.ecno(*cell))
+            .level("Ranking Value", level);
+    }
+}
+
+void GSMScenario::addRankedGSMCells(RecordWriter& record, const List& list)
+{
+    for (const GSMRideCell* cell : _ride.gsmNeighbors()) {
+        const double level = _ride.rssi(*cell);
+        record.add(list)
+            .set("ARFCN", cell->arfcn)
+            .set("BSIC", cell->bsic)
+            .level("RSSI", level)
+            .level("Ranking Value", level);
+    }
 }
 
 void GSMScenario::reportBlockErrors()

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "TelephonyService/GSMRide.h"
 #include "TelephonyService/Scenario.h"
 
@@ -16,7 +17,10 @@ namespace ventrik
 class GSMScenario : public Scenario
 {
   public:
-    explicit GSMScenario(std::uint32_t seed) : _ride(seed) {}
+    explicit GSMScenario(std::uint32_t seed, RecordsMode records = RecordsMode::Base)
+        : _isNewer(records != RecordsMode::Base), _ride(seed)
+    {
+    }
 
   private:
     static constexpr std::size_t transportChannelCount = 3;
@@ -36,6 +40,7 @@ class GSMScenario : public Scenario
     // The network and the registration
     void reportServingPLMN();
     void reportEquivalentPLMNs();
+    void reportEquivalentPLMNsInNibbles();
     void reportRegistration();
     void reportMobilityManagement();
 
@@ -53,11 +58,14 @@ class GSMScenario : public Scenario
     void reportCellEnergies();
     void reportTransmitPower();
     void reportRankedCells();
+    void addRankedUMTSCells(RecordWriter& record, const List& list);
+    void addRankedGSMCells(RecordWriter& record, const List& list);
     void reportBlockErrors();
     void reportHSDPA();
 
     void reportCellMonitor();
 
+    const bool _isNewer; // the layouts of its records
     GSMRide _ride;
     std::array<BlockCounter, transportChannelCount> _blocks{};
 };

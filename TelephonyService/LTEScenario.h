@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "TelephonyService/LTEDrive.h"
 #include "TelephonyService/Scenario.h"
 
@@ -15,7 +16,10 @@ namespace ventrik
 class LTEScenario : public Scenario
 {
   public:
-    explicit LTEScenario(std::uint32_t seed) : _drive(seed) {}
+    explicit LTEScenario(std::uint32_t seed, RecordsMode records = RecordsMode::Base)
+        : _records(records), _drive(seed)
+    {
+    }
 
   private:
     void reportStep() override;
@@ -28,8 +32,20 @@ class LTEScenario : public Scenario
     void reportIdleNeighbors();
     void reportReselectionCandidates();
     void reportCellMonitor();
+
+    // Records that have no base layout
+    void reportServingCellSignal();
+    void reportNeighborSignal(const Record& record, std::uint8_t request, std::uint8_t version);
+    void reportConnection();
+    void reportRegistration(std::uint8_t state);
+    void reportMessage(std::uint8_t bearer, std::uint8_t channel, std::uint16_t length);
+
+    bool isNewer() const { return _records != RecordsMode::Base; }
+    bool isExtended() const { return _records == RecordsMode::Extended; }
+    std::int64_t frame() const;
     std::vector<const LTECell*> neighborsOfServingCell() const;
 
+    const RecordsMode _records;
     LTEDrive _drive;
     bool _wasConnected = false;
 };

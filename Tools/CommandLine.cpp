@@ -222,6 +222,16 @@ void CommandLine::addArgument(std::string name, std::string help, std::string& t
         ->required();
 }
 
+void CommandLine::addArguments(std::string name, std::string help, std::vector<std::string>& target)
+{
+    _parser
+        ->add(std::move(name), std::move(help),
+              [&target](const auto& value) { target.push_back(value); })
+        ->expected(-1)
+        ->type_name("")
+        ->required();
+}
+
 void CommandLine::addLogOptions(std::string_view lines, int& level, std::string verboseHelp,
                                 bool& verbose)
 {

@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 namespace ventrik
 {
@@ -42,6 +43,8 @@ class CommandLine
     }
     /// The one argument, which must be there.
     void addArgument(std::string name, std::string help, std::string& target);
+    /// The arguments, of which there must be one at least.
+    void addArguments(std::string name, std::string help, std::vector<std::string>& target);
     /// --log-level and --verbose, with their present values as the defaults. The level's help says
     /// which lines it is about.
     void addLogOptions(std::string_view lines, int& level, std::string verboseHelp, bool& verbose);

@@ -1,6 +1,7 @@
 #include "Tools/DecodeCommand.h"
 
 #include "Capture/SnapshotFile.h"
+#include "Files/PrivateFile.h"
 #include "LogGenerator/Core/AssertionFailure.h"
 #include "LogGenerator/Core/DateText.h"
 #include "Model/TreePrinter.h"
@@ -11,6 +12,7 @@
 #include "Tools/FileSystemLog.h"
 #include "Tools/Json.h"
 #include "Tools/OfflineDecoder.h"
+#include "Tools/RecordReports.h"
 
 #include <array>
 #include <atomic>
@@ -77,7 +79,8 @@ class Decoding
           _clock(clock),
           _technology(technology),
           _output(output),
-          _decoder(generator, clock)
+          _decoder(generator, clock),
+          _census(options.records)
     {
     }
 
@@ -102,6 +105,7 @@ class Decoding
             status = tellOutputFailure("ventrik-decode", "writing the result", _outputError);
         if (!writeSnapshotFile())
             status = DecodeStatus::badInput;
+        tellAboutRecords();
         return interrupted ? DecodeStatus::interrupted : status;
     }
 
@@ -133,10 +137,32 @@ class Decoding
                 return;
             }
             _decoder.take(*message);
+            count(*message);
             if (_options.format == DecodeFormat::JsonLines)
                 writeLine(*message);
             progress.count(++_packets);
         }
+    }
+
+    void count(const CapturedMessage& message)
+    {
+        if (_options.statistics)
+            _census.take(message.data);
+        if (_options.records != RecordsMode::Extended && message.data.size() >= logPacketHeaderSize)
+            _extensionCount += isExtensionOnly(LogPacket(stripPrefix(message.data))) ? 1 : 0;
+    }
+
+    // Only where there is something that the result cannot tell.
+    void tellAboutRecords()
+    {
+        for (const ReadLayout& layout : _decoder.layouts())
+            if (layout.kind == LayoutKind::NotKnown)
+                complain(fmt::format("{}: {}", _options.capture, warningOf(layout)));
+        if (_extensionCount > 0)
+            complain(fmt::format("{}: {} records that only --records extended decodes",
+                                 _options.capture, _extensionCount));
+        if (_options.statistics)
+            show(recordTable(_census));
     }
 
     void appendDisplay()
@@ -216,6 +242,8 @@ class Decoding
     std::FILE* _output;
     int _outputError = 0;
     OfflineDecoder _decoder;
+    RecordCensus _census;
+    std::size_t _extensionCount = 0; // of records that the present mode leaves aside
     std::size_t _packets = 0;
     std::string _text;
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
@@ -285,6 +313,53 @@ try {
 } catch (const std::bad_alloc&) {
     complain(fmt::format("{}: out of memory", options.capture));
     return DecodeStatus::badInput;
+}
+
+namespace
+{
+
+// False when it could not be read to its end.
+bool countRecords(const std::string& capture, RecordCensus& census)
+{
+    std::string error;
+    auto reader = CaptureReader::open(capture, error);
+    Progress progress;
+    std::size_t count = 0;
+    for (bool isMore = reader.has_value(); isMore && !interrupted;) {
+        const auto message = reader->next();
+        if (message) {
+            census.take(message->data);
+            progress.count(++count);
+        } else {
+            error = reader->error();
+            isMore = false;
+        }
+    }
+    if (!error.empty() && !interrupted)
+        complain(error);
+    return error.empty();
+}
+
+} // namespace
+
+int reportUnknownRecords(const UnknownReportOptions& options)
+{
+    RecordCensus census(RecordsMode::Extended);
+    bool isWhole = true;
+    for (const std::string& capture : options.captures)
+        isWhole = !interrupted && countRecords(capture, census) && isWhole;
+    if (interrupted)
+        return DecodeStatus::interrupted;
+    std::string error;
+    auto file = PrivateFile::create(options.file, error);
+    if (file)
+        file->write(unknownRecordReport(census, options.withBytes));
+    if (!file || !file->commit(error)) {
+        complain(error);
+        return DecodeStatus::badInput;
+    }
+    complain(reportNotice(options.file, options.withBytes));
+    return isWhole ? DecodeStatus::done : DecodeStatus::badInput;
 }
 
 void interruptDecoding()

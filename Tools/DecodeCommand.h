@@ -26,6 +26,13 @@ struct DecodeOptions {
     std::string version;
     bool verbose = false;              ///< shows the log and the decoders' console
     int logLevel = LogPriority::debug; ///< the least urgent lines that are shown
+    bool statistics = false;           ///< a table of the records, on standard error
+};
+
+struct UnknownReportOptions {
+    std::string file;
+    std::vector<std::string> captures; ///< as in DecodeOptions
+    bool withBytes = false;
 };
 
 /// Exit statuses of the offline decoder.
@@ -40,6 +47,10 @@ inline constexpr int interrupted = 130;
 /// Decodes a capture and writes the result to `output`, and one line for each failure to standard
 /// error. What was decoded before damage is still written.
 int decodeCapture(const DecodeOptions& options, std::FILE* output);
+
+/// Writes what is in captures that cannot be read to a file. One line for each failure to standard
+/// error; what is in front of damage counts, and the other captures do.
+int reportUnknownRecords(const UnknownReportOptions& options);
 
 /// Makes a running `decodeCapture` end after its present message. Safe in a signal handler.
 void interruptDecoding();

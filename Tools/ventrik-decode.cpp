@@ -27,9 +27,13 @@ DecodeFormat formatValue(const std::string& text)
     return format->second;
 }
 
+struct Options {
+    DecodeOptions decode;
+    UnknownReportOptions report; // where it has a file
+};
+
 void addOptions(CommandLine& line, DecodeOptions& result)
 {
-    line.addArgument("CAPTURE", "a pcap file; - for standard input", result.capture);
     line.addOption("--technology NAME",
                    technologyNames() + "; needed where the capture does not tell",
                    result.technology, technologyValue);
@@ -50,6 +54,10 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    [&](const std::string& directory) {
                        result.resourceDirectories = {directoryValue(directory)};
                    });
+    line.addFlag("--statistics",
+                 "ends with a table of the records by code, version, size and layout, on standard "
+                 "error",
+                 result.statistics);
     line.addLogOptions("--verbose shows", result.logLevel,
                        "shows the system log on standard error, and what decoders tell",
                        result.verbose);
@@ -59,15 +67,36 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                        "printed), or the result cannot be written");
 }
 
-DecodeOptions parseArguments(int argc, char** argv)
+void addReportOptions(CommandLine& line, UnknownReportOptions& result)
+{
+    line.addArguments("CAPTURE", "a pcap file; - for standard input", result.captures);
+    line.beginGroup("Records that cannot be read");
+    line.addOption("--report-unknown FILE",
+                   "writes which there are to FILE, to be sent to us, and nothing else: codes, "
+                   "versions, sizes and counts",
+                   result.file, textValue);
+    line.addFlag("--with-bytes",
+                 "also the first payload of each, of measurements that hold no identities",
+                 result.withBytes);
+}
+
+Options parseArguments(int argc, char** argv)
 {
     CommandLine line("ventrik-decode",
                      "Decodes a capture of log-channel messages and prints the display that the "
                      "viewer would show. Time is the capture's.");
-    DecodeOptions result;
-    result.version = VENTRIK_VERSION;
-    addOptions(line, result);
+    line.addUsage("[OPTION]... CAPTURE");
+    line.addUsage("--report-unknown FILE [--with-bytes] CAPTURE...");
+    Options result;
+    result.decode.version = VENTRIK_VERSION;
+    addOptions(line, result.decode);
+    addReportOptions(line, result.report);
     line.parse(argc, argv);
+    if (result.report.file.empty() && result.report.captures.size() > 1)
+        line.refuse(fmt::format("what is '{}'?", result.report.captures[1]));
+    if (result.report.file.empty() && result.report.withBytes)
+        line.refuse("--with-bytes goes with --report-unknown");
+    result.decode.capture = result.report.captures.front();
     return result;
 }
 
@@ -101,12 +130,16 @@ void endOnInterrupt()
 int main(int argc, char** argv)
 {
     prepareStandardStreams();
-    const DecodeOptions options = parseArguments(argc, argv);
-    std::FILE* output = takeStandardOutput(options.verbose);
+    const Options options = parseArguments(argc, argv);
+    if (!options.report.file.empty()) {
+        endOnInterrupt();
+        return reportUnknownRecords(options.report);
+    }
+    std::FILE* output = takeStandardOutput(options.decode.verbose);
     if (!output) {
         complain("ventrik-decode", "standard output is closed");
         return DecodeStatus::badInput;
     }
     endOnInterrupt();
-    return decodeCapture(options, output);
+    return decodeCapture(options.decode, output);
 }

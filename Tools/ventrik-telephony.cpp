@@ -22,6 +22,7 @@ namespace
 struct ServiceOptions {
     std::optional<Technology> technology;
     std::uint32_t seed = 1;
+    RecordsMode records = RecordsMode::Base;
     std::optional<std::string> captureToWrite;
     std::uint32_t messageCount = 10000;
     std::optional<ReplayOptions> replay;
@@ -50,6 +51,10 @@ void addScenarioOptions(CommandLine& line, ServiceOptions& result)
                    "another drive through the same scenario (default 1); the same number gives "
                    "the same drive",
                    result.seed, wholeNumberValue);
+    line.addOption("--records LAYOUTS",
+                   "the scenario's records: base (default); newer: in the layouts that devices of "
+                   "today log; extended: also those that have no base layout",
+                   result.records, recordsValue);
     line.addOption("--write CAPTURE",
                    "writes the scenario's messages to a capture instead, and ends",
                    result.captureToWrite, textValue);
@@ -105,10 +110,11 @@ std::optional<LogChannelContent> makeContent(const ServiceOptions& options, Syst
                                              std::string& error)
 {
     if (options.technology) {
-        return LogChannelContent{std::string(options.technology->identifier),
-                                 [technology = *options.technology, seed = options.seed] {
-                                     return makeScenario(technology, seed);
-                                 }};
+        return LogChannelContent{
+            std::string(options.technology->identifier),
+            [technology = *options.technology, seed = options.seed, records = options.records] {
+                return makeScenario(technology, seed, records);
+            }};
     }
     const auto reader = CaptureReader::open(options.replay->capture, error);
     if (!reader)
@@ -137,7 +143,7 @@ int fail(std::string_view reason)
 
 int writeCapture(const ServiceOptions& options)
 {
-    const auto scenario = makeScenario(*options.technology, options.seed);
+    const auto scenario = makeScenario(*options.technology, options.seed, options.records);
     std::string error;
     if (writeScenarioCapture(*scenario, options.messageCount, *options.technology,
                              *options.captureToWrite, error))

@@ -46,7 +46,7 @@ class LogGenerator
                                                 std::span<const std::string_view> path) const;
 
     /// How the records were read, the last one of each log code, that the section shows which
-    /// stands at that path or holds it; empty outside of sections.
+    /// stands at that path or holds it; empty outside of sections. An empty path: of all sections.
     virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                               std::span<const std::string_view> path) const;
 

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <map>
 
 namespace ventrik
 {
@@ -139,7 +140,19 @@ std::vector<ReadLayout> OrbelLogGenerator2::layoutsAt(const PlistDictionary&,
     for (const std::string_view name : path)
         if (const Base* section = cIndex ? cIndex->getClass(name) : nullptr)
             return section->layouts();
-    return {};
+    return path.empty() && cIndex ? layoutsOfAllSections() : std::vector<ReadLayout>();
+}
+
+std::vector<ReadLayout> OrbelLogGenerator2::layoutsOfAllSections() const
+{
+    std::map<std::uint32_t, ReadLayout> layouts;
+    for (const auto& [name, section] : cIndex->sections())
+        for (const ReadLayout& layout : section->layouts())
+            layouts.emplace(layout.logCode, layout);
+    std::vector<ReadLayout> result;
+    for (const auto& [code, layout] : layouts)
+        result.push_back(layout);
+    return result;
 }
 
 // An extended display has places that the plain one has not.

@@ -50,6 +50,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     /// The display in the state; null in the call that builds it, and when there is none.
     const PlistValue* ensureDisplay(PlistDictionary& state);
     std::optional<PlistValue> buildDisplay(PlistDictionary& state);
+    std::vector<ReadLayout> layoutsOfAllSections() const;
     /// Of which displays this one may go on with.
     std::string displayOwner() const;
     void bindSection(std::string_view name, const PlistValue& container);

@@ -55,7 +55,7 @@ void LTEServingCellInfo::decode(const ShownRecord& shown, const LogPacket& packe
 bool LTEServingCellInfo::isOfOtherCell(const Record& record, const LogPacket& packet) const
 {
     const Field* identity = record.find("physical cell identity");
-    const Field* earfcn = record.find("EARFCN");
+    const Field* earfcn = record.find("frequency");
     return _servingCell && identity && earfcn &&
            *_servingCell != Cell{numberOf(packet, *identity), numberOf(packet, *earfcn)};
 }

@@ -60,10 +60,11 @@ void NeighborSignalMisc::decode(const ShownRecord& shown, const LogPacket& packe
 {
     if (!shown.record->subpacket)
         return Base::decode(shown, packet);
-    for (const auto& [subpacket, layout] : neighborResponses(*shown.record, packet))
-        for (const Field& field : layout->header)
-            if (subpacket.bytes.size() >= layout->cells->offset)
-                show(field, numberOf(subpacket.bytes, field), subpacket.start);
+    for (const auto& [subpacket, layout] : neighborResponses(*shown.record, packet)) {
+        const Field& earfcn = layout->header.front();
+        if (subpacket.bytes.size() >= layout->cells->offset)
+            show(earfcn, numberOf(subpacket.bytes, earfcn), subpacket.start);
+    }
 }
 
 NeighborMeasurementMisc::NeighborMeasurementMisc(SystemLog& log)

@@ -32,7 +32,7 @@ struct SignalCell {
     bool isAlone() const { return version.servingBit == 0; }
     bool isServing() const { return isAlone() || numberOf(bytes, fields.serving) != 0; }
     std::int64_t carrier() const { return isAlone() ? 0 : numberOf(bytes, fields.carrier); }
-    std::int64_t earfcn() const { return numberOf(subpacket.bytes, fields.earfcn); }
+    std::int64_t earfcn() const { return numberOf(subpacket.bytes, fields.earfcn()); }
     bool hasMeasured(std::size_t antenna) const;
 };
 
@@ -76,8 +76,7 @@ void forEachCell(const LogPacket& packet, const Use& use)
             std::ranges::find(signalVersions, subpacket.version, &SignalVersion::version);
         if (version == signalVersions.end())
             continue;
-        const SignalFields& fields =
-            signalFieldsOfVersions[static_cast<std::size_t>(version - signalVersions.begin())];
+        const SignalFields& fields = signalFieldsOf(*version);
         const RecordElements cells = cellsOf(*version, fields, subpacket.bytes);
         for (std::size_t i = 0; i < cells.completeIn(subpacket.bytes); ++i)
             use(SignalCell{cells.element(subpacket.bytes, i),
@@ -99,7 +98,7 @@ void ServingCellSignal::decode(const ShownRecord&, const LogPacket& packet)
             for (const Field& field : fields)
                 show(field, numberOf(cell.bytes, field), cell.start);
         };
-        show(cell.fields.earfcn, cell.earfcn(), cell.subpacket.start);
+        show(cell.fields.earfcn(), cell.earfcn(), cell.subpacket.start);
         showAll(cell.fields.cell());
         for (std::size_t i = 0; i < cell.version.order->antennaCount; ++i)
             if (cell.hasMeasured(i))
@@ -114,7 +113,7 @@ void SignalByCell::decode(const ShownRecord& shown, const LogPacket& packet)
     RowList::Rewrite rows = rewriteRows(*shown.record);
     forEachCell(packet, [&](const SignalCell& cell) {
         rows.nextRow(cell.start);
-        rows.showWorkedOut(cell.fields.earfcn, cell.earfcn()); // it stands in front of the cells
+        rows.showWorkedOut(cell.fields.earfcn(), cell.earfcn()); // it stands in front of the cells
         rows.show(cell.fields.cell(), cell.bytes);
         for (std::size_t i = 0; i < cell.version.order->antennaCount; ++i)
             if (cell.hasMeasured(i))

@@ -1,0 +1,56 @@
+#pragma once
+
+#include "Packets/Layouts.h"
+#include "PropertyList/Bytes.h"
+
+#include <compare>
+#include <map>
+
+namespace ventrik
+{
+
+/// Counts the records of messages, as they arrive, by log code, version, size and layout. Of kinds
+/// beyond a limit only the records are counted, so that no input makes it grow without end.
+class RecordCensus
+{
+  public:
+    /// What the layouts are judged by.
+    explicit RecordCensus(RecordsMode mode) : _mode(mode) {}
+
+    void take(ByteView message);
+
+    struct Kind {
+        std::uint32_t logCode; ///< effective
+        std::optional<std::uint8_t> version;
+        std::size_t size; ///< of the packet, its header included
+        /// None for a code that nobody decodes.
+        std::optional<LayoutKind> layout;
+
+        auto operator<=>(const Kind&) const = default;
+    };
+    struct Counted {
+        std::size_t count = 0;
+        Bytes firstPayload;
+    };
+    /// In the order of code, version and size.
+    const std::map<Kind, Counted>& kinds() const { return _kinds; }
+    /// Of further kinds.
+    std::size_t otherCount() const { return _otherCount; }
+    /// Those that are too short to have a code, or of a type that no record has.
+    std::size_t brokenCount() const { return _brokenCount; }
+
+    static constexpr std::size_t maximumKinds = 10000;
+
+  private:
+    Kind kindOf(const LogPacket& packet) const;
+
+    RecordsMode _mode;
+    std::map<Kind, Counted> _kinds;
+    std::size_t _otherCount = 0;
+    std::size_t _brokenCount = 0;
+};
+
+/// Whether the record is one that only those decode who ask for more than the base records.
+bool isExtensionOnly(const LogPacket& packet);
+
+} // namespace ventrik

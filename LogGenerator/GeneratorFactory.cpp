@@ -44,4 +44,14 @@ LogGenerator::generatorFromTechnology(const PlistValue& technology,
     return nullptr;
 }
 
+std::function<std::unique_ptr<LogGenerator>(const PlistValue&, const GeneratorServices&)>
+LogGenerator::generatorsReading(RecordsMode records)
+{
+    return [records](const PlistValue& technology, const GeneratorServices& services) {
+        GeneratorServices with = services;
+        with.records = records;
+        return generatorFromTechnology(technology, with);
+    };
+}
+
 } // namespace ventrik

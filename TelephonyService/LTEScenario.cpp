@@ -219,7 +219,9 @@ void LTEScenario::reportIdleNeighbors()
             .level("Srxlev", average - qrxlevmin)
             .set("Frequency Offset", cell->physicalCellId % 40)
             .set("Ant 0 Frame Offset", static_cast<std::int64_t>(step() % 1024))
-            .set("Ant 0 Sample Offset", static_cast<std::int64_t>(cell->position));
+            .set("Ant 0 Sample Offset", static_cast<std::int64_t>(cell->position))
+            .set("Ant 1 Frame Offset", static_cast<std::int64_t>(step() % 1024))
+            .set("Ant 1 Sample Offset", static_cast<std::int64_t>(cell->position));
     }
     report(record);
     if (isExtended())

@@ -5,6 +5,7 @@
 #include "Packets/Layouts.h"
 #include "PropertyList/PlistValue.h"
 
+#include <functional>
 #include <memory>
 #include <optional>
 #include <span>
@@ -53,6 +54,11 @@ class LogGenerator
     /// A new generator for the service's technology identifier, or none if it is unknown.
     static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,
                                                                  const GeneratorServices& services);
+
+    /// The same for services that say nothing of the records: they are read so.
+    static std::function<std::unique_ptr<LogGenerator>(const PlistValue& technology,
+                                                       const GeneratorServices& services)>
+    generatorsReading(RecordsMode records);
 
     /// Records the state's display in its history, which never holds more than 5 entries.
     static void updateHistoryInState(PlistDictionary& state, const Clock& clock);

@@ -21,12 +21,15 @@ void TimedSystemLog::write(int priority, std::string_view text)
     CapturingSystemLog::write(priority, text);
 }
 
-HeadlessViewer::HeadlessViewer(const std::string& runtimeDirectory)
+HeadlessViewer::HeadlessViewer(const std::string& runtimeDirectory, RecordsMode records)
     : _ports(runtimeDirectory, _log),
-      _model({_mainQueue, _ports, _telephony, _log, _resources, _preferences, _clock}, [this] {
-          if (_model.topLevelNodes())
-              ++_redraws;
-      })
+      _model(
+          {_mainQueue, _ports, _telephony, _log, _resources, _preferences, _clock},
+          [this] {
+              if (_model.topLevelNodes())
+                  ++_redraws;
+          },
+          LogGenerator::generatorsReading(records))
 {
 }
 

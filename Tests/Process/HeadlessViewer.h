@@ -37,7 +37,8 @@ class TimedSystemLog : public CapturingSystemLog
 class HeadlessViewer
 {
   public:
-    explicit HeadlessViewer(const std::string& runtimeDirectory);
+    explicit HeadlessViewer(const std::string& runtimeDirectory,
+                            RecordsMode records = RecordsMode::Newer);
 
     /// Starts as the application does at its launch.
     void start();

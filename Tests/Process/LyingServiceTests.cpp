@@ -86,7 +86,7 @@ const std::vector<Fault> faults{
     {"stall-in-message", 5s + twoTicks},
 };
 
-std::string nameOf(const testing::TestParamInfo<Fault>& info)
+std::string nameOfFault(const testing::TestParamInfo<Fault>& info)
 {
     std::string name = info.param.lie;
     std::ranges::replace(name, '-', '_');
@@ -105,7 +105,7 @@ TEST_P(LostStream, IsLiveAgainInTime)
     EXPECT_EQ(viewer.log().timesOf(" ***** INVALIDATED ").size(), 1U);
 }
 
-INSTANTIATE_TEST_SUITE_P(OfAStandingChannel, LostStream, testing::ValuesIn(faults), nameOf);
+INSTANTIATE_TEST_SUITE_P(OfAStandingChannel, LostStream, testing::ValuesIn(faults), nameOfFault);
 
 TEST_F(LyingService, WhoseStreamEndsBeforeItsFirstMessageIsOpenedAgain)
 {

@@ -1,5 +1,7 @@
 #include "Model/PathIndex.h"
 
+#include "Model/VentrikModelNode.h"
+
 #include <algorithm>
 #include <functional>
 
@@ -59,10 +61,19 @@ PathIndex::Place& PathIndex::step(Place& before, std::string_view part)
     return made;
 }
 
-ModelNodePointer PathIndex::find(std::string_view path) const
+void PathIndex::put(Place& place, ModelNodePointer node, const Place* holder, std::string key)
+{
+    place.node = std::move(node);
+    if (holder != place.before || !key.empty())
+        _holdings.insert_or_assign(&place, Holding{holder, std::move(key)});
+    else if (!_holdings.empty())
+        _holdings.erase(&place);
+}
+
+const PathIndex::Place* PathIndex::placeAt(std::string_view path) const
 {
     if (path == "/")
-        return _root.node;
+        return &_root;
     if (!path.starts_with('/'))
         return nullptr;
     path.remove_prefix(1);
@@ -73,7 +84,29 @@ ModelNodePointer PathIndex::find(std::string_view path) const
             return nullptr;
         place = found->second;
     }
-    return place->node;
+    return place;
+}
+
+ModelNodePointer PathIndex::find(std::string_view path) const
+{
+    const Place* place = placeAt(path);
+    return place ? place->node : nullptr;
+}
+
+// The way out ends: a name leads deeper, and a node without one leaves its place to its holder, who
+// is put there after it.
+std::vector<std::string_view> PathIndex::keysOf(std::string_view path) const
+{
+    std::vector<std::string_view> keys;
+    const Place* place = placeAt(path);
+    while (place && place->node && place != &_root) {
+        const auto held = _holdings.find(place);
+        const bool hasKey = held != _holdings.end() && !held->second.key.empty();
+        keys.push_back(hasKey ? held->second.key : place->node->displayName());
+        place = held != _holdings.end() ? held->second.holder : place->before;
+    }
+    std::ranges::reverse(keys);
+    return keys;
 }
 
 std::string pathJoining(std::string_view path, std::string_view name)

@@ -6,6 +6,7 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <vector>
 
 namespace ventrik
 {
@@ -38,10 +39,15 @@ class PathIndex
     Place& root() { return _root; }
     /// The place of a child: exactly one "/" between the two, none doubled.
     Place& join(Place& parent, std::string_view name);
-    void put(Place& place, ModelNodePointer node) { place.node = std::move(node); }
+    /// The holder is the place of the node that this one is a child of; the key is the name where
+    /// none is given.
+    void put(Place& place, ModelNodePointer node, const Place* holder, std::string key = {});
 
     /// The node at a path, or null.
     ModelNodePointer find(std::string_view path) const;
+    /// The keys and row numbers under which the node at a path stands in the display, from the
+    /// outside in; empty where there is no node. They last as long as the index does.
+    std::vector<std::string_view> keysOf(std::string_view path) const;
 
   private:
     struct Key {
@@ -53,11 +59,21 @@ class PathIndex
         std::size_t operator()(const Key& key) const;
     };
 
+    /// Who holds a node, and under which key.
+    struct Holding {
+        const Place* holder;
+        std::string key; // empty: the node's name
+    };
+
     Place& step(Place& before, std::string_view part);
+    const Place* placeAt(std::string_view path) const;
 
     Place _root;
     std::deque<Place> _places; // all others; they stay where they are
     std::unordered_map<Key, Place*, KeyHash> _steps;
+    // Of the places only where that is not the place before, under the node's name: a list of a
+    // million rows needs none.
+    std::unordered_map<const Place*, Holding> _holdings;
 };
 
 /// The path of a child, by the same rule.

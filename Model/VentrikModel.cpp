@@ -1,9 +1,12 @@
 #include "Model/VentrikModel.h"
 
+#include "Packets/Plausibility.h"
 #include "Platform/Technology.h"
 #include "Platform/TelephonyProtocol.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
+
+#include <fmt/format.h>
 
 namespace ventrik
 {
@@ -33,6 +36,25 @@ ChannelFault faultOfRequest(const TelephonyError& error)
         return ChannelFault::Refused;
     return error.code == ClientError::answerNotUnderstood ? ChannelFault::BadAnswer
                                                           : ChannelFault::NoAnswer;
+}
+
+constexpr std::size_t mostLayoutWarnings = 2;
+
+// More may have come since the value was shown: then its text tells the number.
+std::string_view doubtOfShown(const ValueOrigin& origin, const std::string& value)
+{
+    return origin.field->shown.textOf(origin.raw) == value ? doubtOf(*origin.field, origin.raw)
+                                                           : doubtOfText(*origin.field, value);
+}
+
+// So many lines and one that counts the rest.
+void shorten(std::vector<std::string>& lines, std::size_t most)
+{
+    if (lines.size() <= most)
+        return;
+    const std::size_t rest = lines.size() - most;
+    lines.resize(most);
+    lines.push_back(fmt::format("and {} more", rest));
 }
 
 } // namespace
@@ -322,6 +344,29 @@ ModelNodePointer VentrikModel::nodeAtPath(const std::string& path)
     if (!_nodesByPath)
         topLevelNodes();
     return _nodesByPath ? _nodesByPath->find(path) : nullptr;
+}
+
+std::string_view VentrikModel::doubtAt(const std::string& path) const
+{
+    const ModelNodePointer node = _nodesByPath ? _nodesByPath->find(path) : nullptr;
+    if (!node || !node->value() || !_logGenerator)
+        return {};
+    if (node->date())
+        return doubtOf(*node->date());
+    const auto origin = _logGenerator->originOf(_state, _nodesByPath->keysOf(path));
+    return origin ? doubtOfShown(*origin, *node->value()) : std::string_view();
+}
+
+std::vector<std::string> VentrikModel::layoutWarningsAt(const std::string& path) const
+{
+    std::vector<std::string> lines;
+    if (!_nodesByPath || !_logGenerator)
+        return lines;
+    for (const ReadLayout& layout : _logGenerator->layoutsAt(_state, _nodesByPath->keysOf(path)))
+        if (layout.kind == LayoutKind::NotKnown)
+            lines.push_back(warningOf(layout));
+    shorten(lines, mostLayoutWarnings);
+    return lines;
 }
 
 void VentrikModel::updateWithData(ByteView data)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Core/LogGenerator.h"
+#include "Model/NodeNotes.h"
 #include "Model/VentrikModelNode.h"
 #include "Platform/Platform.h"
 
@@ -33,7 +34,7 @@ std::string_view channelFaultText(ChannelFault fault);
 ///
 /// Everything runs on the main queue, which blocks only in the sends to the service. Failures are
 /// told to the system log; the screens learn of them through `isConnected`.
-class VentrikModel
+class VentrikModel : public NodeNotes
 {
   public:
     using UpdateCallback = std::function<void()>;
@@ -44,7 +45,7 @@ class VentrikModel
     /// `updateScreens` is called on the main queue after a refresh that found something new.
     VentrikModel(const Platform& platform, UpdateCallback updateScreens,
                  GeneratorFactory makeGenerator = LogGenerator::generatorFromTechnology);
-    ~VentrikModel();
+    ~VentrikModel() override;
     VentrikModel(const VentrikModel&) = delete;
     VentrikModel& operator=(const VentrikModel&) = delete;
 
@@ -75,6 +76,10 @@ class VentrikModel
     /// none while there is no generator.
     ModelNodePointer topLevelNodes();
     ModelNodePointer nodeAtPath(const std::string& path);
+
+    /// Nothing is said of a tree that is not built.
+    std::string_view doubtAt(const std::string& path) const override;
+    std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
 
     /// Takes one message of the log channel.
     void updateWithData(ByteView data);

@@ -14,6 +14,7 @@ namespace
 {
 
 constexpr std::string_view sortedMarker = "_sorted";
+constexpr std::string_view notText = "(unknown)";
 
 // In sorted mode a key of the form order;label shows as its label.
 std::string_view labelOfSortedKey(std::string_view key)
@@ -29,10 +30,10 @@ class TreeBuilder
   public:
     explicit TreeBuilder(PathIndex& index) : _index(index) {}
 
-    ModelNodePointer build(std::string name, const PlistValue* object, PathIndex::Place& place)
+    ModelNodePointer buildRoot(std::string name, const PlistValue* object)
     {
-        auto node = makeNode(std::move(name), object, place);
-        _index.put(place, node);
+        auto node = makeNode(std::move(name), object, _index.root());
+        _index.put(_index.root(), node, nullptr);
         return node;
     }
 
@@ -47,14 +48,20 @@ class TreeBuilder
         if (object && object->array())
             return VentrikModelTreeNode::initWithName(std::move(name),
                                                       childrenOf(*object->array(), place));
-        return VentrikModelLeafNode::initWithName(std::move(name), "(unknown)");
+        if (object && object->date())
+            return std::make_shared<VentrikModelDateNode>(std::move(name), std::string(notText),
+                                                          *object->date());
+        return VentrikModelLeafNode::initWithName(std::move(name), std::string(notText));
     }
 
+    // The key is given where it is more than the name.
     ModelNodePointer buildChild(std::string name, const PlistValue& object,
-                                PathIndex::Place& parent)
+                                PathIndex::Place& parent, std::string key = {})
     {
         PathIndex::Place& place = _index.join(parent, name);
-        return build(std::move(name), &object, place);
+        auto node = makeNode(std::move(name), &object, place);
+        _index.put(place, node, &parent, std::move(key));
+        return node;
     }
 
     VentrikModelNode::Children childrenOf(const PlistDictionary& dictionary,
@@ -70,10 +77,12 @@ class TreeBuilder
 
         VentrikModelNode::Children children;
         children.reserve(entries.size());
-        for (const auto* entry : entries)
-            children.push_back(
-                buildChild(std::string(isSorted ? labelOfSortedKey(entry->key) : entry->key),
-                           entry->value, place));
+        for (const auto* entry : entries) {
+            const std::string_view name = isSorted ? labelOfSortedKey(entry->key) : entry->key;
+            const bool isWhole = name.size() == entry->key.size();
+            children.push_back(buildChild(std::string(name), entry->value, place,
+                                          isWhole ? std::string() : std::string(entry->key)));
+        }
         return children;
     }
 
@@ -101,7 +110,7 @@ class TreeBuilder
 
 ModelNodePointer VentrikModelNode::makeTreeFromObject(const PlistValue* object, PathIndex& index)
 {
-    return TreeBuilder(index).build("Ventrik", object, index.root());
+    return TreeBuilder(index).buildRoot("Ventrik", object);
 }
 
 ModelNodePointer VentrikModelLeafNode::initWithName(std::string name, std::string value)

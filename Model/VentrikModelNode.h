@@ -27,6 +27,8 @@ class VentrikModelNode
     virtual const Children* childNodes() const { return nullptr; }
     /// Null for an inner node.
     virtual const std::string* value() const { return nullptr; }
+    /// The date that the value stands for; null where it is none.
+    virtual const PlistDate* date() const { return nullptr; }
 
     /// Builds the tree of a display object with its root "Ventrik" at the path "/", and fills the
     /// path index. No object gives a root leaf "(unknown)".
@@ -50,6 +52,20 @@ class VentrikModelLeafNode : public VentrikModelNode
 
   private:
     std::string _string;
+};
+
+/// A name with a date, which shows as any value that is no text.
+class VentrikModelDateNode : public VentrikModelLeafNode
+{
+  public:
+    VentrikModelDateNode(std::string name, std::string value, PlistDate date)
+        : VentrikModelLeafNode(std::move(name), std::move(value)), _date(date)
+    {
+    }
+    const PlistDate* date() const override { return &_date; }
+
+  private:
+    PlistDate _date;
 };
 
 /// A name with children, in display order.

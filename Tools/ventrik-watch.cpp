@@ -40,10 +40,10 @@ WatchOptions parseArguments(int argc, char** argv)
 // On a terminal the new tree takes the place of the old one; elsewhere trees follow each other.
 // False, with errno, when it could not be written. A reader that takes nothing is waited for, but
 // not against the wish that the program ends.
-bool show(const VentrikModelNode& root)
+bool show(const VentrikModelNode& root, const NodeNotes& notes)
 {
     static const bool isTerminal = isatty(STDOUT_FILENO);
-    const std::string text = (isTerminal ? "\033[H\033[2J" : "") + printTree(root);
+    const std::string text = (isTerminal ? "\033[H\033[2J" : "") + printTree(root, notes);
     std::string_view rest = text;
     while (!writeText(STDOUT_FILENO, rest, Patience::Brief))
         if (errno != EAGAIN || TerminationSignals::haveCome())
@@ -73,7 +73,7 @@ int main(int argc, char** argv)
         const ModelNodePointer root = model->topLevelNodes();
         if (!root)
             return;
-        if (!show(*root))
+        if (!show(*root, *model))
             QCoreApplication::exit(tellOutputFailure("ventrik-watch", "standard output", errno));
         else if (options.once)
             QCoreApplication::quit();

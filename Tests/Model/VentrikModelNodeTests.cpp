@@ -15,6 +15,9 @@ namespace ventrik
 namespace
 {
 
+using testing::ElementsAre;
+using testing::IsEmpty;
+
 class TreeTest : public testing::Test
 {
   protected:
@@ -194,6 +197,47 @@ TEST_F(TreeTest, NothingIsFoundWhereThereIsNoNode)
     treeOf(PlistDictionary{{"a/b", PlistDictionary{{"c", "v"}}}});
     for (const char* path : {"", "a", "/a", "/a/b/", "/a/b/c/", "//a/b", "/a/b/d", "/b", "xa/b"})
         EXPECT_EQ(index.find(path), nullptr) << path;
+}
+
+TEST_F(TreeTest, APathGivesTheKeysOfTheDisplayAndTheNumbersOfRows)
+{
+    treeOf(PlistDictionary{
+        {"3;Cells", PlistArray{"a", PlistDictionary{{"E-C/N", "v"}, {"2;x", "w"}}}},
+        {"_sorted", ""},
+    });
+    EXPECT_THAT(index.keysOf("/Cells"), ElementsAre("3;Cells"));
+    EXPECT_THAT(index.keysOf("/Cells/1/E-C/N"), ElementsAre("3;Cells", "1", "E-C/N"));
+    EXPECT_THAT(index.keysOf("/Cells/1/2;x"), ElementsAre("3;Cells", "1", "2;x"));
+    EXPECT_THAT(index.keysOf("/"), IsEmpty());
+    EXPECT_THAT(index.keysOf("/Cells/1/E-C"), IsEmpty());
+    EXPECT_THAT(index.keysOf("/3;Cells"), IsEmpty());
+}
+
+TEST_F(TreeTest, KeysAreThoseOfTheNodeThatIsFound)
+{
+    treeOf(PlistDictionary{
+        {"1;a", PlistDictionary{{"b", "first"}}}, {"2;a/b", "second"}, {"_sorted", ""}});
+    EXPECT_THAT(index.keysOf("/a/b"), ElementsAre("2;a/b"));
+    PathIndex other;
+    const PlistValue turned = PlistDictionary{
+        {"1;a/b", "first"}, {"2;a", PlistDictionary{{"b", "second"}}}, {"_sorted", ""}};
+    VentrikModelNode::makeTreeFromObject(&turned, other);
+    EXPECT_THAT(other.keysOf("/a/b"), ElementsAre("2;a", "b"));
+}
+
+TEST_F(TreeTest, KeysComeToAnEndWhateverSlashesTheNamesHold)
+{
+    const std::vector<std::string> names{"", "/", "a", "a/", "//a", "a//", "/a/", "a/a", "a//a"};
+    PlistValue object = "v";
+    for (int level = 0; level < 4; ++level) {
+        PlistDictionary outer;
+        for (const std::string& name : names)
+            outer.set(name, object);
+        object = outer;
+    }
+    treeOf(object);
+    for (const char* path : {"/a", "/a/", "/a//", "/a/a", "/a/a/a/a", "/a//a/", "/a/a/a/"})
+        EXPECT_LE(index.keysOf(path).size(), 4U) << path;
 }
 
 // Each of the children's paths is 100,000 characters long.

@@ -1,3 +1,4 @@
+#include "Tests/Process/LTECaptures.h"
 #include "Tests/Process/ProcessFixture.h"
 
 #include <csignal>
@@ -25,6 +26,16 @@ TEST_F(WatchProcess, OncePrintsATreeAndEnds)
     EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
     EXPECT_THAT(watch->output(), StartsWith("Ventrik\n"));
     EXPECT_THAT(watch->output(), HasSubstr("\n  Serving Cell Info\n"));
+}
+
+TEST_F(WatchProcess, MarksValuesThatCannotBe)
+{
+    const auto capture = PcapBytes(lteLinkType).record(captureStart, 0, cellInfoMessage(504));
+    const auto service = startReplay("cell.pcap", capture.bytes());
+    const auto watch = start("ventrik-watch", {"--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("    Physical Cell ID: 504 ⚠\n"
+                                           "    Download Frequency: 1300\n"));
 }
 
 TEST_F(WatchProcess, EndsOnSIGTERMAndLeavesNoSocket)

@@ -228,6 +228,16 @@ ModelNodePointer VentrikApp::nodeAtPath(const std::string& path)
     return _model ? _model->nodeAtPath(path) : nullptr;
 }
 
+std::string_view VentrikApp::doubtAt(const std::string& path) const
+{
+    return _model ? _model->doubtAt(path) : std::string_view();
+}
+
+std::vector<std::string> VentrikApp::layoutWarningsAt(const std::string& path) const
+{
+    return _model ? _model->layoutWarningsAt(path) : std::vector<std::string>();
+}
+
 StatusNote VentrikApp::statusNote() const
 {
     if (_savedMessage)

@@ -79,6 +79,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     /// Null also before launch and after termination.
     ModelNodePointer topLevelNodes() override;
     ModelNodePointer nodeAtPath(const std::string& path) override;
+    std::string_view doubtAt(const std::string& path) const override;
+    std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
     bool allowSaveButton() const override { return _allowSaveButton; }
     bool tintsChanges() const override { return _options.tintsChanges; }
     StatusNote statusNote() const override;

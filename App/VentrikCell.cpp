@@ -79,6 +79,14 @@ void VentrikCell::setValueText(const QString& text)
     updateAccessibleName();
 }
 
+void VentrikCell::setDoubt(const QString& line)
+{
+    if (!_value || line == accessibleDescription())
+        return;
+    setToolTip(plainToolTip(line));
+    setAccessibleDescription(line);
+}
+
 void VentrikCell::tintValue()
 {
     if (!_value || !Transition::isWanted(*this))

@@ -33,6 +33,10 @@ class VentrikCell : public TableRow
     void setKeyText(const QString& text);
     /// Does nothing in a row that has no value.
     void setValueText(const QString& text);
+    /// What is wrong with the value, told by the tool tip and to assistive technology; empty when
+    /// nothing is. Does nothing in a row that has no value.
+    void setDoubt(const QString& line);
+    bool isInDoubt() const { return _value && !accessibleDescription().isEmpty(); }
     /// Tints the value for a moment, unless the platform asks for less motion.
     void tintValue();
     /// Whether what goes on beyond the right edge fades there.

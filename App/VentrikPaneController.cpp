@@ -108,19 +108,22 @@ std::unique_ptr<VentrikCell> innerRow(TableView& table, const VentrikModelNode& 
     if (!cell)
         cell = VentrikCell::initWithStyleKey(rowStyle, identifier());
     cell->setKeyText(QString::fromStdString(node.displayName()));
+    cell->setDoubt(QString());
     cell->setAccessory(TableRowAccessory::DisclosureIndicator);
     cell->setValueText(QString());
     cell->setLayoutKey();
     return cell;
 }
 
-std::unique_ptr<VentrikCell> leafRow(TableView& table, const VentrikModelNode& node)
+std::unique_ptr<VentrikCell> leafRow(TableView& table, const VentrikModelNode& node,
+                                     const QString& doubt)
 {
     auto cell = dequeueCell(table);
     if (!cell)
         cell = VentrikCell::initWithStyle(rowStyle, identifier());
     cell->setKeyText(QString::fromStdString(node.displayName()));
-    cell->setAccessory(TableRowAccessory::None);
+    cell->setDoubt(doubt);
+    cell->setAccessory(cell->isInDoubt() ? TableRowAccessory::Warning : TableRowAccessory::None);
     cell->setValueText(QString::fromStdString(*node.value()));
     cell->setLayout();
     return cell;
@@ -189,6 +192,7 @@ void VentrikPaneController::reloadWithNode(ModelNodePointer node)
     updateTitle();
     table().reloadData(mappingBetween(_formerNodes, _nodes));
     _formerNodes = nullptr;
+    updateLayoutWarnings();
     createToolbarItems();
 }
 
@@ -197,10 +201,25 @@ void VentrikPaneController::updateTitle()
     setTitle(_nodes ? QString::fromStdString(_nodes->displayName()) : QStringLiteral("Ventrik"));
 }
 
+void VentrikPaneController::updateLayoutWarnings()
+{
+    QStringList lines;
+    for (const std::string& line : _host.layoutWarningsAt(_keyPath))
+        lines.append(QString::fromStdString(line));
+    setNotice(lines.join(u'\n'));
+}
+
+QString VentrikPaneController::doubtOf(const VentrikModelNode& leaf) const
+{
+    const std::string_view doubt = _host.doubtAt(pathJoining(_keyPath, leaf.displayName()));
+    return QString::fromUtf8(doubt.data(), static_cast<qsizetype>(doubt.size()));
+}
+
 void VentrikPaneController::viewWillAppear(bool animated)
 {
     TableScreen::viewWillAppear(animated);
     updateTitle();
+    updateLayoutWarnings();
     if (navigationStack())
         navigationStack()->setToolbarHidden(false);
     createToolbarItems();
@@ -231,7 +250,7 @@ std::unique_ptr<TableRow> VentrikPaneController::rowForIndexPath(TableView& tabl
                                                                  IndexPath indexPath)
 {
     const VentrikModelNode& child = *childAt(indexPath);
-    auto cell = child.childNodes() ? innerRow(table, child) : leafRow(table, child);
+    auto cell = child.childNodes() ? innerRow(table, child) : leafRow(table, child, doubtOf(child));
     if (HorizontalScrollView* view = cell->view()) {
         const auto offset = _contentOffsets.find(cell->key().text());
         view->setContentOffset(offset == _contentOffsets.end() ? 0 : offset->second);

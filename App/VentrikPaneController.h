@@ -2,6 +2,7 @@
 
 #include "App/StatusNote.h"
 #include "App/Toolkit/TableScreen.h"
+#include "Model/NodeNotes.h"
 #include "Model/VentrikModelNode.h"
 
 #include <map>
@@ -12,10 +13,9 @@ namespace ventrik
 {
 
 /// What the panes ask of the application.
-class VentrikPaneHost
+class VentrikPaneHost : public NodeNotes
 {
   public:
-    virtual ~VentrikPaneHost() = default;
     /// The nodes that panes show; null where there is none.
     virtual ModelNodePointer topLevelNodes() { return nullptr; }
     virtual ModelNodePointer nodeAtPath(const std::string&) { return nullptr; }
@@ -30,7 +30,8 @@ class VentrikPaneHost
 };
 
 /// A screen that shows the children of one node of the display tree, with the status below. A touch
-/// on a row that has children opens a pane for it.
+/// on a row that has children opens a pane for it. Values that cannot be right are marked, and
+/// above the rows stands which records were read without their layout being known.
 class VentrikPaneController : public TableScreen
 {
   public:
@@ -62,6 +63,8 @@ class VentrikPaneController : public TableScreen
     VentrikPaneController(VentrikPaneHost& host, ModelNodePointer node, std::string path);
 
     void updateTitle();
+    void updateLayoutWarnings();
+    QString doubtOf(const VentrikModelNode& leaf) const;
     QString reasonForNoRows() const;
     const VentrikModelNode::Children& children() const;
     const ModelNodePointer& childAt(IndexPath indexPath) const;

@@ -107,7 +107,7 @@ void TableRow::paintEvent(QPaintEvent*)
         drawKeyboardFrame(painter, rect().adjusted(0, 0, 0, -1), palette());
 }
 
-// A check mark says something; an indicator only hints.
+// A check mark and a warning say something; an indicator only hints.
 QColor TableRow::accessoryColor() const
 {
     if (_isSelected)
@@ -115,7 +115,7 @@ QColor TableRow::accessoryColor() const
     if (_accessory == TableRowAccessory::CheckMark)
         return palette().color(QPalette::Link);
     QColor grey = palette().color(QPalette::Text);
-    grey.setAlphaF(0.35F);
+    grey.setAlphaF(_accessory == TableRowAccessory::Warning ? 0.75F : 0.35F);
     return grey;
 }
 
@@ -134,7 +134,21 @@ void TableRow::paintAccessory(QPainter& painter) const
         painter.drawPolyline(
             QPolygonF{middle + QPointF(-6, 0), middle + QPointF(-2, 5), middle + QPointF(7, -6)});
         return;
+    case TableRowAccessory::Warning:
+        paintWarning(painter, middle);
+        return;
     }
+}
+
+// Drawn, for not every font has the sign, and some have it in colours of their own. Its right edge
+// stands where the texts of rows without an accessory end.
+void TableRow::paintWarning(QPainter& painter, const QPointF& middle) const
+{
+    painter.setPen(QPen(accessoryColor(), 1.5, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+    painter.drawPolygon(
+        QPolygonF{middle + QPointF(0, -6.5), middle + QPointF(6.5, 5), middle + QPointF(-6.5, 5)});
+    painter.drawLine(middle + QPointF(0, -2.5), middle + QPointF(0, 1));
+    painter.drawPoint(middle + QPointF(0, 3));
 }
 
 } // namespace ventrik

@@ -11,7 +11,7 @@ namespace ventrik
 class ElidingLabel;
 
 /// What a row shows at its right edge.
-enum class TableRowAccessory { None, DisclosureIndicator, CheckMark };
+enum class TableRowAccessory { None, DisclosureIndicator, CheckMark, Warning };
 
 /// A row of a table: a content area for a text or for what a subclass puts there, an accessory, and
 /// its selected look.
@@ -55,6 +55,7 @@ class TableRow : public QWidget
   private:
     QColor accessoryColor() const;
     void paintAccessory(QPainter& painter) const;
+    void paintWarning(QPainter& painter, const QPointF& middle) const;
 
     Style _style;
     QString _reuseIdentifier;

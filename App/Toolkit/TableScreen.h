@@ -3,6 +3,8 @@
 #include "App/Toolkit/Screen.h"
 #include "App/Toolkit/TableView.h"
 
+class QLabel;
+
 namespace ventrik
 {
 
@@ -14,11 +16,17 @@ class TableScreen : public Screen, public TableViewDataSource
 
     TableView& table() const { return *_table; }
 
+    /// What stands above the rows, in small print; nothing as a rule. Rows that are scrolled stay
+    /// where they are on the screen when it comes and goes.
+    void setNotice(const QString& text);
+    QString notice() const;
+
     /// Loads the table for its first appearance, and takes back the selection that led to another
     /// screen.
     void viewWillAppear(bool animated) override;
 
   private:
+    QLabel* _notice;
     TableView* _table;
     bool _isLoaded = false;
 };

@@ -10,6 +10,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cmath>
+
 namespace ventrik
 {
 
@@ -32,6 +35,22 @@ int boldWidth(const QString& text)
 int boldHeight()
 {
     return QFontMetrics(font15(true)).height();
+}
+
+// As the guidelines for accessible content have it.
+double luminance(const QColor& color)
+{
+    const auto linear = [](double part) {
+        return part <= 0.04045 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(color.redF()) + 0.7152 * linear(color.greenF()) +
+           0.0722 * linear(color.blueF());
+}
+
+double contrastBetween(const QColor& one, const QColor& other)
+{
+    const auto [less, more] = std::minmax(luminance(one), luminance(other));
+    return (more + 0.05) / (less + 0.05);
 }
 
 /// A platform that asks for less motion.
@@ -73,6 +92,18 @@ class VentrikCellTest : public testing::Test
         showAt(*cell, contentWidth, 50);
         showAt(*cell, 2 * contentWidth - cell->contentArea().width(), 50);
         ASSERT_EQ(cell->contentArea().width(), contentWidth);
+    }
+
+    // Between what stands at the right edge and the row's background.
+    double contrastOfSign()
+    {
+        const QImage picture = cell->grab(QRect(cell->width() - 34, 5, 34, 40)).toImage();
+        const QColor ground = picture.pixelColor(33, 5);
+        double contrast = 1;
+        for (int x = 0; x < picture.width(); ++x)
+            for (int y = 0; y < picture.height(); ++y)
+                contrast = std::max(contrast, contrastBetween(picture.pixelColor(x, y), ground));
+        return contrast;
     }
 
     std::unique_ptr<VentrikCell> cell;
@@ -204,6 +235,45 @@ TEST_F(VentrikCellTest, WhatFitsDoesNotMoveSideways)
     EXPECT_FALSE(cell->scrollSideways(1));
     inner(name, 500);
     EXPECT_FALSE(cell->scrollSideways(1));
+}
+
+TEST_F(VentrikCellTest, ADoubtIsToldAndTakenBack)
+{
+    leaf(name, shortValue, 300).setDoubt("Wrong");
+    EXPECT_TRUE(cell->isInDoubt());
+    EXPECT_EQ(cell->toolTip(), "Wrong");
+    EXPECT_EQ(cell->accessibleDescription(), "Wrong");
+    EXPECT_EQ(cell->accessibleName(), "Average RSRP, -94 dBm");
+    cell->setDoubt("");
+    EXPECT_FALSE(cell->isInDoubt());
+    EXPECT_EQ(cell->toolTip(), "");
+}
+
+TEST_F(VentrikCellTest, ADoubtStaysWhenTheRowIsSetOutAgain)
+{
+    leaf(name, longValue, 300).setDoubt("Wrong");
+    setContentWidth(200);
+    EXPECT_EQ(cell->toolTip(), "Wrong");
+}
+
+TEST_F(VentrikCellTest, ARowWithoutAValueIsNeverInDoubt)
+{
+    inner(longValue, 300).setDoubt("Wrong");
+    EXPECT_FALSE(cell->isInDoubt());
+    EXPECT_EQ(cell->toolTip(), longValue);
+}
+
+TEST_F(VentrikCellTest, TheSignOfADoubtIsReadableOnLightOnDarkAndOnASelectedRow)
+{
+    leaf(name, shortValue, 300);
+    cell->setAccessory(TableRowAccessory::Warning);
+    for (const QPalette& palette : {QPalette(Qt::white), QPalette(QColor(30, 30, 30))}) {
+        cell->setPalette(palette);
+        for (const bool selected : {false, true}) {
+            cell->setSelected(selected);
+            EXPECT_GT(contrastOfSign(), 3.0) << palette.color(QPalette::Base).name().toStdString();
+        }
+    }
 }
 
 TEST_F(VentrikCellTest, ATintGoesAwayByItself)

@@ -21,8 +21,6 @@ namespace
 constexpr int textPoints = 15;
 constexpr int leftMargin = 10;
 constexpr int gapBesideKey = 50;
-// What the key and the value need beside their own widths.
-constexpr int roomAroundKey = leftMargin + gapBesideKey;
 constexpr int scrolledHeight = 50;
 constexpr int sidewaysStep = 40;
 constexpr int tintMilliseconds = 900;
@@ -200,15 +198,23 @@ void VentrikCell::placeKey()
                       size.height());
 }
 
+// What the key and the value need beside their own widths. A sign takes its room from the gap: what
+// fits without it fits with it.
+int VentrikCell::roomAroundKey() const
+{
+    const bool hasSign = accessory() == TableRowAccessory::Warning;
+    return leftMargin + gapBesideKey - (hasSign ? accessoryWidth - rightMargin : 0);
+}
+
 void VentrikCell::placeValue()
 {
     const QRect bounds = contentArea().rect();
     const int keyWidth = measured(_key->text(), boldFont()).width();
     // Measured in the key's font, which is the wider one: a value has some air.
     const QSize size = measured(_value->text(), boldFont());
-    const int needed = keyWidth + roomAroundKey + size.width();
+    const int needed = keyWidth + roomAroundKey() + size.width();
     const int left = needed < bounds.width() ? bounds.width() - size.width()
-                                             : bounds.x() + keyWidth + roomAroundKey;
+                                             : bounds.x() + keyWidth + roomAroundKey();
     _value->setGeometry(left, centredTop(bounds, size), size.width(), size.height());
     // The air goes to the left as far as there is room, so that all values end at one line.
     const int textWidth = measured(_value->text(), _value->font()).width();

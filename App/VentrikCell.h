@@ -63,6 +63,7 @@ class VentrikCell : public TableRow
 
     void placeKey();
     void placeValue();
+    int roomAroundKey() const;
     int placeInRow(const QLabel& label, int x) const;
     void updateFade();
     void endTint();

@@ -14,8 +14,6 @@ namespace ventrik
 namespace
 {
 
-constexpr int accessoryWidth = 34;
-constexpr int rightMargin = 10; // where there is no accessory
 constexpr int textInset = 10;
 constexpr int textPoints = 15;
 constexpr int separatorInset = 10;

@@ -21,6 +21,9 @@ class TableRow : public QWidget
     /// How a row is set out; rows that set themselves out may have any style.
     enum class Style { Default = 0, Value = 1 };
 
+    static constexpr int accessoryWidth = 34;
+    static constexpr int rightMargin = 10; // where there is no accessory
+
     TableRow(Style style, QString reuseIdentifier);
 
     Style style() const { return _style; }

@@ -263,6 +263,15 @@ TEST_F(VentrikCellTest, ARowWithoutAValueIsNeverInDoubt)
     EXPECT_EQ(cell->toolTip(), longValue);
 }
 
+TEST_F(VentrikCellTest, AValueThatFitsWithoutASignFitsWithOne)
+{
+    leaf(name, shortValue, boldWidth(name) + 60 + boldWidth(shortValue));
+    cell->setAccessory(TableRowAccessory::Warning);
+    EXPECT_FALSE(cell->isFading());
+    EXPECT_EQ(cell->value()->geometry().right() + 1, cell->contentArea().width());
+    EXPECT_EQ(cell->view()->contentSize().width(), cell->contentArea().width());
+}
+
 TEST_F(VentrikCellTest, TheSignOfADoubtIsReadableOnLightOnDarkAndOnASelectedRow)
 {
     leaf(name, shortValue, 300);

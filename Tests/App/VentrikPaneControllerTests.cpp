@@ -42,6 +42,10 @@ class PaneTest : public testing::Test, public VentrikPaneHost
     void showSaveView() override { ++savePresses; }
     bool tintsChanges() const override { return changesTinted; }
     StatusNote statusNote() const override { return note; }
+    std::string_view doubtAt(const std::string& path) const override
+    {
+        return path == doubtfulPath ? "Wrong" : "";
+    }
     std::string reasonForNoData() const override { return noData; }
 
     void open(ModelNodePointer node, std::string path = "/")
@@ -79,6 +83,7 @@ class PaneTest : public testing::Test, public VentrikPaneHost
     int savePresses = 0;
     StatusNote note;
     std::string noData = "No service";
+    std::string doubtfulPath;
     VentrikPaneController* root = nullptr;
     std::unique_ptr<NavigationStack> stack;
 };
@@ -338,6 +343,35 @@ TEST_F(PaneTest, AnInnerNodeInARowFirstMadeForALeafShowsNoOldValue)
     EXPECT_EQ(cell(0).key().text(), "A");
     EXPECT_EQ(cell(0).value()->text(), "");
     EXPECT_EQ(cell(0).accessory(), TableRowAccessory::DisclosureIndicator);
+}
+
+TEST_F(PaneTest, ADoubtfulLeafIsMarkedByItsPath)
+{
+    doubtfulPath = "/Cell/a/b";
+    open(inner("Ventrik", {inner("Cell", {leaf("a/b", "1"), leaf("c", "2")}), leaf("a/b", "3")}));
+    EXPECT_EQ(cell(1).accessory(), TableRowAccessory::None);
+    click(0);
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::Warning);
+    EXPECT_EQ(cell(1).accessory(), TableRowAccessory::None);
+}
+
+TEST_F(PaneTest, AnInnerNodeInARowOfADoubtfulLeafIsNotInDoubt)
+{
+    doubtfulPath = "/B";
+    open(inner("Ventrik", {leaf("B", "1")}));
+    ASSERT_TRUE(cell(0).isInDoubt());
+    root->reloadWithNode(inner("Ventrik", {inner("B")}));
+    EXPECT_FALSE(cell(0).isInDoubt());
+    EXPECT_EQ(cell(0).toolTip(), "");
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::DisclosureIndicator);
+}
+
+TEST_F(PaneTest, ADoubtfulLeafInARowWithoutAValueHasNoSign)
+{
+    doubtfulPath = "/B";
+    open(inner("Ventrik", {inner("A")}));
+    root->reloadWithNode(inner("Ventrik", {leaf("B", "1")}));
+    EXPECT_EQ(cell(0).accessory(), TableRowAccessory::None);
 }
 
 TEST_F(PaneTest, ALongValueIsScrolledSidewaysByADragAndStaysSoOverAReload)

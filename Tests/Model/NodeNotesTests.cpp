@@ -240,6 +240,15 @@ TEST_F(NodeNotesTest, TheGeneratorIsAskedByTheDisplaysKeys)
     EXPECT_EQ(doubtAt("/Cell a/b/1/C/I"), levelDoubt);
 }
 
+TEST_F(NodeNotesTest, AValueIsJudgedByItsNumberMoreExactlyThanItShows)
+{
+    constexpr Field whole{"Level", u16(0), of(Quantity::RSRP, {.offset = -144.5, .unit = "dBm"})};
+    known.origins.insert_or_assign("Section>Level",
+                                   ValueOrigin{nullptr, std::nullopt, &whole, 0, 0});
+    show(section("Level", "-144 dBm"));
+    EXPECT_EQ(doubtAt("/Section/Level"), levelDoubt);
+}
+
 TEST_F(NodeNotesTest, AnInnerNodeAndAPlaceWithoutANodeHaveNoDoubt)
 {
     putLevel("Section", 0);

@@ -51,7 +51,9 @@ void VentrikApp::applicationDidFinishLaunching()
 {
     getSaveButtonPref();
     createWindow();
-    _model = std::make_shared<VentrikModel>(_platform, [this] { updateViewControllerFromModel(); });
+    _model = std::make_shared<VentrikModel>(
+        _platform, [this] { updateViewControllerFromModel(); },
+        LogGenerator::generatorsReading(_options.records));
     _model->setChannelCallback([this] { channelChanged(); });
     setUpdateMessage(connectingStatus);
     createDateFormatter();

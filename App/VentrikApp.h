@@ -25,8 +25,9 @@ struct VentrikAppOptions {
         "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
     std::string snapshotDirectory; ///< where Save writes
     bool animation = true;
-    bool tintsChanges = true;        ///< tints values that have changed for a moment
-    std::optional<QSize> windowSize; ///< none: as large as the main screen
+    bool tintsChanges = true;                 ///< tints values that have changed for a moment
+    RecordsMode records = RecordsMode::Newer; ///< by which layouts records are read
+    std::optional<QSize> windowSize;          ///< none: as large as the main screen
 };
 
 /// The application: builds the window, the model and the root pane, brings the screens up to

@@ -4,6 +4,7 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
 #include "Tools/CommandLine.h"
+#include "Tools/OptionValues.h"
 
 #include <QCoreApplication>
 
@@ -19,6 +20,7 @@ namespace
 
 struct WatchOptions {
     bool once = false;
+    RecordsMode records = RecordsMode::Newer;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };
@@ -29,6 +31,7 @@ WatchOptions parseArguments(int argc, char** argv)
                                       "time something new has arrived.");
     WatchOptions result;
     line.addFlag("--once", "ends after the first tree", result.once);
+    line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
@@ -69,7 +72,7 @@ int main(int argc, char** argv)
     const Platform platform = linuxPlatform.platform();
 
     std::unique_ptr<VentrikModel> model;
-    model = std::make_unique<VentrikModel>(platform, [&] {
+    const auto showTree = [&] {
         const ModelNodePointer root = model->topLevelNodes();
         if (!root)
             return;
@@ -77,7 +80,9 @@ int main(int argc, char** argv)
             QCoreApplication::exit(tellOutputFailure("ventrik-watch", "standard output", errno));
         else if (options.once)
             QCoreApplication::quit();
-    });
+    };
+    model = std::make_unique<VentrikModel>(platform, showTree,
+                                           LogGenerator::generatorsReading(options.records));
     platform.mainQueue.async([&] { model->restartMonitor(); });
     return QCoreApplication::exec();
 }

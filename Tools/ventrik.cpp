@@ -27,7 +27,9 @@ namespace
 
 struct ViewerOptions {
     VentrikAppOptions app;
-    std::string demoTechnology; // empty: no demo
+    std::string demoTechnology;         // empty: no demo
+    std::optional<RecordsMode> records; // none: the preference's
+    bool remembersRecords = false;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };
@@ -69,6 +71,10 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                  [&app = result.app] { app.animation = false; });
     line.addFlag("--plain", "no animation, and values that have changed are not tinted",
                  [&app = result.app] { app.animation = app.tintsChanges = false; });
+    line.addOption("--records LAYOUTS", recordsNames() + ", or the preference", result.records,
+                   recordsValue);
+    line.addFlag("--remember-records", "makes that the preference, for later runs",
+                 result.remembersRecords);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
@@ -84,6 +90,8 @@ ViewerOptions parseArguments(int argc, char** argv)
     result.app.snapshotDirectory = defaultDiagnosticLogDirectory();
     addOptions(line, result);
     line.parse(argc, argv);
+    if (result.remembersRecords && !result.records)
+        line.refuse("--remember-records goes with --records");
     return result;
 }
 
@@ -139,6 +147,27 @@ void undoSettingAtExit()
     running->log.flush();
 }
 
+// What the user has said now or, once, for later runs.
+RecordsMode chooseRecords(const ViewerOptions& options, LinuxPlatform& platform)
+{
+    constexpr std::string_view domain = "org.ventrik.Ventrik";
+    constexpr std::string_view key = "Records";
+    LinuxPreferences& preferences = platform.preferences();
+    if (options.records) {
+        if (options.remembersRecords) {
+            preferences.setText(domain, key, nameOf(*options.records));
+            preferences.synchronize(domain);
+        }
+        return *options.records;
+    }
+    const auto preference = preferences.text(domain, key);
+    const auto records = preference ? recordsModeNamed(*preference) : std::nullopt;
+    if (preference && !records)
+        platform.log().error("The preference {} of {} is none of base, newer and extended: {}", key,
+                             domain, *preference);
+    return records.value_or(RecordsMode::Newer);
+}
+
 int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
 {
     LinuxPlatformOptions platformOptions;
@@ -148,7 +177,9 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     platformOptions.version = VENTRIK_VERSION;
     LinuxPlatform platform(platformOptions);
     setWindowIcon(platform.platform().resources);
-    VentrikApp app(platform.platform(), options.app);
+    VentrikAppOptions appOptions = options.app;
+    appOptions.records = chooseRecords(options, platform);
+    VentrikApp app(platform.platform(), appOptions);
     app.applicationDidFinishLaunching();
     running.emplace(Running{app, platform.log()});
     std::atexit(undoSettingAtExit);

@@ -36,6 +36,7 @@ class LinuxPlatform
     LinuxMessagePorts& ports() { return _ports; }
     LinuxMainQueue& mainQueue() { return _mainQueue; }
     LinuxSystemLog& log() { return _log; }
+    LinuxPreferences& preferences() { return _preferences; }
 
   private:
     LinuxSystemLog _log;

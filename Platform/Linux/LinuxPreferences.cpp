@@ -64,6 +64,21 @@ void LinuxPreferences::set(std::string_view domain, std::string_view key, bool v
         current->setValue(toQString(key), value);
 }
 
+void LinuxPreferences::setText(std::string_view domain, std::string_view key,
+                               std::string_view value)
+{
+    if (QSettings* current = settings(domain))
+        current->setValue(toQString(key), toQString(value));
+}
+
+std::optional<std::string> LinuxPreferences::text(std::string_view domain, std::string_view key)
+{
+    const QSettings* current = settings(domain);
+    if (!current || !current->contains(toQString(key)))
+        return std::nullopt;
+    return current->value(toQString(key)).toString().toStdString();
+}
+
 bool LinuxPreferences::synchronize(std::string_view domain)
 {
     QSettings* current = settings(domain);

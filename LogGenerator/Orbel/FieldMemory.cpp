@@ -5,6 +5,12 @@
 namespace ventrik
 {
 
+void FieldMemory::forgetNumbers()
+{
+    for (Slot& slot : _slots)
+        slot.field = nullptr;
+}
+
 std::size_t FieldMemory::slotOf(const Field& field)
 {
     // Fields come in the order of their tables.

@@ -14,6 +14,8 @@ class FieldMemory
 {
   public:
     void forgetAll() { _slots.clear(); }
+    /// Keys keep their slots.
+    void forgetNumbers();
 
     /// The slot of a field's key, a new one at the end of the others when it had none.
     std::size_t slotOf(const Field& field);

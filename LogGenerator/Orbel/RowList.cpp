@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/RowList.h"
 
+#include <bit>
 #include <utility>
 
 namespace ventrik
@@ -14,6 +15,14 @@ std::optional<ValueOrigin> RowList::originOf(std::size_t row, std::string_view k
             return ValueOrigin{_rows[row].record, std::nullopt, cell.field, _rows[row].start,
                                cell.raw};
     return std::nullopt;
+}
+
+const FieldBytes& RowList::tableOf(std::span<const Field> fields)
+{
+    for (const FieldBytes& table : _tables)
+        if (table.areOf(fields))
+            return table;
+    return _tables.emplace_back(fields);
 }
 
 RowList::Rewrite::Rewrite(RowList& list, std::optional<PlistArray> array, const Record& record,
@@ -64,6 +73,7 @@ void RowList::Rewrite::nextText(const Field& field, std::int64_t raw, std::size_
     else
         _array.replace(_count - 1, std::move(text));
     row().cells.assign(1, {&field, raw, false});
+    row().table = nullptr;
     _cells = 1;
 }
 
@@ -99,6 +109,37 @@ void RowList::Rewrite::showValue(std::string_view key, PlistValue value)
 }
 
 void RowList::Rewrite::show(std::span<const Field> fields, const LogPacket& element)
+{
+    if (_cells != 0 || fields.size() > FieldBytes::maximumFields)
+        return showAll(fields, element);
+    const FieldBytes& table = _list.tableOf(fields);
+    const std::uint64_t changed = table.changesIn(element, row().words);
+    const bool isKnown = std::exchange(row().table, nullptr) == &table;
+    if (!isKnown || !showChanged(fields, changed, element)) {
+        _cells = 0;
+        showAll(fields, element);
+    }
+    // A number that shows nothing has no cell.
+    if (_cells == fields.size())
+        row().table = &table;
+}
+
+bool RowList::Rewrite::showChanged(std::span<const Field> fields, std::uint64_t changed,
+                                   const LogPacket& element)
+{
+    for (; changed != 0; changed &= changed - 1) {
+        _cells = static_cast<std::size_t>(std::countr_zero(changed));
+        const std::size_t cell = _cells;
+        show(fields[cell], numberOf(element, fields[cell]));
+        // It shows nothing now, or somebody else changed the row's keys.
+        if (_cells == cell || row().cells.size() < fields.size())
+            return false;
+    }
+    _cells = fields.size();
+    return true;
+}
+
+void RowList::Rewrite::showAll(std::span<const Field> fields, const LogPacket& element)
 {
     for (const Field& field : fields)
         show(field, numberOf(element, field));
@@ -151,6 +192,8 @@ void RowList::Rewrite::store(std::string_view key, PlistValue value, Cell cell)
 {
     copyRow();
     Row& row = this->row();
+    if (row.table && _cells < row.table->fieldCount())
+        row.table = nullptr;
     PlistDictionary::Entry* entry = row.values.entryAt(_cells);
     if (entry && entry->key == key) {
         entry->value = std::move(value);
@@ -170,6 +213,8 @@ void RowList::Rewrite::endRow()
     copyRow();
     row().values.truncate(_cells);
     row().cells.resize(_cells);
+    if (row().table && _cells < row().table->fieldCount())
+        row().table = nullptr;
 }
 
 void RowList::Rewrite::endList()

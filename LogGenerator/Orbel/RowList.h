@@ -2,9 +2,11 @@
 
 #include "LogGenerator/Core/ValueOrigin.h"
 #include "LogGenerator/Orbel/ArrayLock.h"
+#include "LogGenerator/Orbel/FieldBytes.h"
 #include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
+#include <list>
 #include <string_view>
 #include <vector>
 
@@ -13,7 +15,8 @@ namespace ventrik
 
 /// What a list of the display shows, row by row: the fields of each row in their order, and the raw
 /// numbers that they show. A row's field that comes with the same number again is neither formatted
-/// nor stored.
+/// nor stored; of a row that begins with the fields of a table, those whose bytes are the same
+/// again are not even read.
 class RowList
 {
   public:
@@ -42,9 +45,15 @@ class RowList
         std::vector<Cell> cells; // one for each of the values, in their order
         const Record* record = nullptr;
         std::size_t start = 0;
+        /// Whose fields the first cells show, one by one; null: they do not.
+        const FieldBytes* table = nullptr;
+        FieldBytes::Words words = {}; // of that table
     };
 
+    const FieldBytes& tableOf(std::span<const Field> fields);
+
     std::vector<Row> _rows;
+    std::list<FieldBytes> _tables;
     TextMemory _texts;
 };
 
@@ -72,6 +81,7 @@ class RowList::Rewrite
     void showWorkedOut(const Field& field, std::int64_t number);
     void showValue(std::string_view key, PlistValue value);
 
+    /// Shows a table of fields, a constant.
     void show(std::span<const Field> fields, const LogPacket& element);
     /// Shows a list of texts: so many as the element's places, one behind the other, the field has.
     void showTexts(const Field& field, std::int64_t raw, const Field& element);
@@ -83,6 +93,10 @@ class RowList::Rewrite
   private:
     void beginRow(std::size_t start);
     Row& row() { return _list._rows[_count - 1]; }
+    void showAll(std::span<const Field> fields, const LogPacket& element);
+    /// The fields of those bits; false when the row has to be written whole.
+    bool showChanged(std::span<const Field> fields, std::uint64_t changed,
+                     const LogPacket& element);
     bool isShown(const Field& field, std::int64_t raw, bool isWorkedOut);
     void store(std::string_view key, PlistValue value, Cell cell);
     void endRow();

@@ -1,14 +1,16 @@
 #include "LogGenerator/Orbel/ShownFields.h"
 
+#include <algorithm>
 #include <bit>
+#include <utility>
 
 namespace ventrik
 {
 
 void ShownFields::forgetAll()
 {
-    _memory.forgetAll();
-    _places.clear();
+    _memory.forgetNumbers();
+    ++_handovers;
 }
 
 void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
@@ -20,24 +22,46 @@ void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
     forgetAll();
 }
 
-void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw,
-                       std::size_t start)
+void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw)
 {
-    const std::size_t slot = _memory.slotOf(field);
-    _memory.place(slot, start);
-    if (_memory.shows(slot, field, raw, false))
-        return;
-    if (const auto& text = _texts.textOf(field, raw)) {
-        _memory.keep(slot, field, _record, raw, false);
-        store(dictionary, slot, field.key, *text);
-    }
+    show(dictionary, _memory.slotOf(field), field, raw, nullptr);
 }
 
 void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> fields,
                        const LogPacket& packet)
 {
-    for (const Field& field : fields)
-        show(dictionary, field, numberOf(packet, field));
+    for (; fields.size() > FieldBytes::maximumFields;
+         fields = fields.subspan(FieldBytes::maximumFields))
+        show(dictionary, fields.first(FieldBytes::maximumFields), packet);
+    Table& table = tableOf(fields);
+    std::uint64_t changed = table.bytes.changesIn(packet, table.words);
+    for (; table.handovers == _handovers && changed != 0; changed &= changed - 1)
+        show(dictionary, table, static_cast<std::size_t>(std::countr_zero(changed)), packet);
+    if (table.handovers == _handovers)
+        return;
+    // A key of these fields may show what another one wrote.
+    for (std::size_t i = 0; i < fields.size(); ++i)
+        show(dictionary, table, i, packet);
+    table.handovers = table.hasKeyTwice ? 0 : _handovers;
+}
+
+void ShownFields::show(PlistDictionary& dictionary, const Table& table, std::size_t index,
+                       const LogPacket& packet)
+{
+    const Field& field = table.fields[index];
+    show(dictionary, table.slots[index], field, numberOf(packet, field), &table);
+}
+
+void ShownFields::show(PlistDictionary& dictionary, std::size_t slot, const Field& field,
+                       std::int64_t raw, const Table* table)
+{
+    if (_memory.shows(slot, field, raw, false))
+        return;
+    if (const auto& text = _texts.textOf(field, raw)) {
+        _memory.keep(slot, field, _record, raw, false);
+        noteWriter(slot, table);
+        store(dictionary, slot, field.key, *text);
+    }
 }
 
 void ShownFields::showNumber(PlistDictionary& dictionary, const Field& field, double number)
@@ -47,6 +71,7 @@ void ShownFields::showNumber(PlistDictionary& dictionary, const Field& field, do
     if (_memory.shows(slot, field, bits, true))
         return;
     _memory.keep(slot, field, _record, bits, true);
+    noteWriter(slot, nullptr);
     store(dictionary, slot, field.key, field.shown.textOfNumber(number));
 }
 
@@ -54,6 +79,7 @@ void ShownFields::showValue(PlistDictionary& dictionary, std::string_view key, P
 {
     const std::size_t slot = _memory.slotOf(key);
     _memory.keepNone(slot);
+    noteWriter(slot, nullptr);
     store(dictionary, slot, key, std::move(value));
 }
 
@@ -62,12 +88,37 @@ std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
     return _memory.originOf(key);
 }
 
+ShownFields::Table& ShownFields::tableOf(std::span<const Field> fields)
+{
+    for (Table& table : _tables)
+        if (table.bytes.areOf(fields))
+            return table;
+    Table& table = _tables.emplace_back(Table{fields, FieldBytes(fields)});
+    for (const Field& field : fields) {
+        const std::size_t slot = _memory.slotOf(field.key);
+        table.hasKeyTwice |= std::ranges::find(table.slots, slot) != table.slots.end();
+        table.slots.push_back(slot);
+    }
+    return table;
+}
+
+void ShownFields::noteWriter(std::size_t slot, const Table* table)
+{
+    if (std::exchange(spotOf(slot).table, table) != table)
+        ++_handovers;
+}
+
+ShownFields::Spot& ShownFields::spotOf(std::size_t slot)
+{
+    if (slot >= _spots.size())
+        _spots.resize(slot + 1);
+    return _spots[slot];
+}
+
 void ShownFields::store(PlistDictionary& dictionary, std::size_t slot, std::string_view key,
                         PlistValue value)
 {
-    if (slot >= _places.size())
-        _places.resize(slot + 1);
-    std::size_t& place = _places[slot];
+    std::size_t& place = spotOf(slot).place;
     PlistDictionary::Entry* entry = dictionary.entryAt(place);
     if (entry && entry->key == key) {
         entry->value = std::move(value);

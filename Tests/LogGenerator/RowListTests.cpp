@@ -81,6 +81,94 @@ TEST_F(RowListTest, AnUnchangedNumberIsNotStoredAgain)
     EXPECT_EQ(rows, PlistArray{row("mine", "2 dBm")});
 }
 
+// The level of 0 shows nothing.
+TEST_F(RowListTest, AValueThatShowsNothingLeavesItsRowUntilItShowsAgain)
+{
+    static constexpr std::array<Mark, 1> none{{{0, ""}}};
+    constexpr std::array<Field, 2> fields{{{"Level", u8(0), marked({}, none)}, {"Cell", u8(1)}}};
+    const auto rowOf = [&](std::uint8_t level) {
+        const Bytes element{level, 7};
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(fields, LogPacket(element));
+        return rows[0];
+    };
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_EQ(rowOf(5), (PlistDictionary{{"Level", "5"}, {"Cell", "7"}}));
+        EXPECT_EQ(rowOf(0), (PlistDictionary{{"Cell", "7"}}));
+        EXPECT_EQ(rowOf(0), (PlistDictionary{{"Cell", "7"}}));
+        EXPECT_EQ(rowOf(6), (PlistDictionary{{"Level", "6"}, {"Cell", "7"}}));
+    }
+}
+
+TEST_F(RowListTest, ARowWhoseKeysSomebodyElseChangedIsWrittenWholeFromThereOn)
+{
+    showCells({7, 1});
+    PlistDictionary(*rows[0].dictionary()).remove("Level");
+    showCells({8, 1});
+    EXPECT_EQ(rows, PlistArray{row("8", "1 dBm")});
+}
+
+TEST_F(RowListTest, ATableShowsAgainAfterSingleFields)
+{
+    showCells({7, 1});
+    {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(cellFields[0], 8);
+        writing.show(cellFields[1], 1);
+    }
+    EXPECT_EQ(rows, PlistArray{row("8", "1 dBm")});
+    showCells({7, 1});
+    EXPECT_EQ(rows, PlistArray{row("7", "1 dBm")});
+}
+
+TEST_F(RowListTest, ATableShowsAgainAfterAnotherOne)
+{
+    constexpr std::array<Field, 2> swapped{{{"Cell", u8(1)}, {"Level", i8(0), wholeDbm()}}};
+    for (int i = 0; i < 2; ++i) {
+        showCells({7, 1});
+        EXPECT_EQ(rows, PlistArray{row("7", "1 dBm")});
+        const Bytes element{7, 1};
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(swapped, LogPacket(element));
+        EXPECT_EQ(rows, PlistArray{row("1", "7 dBm")});
+    }
+}
+
+TEST_F(RowListTest, ATableShowsAgainAfterTheRowLostValues)
+{
+    showCells({7, 1});
+    {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(cellFields[0], 7);
+    }
+    EXPECT_EQ(rows, (PlistArray{PlistDictionary{{"Cell", "7"}}}));
+    showCells({7, 1});
+    EXPECT_EQ(rows, PlistArray{row("7", "1 dBm")});
+}
+
+TEST_F(RowListTest, ATableMayHaveAnyNumberOfFields)
+{
+    constexpr std::string_view keys = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ"
+                                      "0123456789!?+-*/=<>()[]{}.,:;&%$#@~^|_'` ";
+    std::vector<Field> fields;
+    for (std::size_t i = 0; i < keys.size(); ++i)
+        fields.push_back({keys.substr(i, 1), u8(static_cast<std::uint16_t>(i))});
+    ASSERT_GT(fields.size(), FieldBytes::maximumFields);
+    Bytes element(fields.size(), 1);
+    for (const int last : {1, 2}) {
+        element.back() = static_cast<std::uint8_t>(last);
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(fields, LogPacket(element));
+    }
+    EXPECT_EQ(*rows[0].dictionary()->find(" "), "2");
+    EXPECT_EQ(rows[0].dictionary()->size(), fields.size());
+}
+
 TEST_F(RowListTest, AListThatSomebodyElseEmptiedIsWrittenWhole)
 {
     showCells({7, 1, 8, 2});

@@ -73,7 +73,6 @@ void RowList::Rewrite::nextText(const Field& field, std::int64_t raw, std::size_
     else
         _array.replace(_count - 1, std::move(text));
     row().cells.assign(1, {&field, raw, false});
-    row().table = nullptr;
     _cells = 1;
 }
 

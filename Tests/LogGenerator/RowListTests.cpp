@@ -137,6 +137,19 @@ TEST_F(RowListTest, ATableShowsAgainAfterAnotherOne)
     }
 }
 
+TEST_F(RowListTest, ARowMayHoldTwoTables)
+{
+    const std::span<const Field> both(cellFields);
+    for (const auto& element : {Bytes{7, 1}, Bytes{7, 2}, Bytes{8, 2}}) {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.show(both.first(1), LogPacket(element));
+        writing.show(both.last(1), LogPacket(element));
+        EXPECT_EQ(rows,
+                  PlistArray{row(std::to_string(element[0]), std::to_string(element[1]) + " dBm")});
+    }
+}
+
 TEST_F(RowListTest, ATableShowsAgainAfterTheRowLostValues)
 {
     showCells({7, 1});

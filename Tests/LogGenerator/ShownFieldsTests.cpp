@@ -23,7 +23,7 @@ constexpr std::array<Field, manyFields> many = [] {
                                       "0123456789!?+-*/=<>()[]{}.,:;&%$#@~^|_'` "
                                       "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ";
     for (std::size_t i = 0; i < fields.size(); ++i)
-        fields[i] = {keys.substr(i, 2), u8(static_cast<std::uint16_t>(13 + i))};
+        fields[i] = {keys.substr(i, 2 + i / 64), u8(static_cast<std::uint16_t>(13 + i))};
     return fields;
 }();
 

@@ -73,6 +73,8 @@ class PlistArray
 
     /// A new array of the same elements; nested containers stay shared.
     PlistArray copy() const;
+    /// How many handles share the container, this one included.
+    std::size_t handleCount() const { return static_cast<std::size_t>(_values.use_count()); }
     bool isSameContainer(const PlistArray& other) const { return _values == other._values; }
     bool operator==(const PlistArray& other) const;
 
@@ -175,6 +177,15 @@ class PlistValue
     PlistArray* array() { return std::get_if<PlistArray>(&_value); }
     const PlistDictionary* dictionary() const { return std::get_if<PlistDictionary>(&_value); }
     PlistDictionary* dictionary() { return std::get_if<PlistDictionary>(&_value); }
+
+    /// Becomes a text, in the room of the one that it is.
+    void setText(std::string_view text)
+    {
+        if (std::string* present = std::get_if<std::string>(&_value))
+            present->assign(text);
+        else
+            _value = std::string(text);
+    }
 
     /// The same value; an array's or dictionary's top level is new, nested containers stay shared.
     PlistValue copy() const;

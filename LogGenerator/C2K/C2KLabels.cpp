@@ -2,6 +2,7 @@
 
 #include "Packets/ShownNumbers.h"
 
+#include <algorithm>
 #include <bit>
 #include <utility>
 
@@ -69,18 +70,34 @@ void C2KLabels::useLookup(const PlistDictionary* lookup)
         return;
     _lookup = lookup ? std::optional(*lookup) : std::nullopt;
     _memory.forgetAll();
+    _tables.forgetAll();
     _labels.clear();
 }
 
 void C2KLabels::publish(const Field& field, const Record* record, std::int64_t raw)
 {
-    const std::size_t slot = _memory.slotOf(field);
+    publish(_memory.slotOf(field), field, record, raw);
+}
+
+void C2KLabels::publish(std::span<const Field> fields, const Record* record, const LogPacket& part)
+{
+    _tables.visit(fields, part, _memory,
+                  [&](std::size_t slot, const Field& field, std::int64_t raw) {
+                      publish(slot, field, record, raw);
+                  });
+}
+
+void C2KLabels::publish(std::size_t slot, const Field& field, const Record* record,
+                        std::int64_t raw)
+{
     if (_memory.shows(slot, field, raw, false))
         return;
     _memory.keep(slot, field, record, raw, false);
+    _tables.noteWriter(slot);
     Labels& labels = labelsOf(slot, field);
     labels.text.clear();
-    store(labels, _texts.textOf(field, raw).value_or(""));
+    const auto& text = _texts.textOf(field, raw);
+    store(labels, text ? std::string_view(*text) : std::string_view());
 }
 
 void C2KLabels::publish(const Field& field, std::string_view text)
@@ -90,6 +107,7 @@ void C2KLabels::publish(const Field& field, std::string_view text)
     if (labels.text == text && !text.empty() && !labels.isGroup)
         return;
     _memory.keepNone(slot);
+    _tables.noteWriter(slot);
     labels.text = text;
     labels.isGroup = false;
     store(labels, text);
@@ -102,9 +120,11 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
         return publish(field, textOfNone);
     const std::size_t slot = _memory.slotOf(field);
     Labels& labels = labelsOf(slot, field);
+    labels.source.clear();
     if (labels.isGroup && labels.pilots == pilots)
         return;
     _memory.keepNone(slot);
+    _tables.noteWriter(slot);
     // Whoever else holds the group keeps it as it was.
     const bool wasShown = std::exchange(labels.isGroup, true);
     const std::size_t ours = 1 + (wasShown ? labels.targets.size() : 0);
@@ -115,6 +135,18 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
     labels.pilots = pilots;
     if (isShared || !wasShown)
         store(labels, labels.group);
+}
+
+bool C2KLabels::showsPilotsOf(const Field& field, ByteView source)
+{
+    const Labels& labels = labelsOf(_memory.slotOf(field), field);
+    return labels.isGroup && !source.empty() && std::ranges::equal(labels.source, source);
+}
+
+void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilots, ByteView source)
+{
+    publish(field, pilots, std::string_view());
+    labelsOf(_memory.slotOf(field), field).source.assign(source.begin(), source.end());
 }
 
 std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
@@ -129,11 +161,12 @@ std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
 
 C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, const Field& field)
 {
-    if (slot >= _labels.size()) {
+    if (slot >= _labels.size())
         _labels.resize(slot + 1);
-        _labels[slot].targets = targetsOf(field.key);
-    }
-    return _labels[slot];
+    Labels& labels = _labels[slot];
+    if (!std::exchange(labels.hasTargets, true))
+        labels.targets = targetsOf(field.key);
+    return labels;
 }
 
 // An entry of the lookup that is none ends the labels there.
@@ -155,19 +188,28 @@ std::vector<C2KLabels::Target> C2KLabels::targetsOf(std::string_view lookupKey) 
     return targets;
 }
 
-void C2KLabels::store(Labels& labels, PlistValue value)
+PlistValue& C2KLabels::valueOf(Target& target)
 {
-    for (Target& target : labels.targets) {
-        const bool isLast = &target == &labels.targets.back();
-        PlistValue stored = isLast ? std::move(value) : value;
-        PlistDictionary::Entry* entry = target.group.entryAt(target.place);
-        if (entry && entry->key == target.label) {
-            entry->value = std::move(stored);
-        } else {
-            target.group.set(target.label, std::move(stored));
-            target.place = target.group.placeOf(target.label).value_or(0);
-        }
+    PlistDictionary::Entry* entry = target.group.entryAt(target.place);
+    if (!entry || entry->key != target.label) {
+        if (!target.group.contains(target.label))
+            target.group.set(target.label, "");
+        target.place = target.group.placeOf(target.label).value_or(0);
+        entry = target.group.entryAt(target.place);
     }
+    return entry->value;
+}
+
+void C2KLabels::store(Labels& labels, std::string_view text)
+{
+    for (Target& target : labels.targets)
+        valueOf(target).setText(text);
+}
+
+void C2KLabels::store(Labels& labels, const PlistDictionary& group)
+{
+    for (Target& target : labels.targets)
+        valueOf(target) = group;
 }
 
 } // namespace ventrik

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Orbel/FieldMemory.h"
+#include "LogGenerator/Orbel/FieldTables.h"
 #include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
@@ -36,11 +37,17 @@ class C2KLabels
     void useLookup(const PlistDictionary* lookup);
 
     void publish(const Field& field, const Record* record, std::int64_t raw);
+    /// A table of fields, a constant, of a part of the record.
+    void publish(std::span<const Field> fields, const Record* record, const LogPacket& part);
     /// A text in the place of the field's number.
     void publish(const Field& field, std::string_view text);
     /// A group of pilots, or the text while there is none; an empty one means the empty group.
     void publish(const Field& field, const std::vector<ShownPilot>& pilots,
                  std::string_view textOfNone);
+    /// Whether the group shows the pilots that were worked out from those bytes.
+    bool showsPilotsOf(const Field& field, ByteView source);
+    /// A group of pilots that were worked out from those bytes, and from nothing else.
+    void publish(const Field& field, const std::vector<ShownPilot>& pilots, ByteView source);
 
     /// Where the value under a label of a group comes from; none where no field shows there.
     std::optional<ValueOrigin> originOf(const PlistDictionary& group, std::string_view label) const;
@@ -55,16 +62,22 @@ class C2KLabels
         std::vector<Target> targets;
         std::string text;               // that no field describes; else empty
         std::vector<ShownPilot> pilots; // likewise
+        Bytes source;                   // of the pilots; empty while it is not known
         PlistDictionary group;          // of the pilots
         bool isGroup = false;
+        bool hasTargets = false; // they were looked up
     };
 
+    void publish(std::size_t slot, const Field& field, const Record* record, std::int64_t raw);
     Labels& labelsOf(std::size_t slot, const Field& field);
     std::vector<Target> targetsOf(std::string_view lookupKey) const;
-    static void store(Labels& labels, PlistValue value);
+    static PlistValue& valueOf(Target& target);
+    static void store(Labels& labels, std::string_view text);
+    static void store(Labels& labels, const PlistDictionary& group);
 
     std::optional<PlistDictionary> _lookup;
     FieldMemory _memory;
+    FieldTables _tables;
     TextMemory _texts;
     std::vector<Labels> _labels; // of each slot
 };

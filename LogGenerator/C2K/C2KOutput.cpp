@@ -12,8 +12,7 @@ void C2KOutput::publish(const Field& field, const LogPacket& part) const
 
 void C2KOutput::publish(std::span<const Field> fields, const LogPacket& part) const
 {
-    for (const Field& field : fields)
-        publish(field, part);
+    _labels.publish(fields, _record, part);
 }
 
 void C2KOutput::publish(const Field& field, std::string_view text) const
@@ -27,11 +26,10 @@ void C2KOutput::publish(const Field& field, const std::vector<ShownPilot>& pilot
     _labels.publish(field, pilots, textOfNone);
 }
 
-void C2KOutput::keepExtra(std::string_view key, const PlistValue& value) const
+PlistDictionary* C2KOutput::extraInfo() const
 {
     PlistValue* extraInfo = _state.find(StateKey::extraInfo);
-    if (extraInfo && extraInfo->dictionary())
-        extraInfo->dictionary()->set(key, value);
+    return extraInfo ? extraInfo->dictionary() : nullptr;
 }
 
 } // namespace ventrik

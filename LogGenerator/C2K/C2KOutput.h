@@ -24,17 +24,24 @@ class C2KOutput
 
     /// Shows a field of a part of the record under every label that the template gives to its key.
     void publish(const Field& field, const LogPacket& part) const;
+    /// A table of them, a constant.
     void publish(std::span<const Field> fields, const LogPacket& part) const;
     /// Shows a text in the place of the field's number.
     void publish(const Field& field, std::string_view text) const;
-    /// Shows a group of pilots, or the text while there is none; an empty one means the empty
-    /// group.
+    /// Shows a group of pilots, or the text while there is none.
     void publish(const Field& field, const std::vector<ShownPilot>& pilots,
-                 std::string_view textOfNone = {}) const;
+                 std::string_view textOfNone) const;
+    /// Shows the group of pilots that `pilots()` works out from those bytes, and from nothing else.
+    template <typename Pilots>
+    void publish(const Field& field, ByteView source, const Pilots& pilots) const
+    {
+        if (!_labels.showsPilotsOf(field, source))
+            _labels.publish(field, pilots(), source);
+    }
 
     PlistDictionary& state() const { return _state; }
-    /// Stores a value in the state's "ExtraInfo", which travels with the history.
-    void keepExtra(std::string_view key, const PlistValue& value) const;
+    /// The state's "ExtraInfo", which travels with the history; null when there is none.
+    PlistDictionary* extraInfo() const;
     SystemLog& log() const { return _log; }
 
   private:

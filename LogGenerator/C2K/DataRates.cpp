@@ -59,6 +59,11 @@ void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t
                 const C2KOutput& output)
 {
     PlistDictionary& state = output.state();
+    PlistDictionary* extraInfo = output.extraInfo();
+    const auto keepExtra = [&](std::string_view key, const PlistValue& value) {
+        if (extraInfo)
+            extraInfo->set(key, value);
+    };
     const PlistInteger* previousSequence = keptNumber(state, direction.sequenceKey);
     const PlistInteger* previousSent = keptNumber(state, direction.sentKey);
     if (previousSequence && previousSent) {
@@ -68,15 +73,23 @@ void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t
         if (steps >= 1)
             output.publish(direction.rate,
                            fmt::format(FMT_COMPILE("{:.2f} kbps"), added / (steps * 1024.0)));
-        output.keepExtra(direction.sequence2Key, *previousSequence);
-        output.keepExtra(direction.sent2Key, *previousSent);
+        keepExtra(direction.sequence2Key, *previousSequence);
+        keepExtra(direction.sent2Key, *previousSent);
     } else {
         output.publish(direction.rate, "");
     }
+    keepExtra(direction.sequence1Key, sequence);
+    keepExtra(direction.sent1Key, sent);
+    // Last: the state may move what it holds.
     state.set(direction.sequenceKey, sequence);
     state.set(direction.sentKey, sent);
-    output.keepExtra(direction.sequence1Key, sequence);
-    output.keepExtra(direction.sent1Key, sent);
+}
+
+// The sum of the counters that stand there, two of them in eight bytes.
+std::int64_t sumOfTwo(const LogPacket& packet, std::size_t offset)
+{
+    const std::uint64_t word = packet.littleEndianWord(offset);
+    return static_cast<std::int64_t>((word & 0xFFFFFFFF) + (word >> 32));
 }
 
 std::uint32_t sequenceNumber(const LogPacket& packet, const Field& field)
@@ -102,10 +115,11 @@ void decodeReverseDataRate(const LogPacket& packet, const C2KOutput& output)
     std::int64_t sent = 0;
     for (std::size_t i = 0; i < sizes.count; ++i) {
         const std::size_t start = sizes.offset + sizes.stride * i;
-        std::int64_t packets = 0;
-        for (std::size_t counter = 0; counter < C2KRecords::payloadCounterFields.size(); ++counter)
-            packets += packet.u32(start + C2KRecords::payloadCounterFields[counter].place.offset);
-        sent += packets * reverseBits.at(i % reverseBits.size());
+        constexpr auto& counters = C2KRecords::payloadCounterFields;
+        static_assert(counters.size() == 4);
+        const std::int64_t packets = sumOfTwo(packet, start + counters[0].place.offset) +
+                                     sumOfTwo(packet, start + counters[2].place.offset);
+        sent += packets * reverseBits[i % reverseBits.size()];
     }
     updateRate(reverse, sequenceNumber(packet, C2KRecords::reversePacketsUnshown.front()), sent,
                output);

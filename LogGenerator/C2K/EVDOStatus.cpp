@@ -12,12 +12,10 @@ void decodeEVDOStatus(const LogPacket& packet, const C2KOutput& output)
     output.publish(C2KRecords::evdoStatusFields, packet);
     // Before the access state only the first chain receives, and nothing is sent.
     const bool isActive = numberOf(packet, C2KRecords::evdoDeviceState) >= accessState;
-    for (const Field& field : C2KRecords::evdoActiveFields) {
-        if (isActive)
-            output.publish(field, packet);
-        else
-            output.publish(field, "N/A");
-    }
+    if (isActive)
+        return output.publish(C2KRecords::evdoActiveFields, packet);
+    for (const Field& field : C2KRecords::evdoActiveFields)
+        output.publish(field, "N/A");
 }
 
 } // namespace ventrik

@@ -5,6 +5,7 @@
 #include "LogGenerator/C2K/SubpacketSearch.h"
 #include "Packets/C2KRecords.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace ventrik
@@ -16,13 +17,11 @@ namespace
 void publishRadio(const LogPacket& radio, bool isInTraffic, const C2KOutput& output)
 {
     const auto fields = std::span(C2KRecords::radioFields);
+    if (isInTraffic)
+        return output.publish(fields, radio);
     output.publish(fields.first(C2KRecords::alwaysShownRadioFields), radio);
-    for (const Field& field : fields.subspan(C2KRecords::alwaysShownRadioFields)) {
-        if (isInTraffic)
-            output.publish(field, radio);
-        else
-            output.publish(field, "N/A");
-    }
+    for (const Field& field : fields.subspan(C2KRecords::alwaysShownRadioFields))
+        output.publish(field, "N/A");
 }
 
 // Energy over total, in dB; whatever comes out too low, or as no number, shows as -50 dB.
@@ -37,17 +36,38 @@ double pilotLevel(const LogPacket& activeSet, std::int64_t energy)
     return 10.0 * std::log10(ratio >= lowest ? ratio : lowest);
 }
 
-std::vector<ShownPilot> pilotsOf(const LogPacket& activeSet)
+struct PilotLayout {
+    Field pnOffset;
+    Field energy;
+    RecordElements elements;
+};
+
+PilotLayout pilotLayoutOf(const LogPacket& activeSet)
 {
     const auto furtherFields =
         static_cast<std::size_t>(numberOf(activeSet, C2KRecords::furtherFields));
     const auto [pnOffset, energy] = C2KRecords::pilotFields(furtherFields);
-    const std::int64_t reference = numberOf(activeSet, C2KRecords::referencePNOffset);
-    const RecordElements elements{
-        C2KRecords::firstPilot, C2KRecords::pilotSize(furtherFields),
-        static_cast<std::size_t>(numberOf(activeSet, C2KRecords::pilotCount)),
-        energy.place.offset + energy.place.bytes()};
+    return {pnOffset,
+            energy,
+            {C2KRecords::firstPilot, C2KRecords::pilotSize(furtherFields),
+             static_cast<std::size_t>(numberOf(activeSet, C2KRecords::pilotCount)),
+             energy.place.offset + energy.place.bytes()}};
+}
 
+// The bytes that tell the pilots, as far as the packet holds them.
+ByteView pilotBytes(const LogPacket& activeSet, const RecordElements& elements)
+{
+    const std::size_t end =
+        elements.count == 0
+            ? elements.offset
+            : elements.offset + elements.stride * (elements.count - 1) + elements.needed;
+    return activeSet.bytes().first(std::min(end, activeSet.size()));
+}
+
+std::vector<ShownPilot> pilotsOf(const LogPacket& activeSet, const PilotLayout& layout)
+{
+    const auto& [pnOffset, energy, elements] = layout;
+    const std::int64_t reference = numberOf(activeSet, C2KRecords::referencePNOffset);
     std::vector<ShownPilot> pilots;
     for (std::size_t i = 0; i < elements.completeIn(activeSet); ++i) {
         const LogPacket pilot = elements.element(activeSet, i);
@@ -76,7 +96,9 @@ void decodeOneXStatus(const LogPacket& packet, const C2KOutput& output)
     const bool isInTraffic = numberOf(*state, C2KRecords::deviceState) == trafficState;
     output.publish(C2KRecords::deviceState, *state);
     publishRadio(*radio, isInTraffic, output);
-    output.publish(C2KRecords::activeSetInfo, pilotsOf(*activeSet));
+    const PilotLayout layout = pilotLayoutOf(*activeSet);
+    output.publish(C2KRecords::activeSetInfo, pilotBytes(*activeSet, layout.elements),
+                   [&] { return pilotsOf(*activeSet, layout); });
     if (!isInTraffic)
         endTrafficFER(output);
 }

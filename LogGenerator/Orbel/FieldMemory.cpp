@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/FieldMemory.h"
 
 #include <algorithm>
+#include <functional>
 
 namespace ventrik
 {
@@ -13,15 +14,15 @@ void FieldMemory::forgetNumbers()
 
 std::size_t FieldMemory::slotOf(const Field& field)
 {
-    // Fields come in the order of their tables.
-    if (_next < _slots.size() && _slots[_next].asked == &field)
-        return _next++;
-    const auto slot = std::ranges::find(_slots, &field, &Slot::asked);
-    const auto index =
-        slot == _slots.end() ? slotOf(field.key) : static_cast<std::size_t>(slot - _slots.begin());
-    _slots[index].asked = &field;
-    _next = index + 1;
-    return index;
+    // Fields of a table lie side by side.
+    const std::size_t number = std::hash<const Field*>{}(&field) / sizeof(Field);
+    std::uint16_t& guess = _guesses[number % _guesses.size()];
+    if (guess < _slots.size() && _slots[guess].asked == &field)
+        return guess;
+    const std::size_t slot = slotOf(field.key);
+    _slots[slot].asked = &field;
+    guess = static_cast<std::uint16_t>(slot);
+    return slot;
 }
 
 std::size_t FieldMemory::slotOf(std::string_view key)

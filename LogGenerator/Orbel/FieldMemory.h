@@ -2,6 +2,8 @@
 
 #include "LogGenerator/Core/ValueOrigin.h"
 
+#include <array>
+#include <cstdint>
 #include <string_view>
 #include <vector>
 
@@ -47,7 +49,7 @@ class FieldMemory
     };
 
     std::vector<Slot> _slots;
-    std::size_t _next = 0; // where the next field is most likely to be
+    std::array<std::uint16_t, 64> _guesses{}; // the slots of fields, each where its address leads
 };
 
 } // namespace ventrik

@@ -6,6 +6,20 @@
 namespace ventrik
 {
 
+namespace
+{
+
+PlistArray arrayOfTexts(std::size_t count)
+{
+    PlistArray texts;
+    texts.reserve(count);
+    for (std::size_t i = 0; i < count; ++i)
+        texts.append("");
+    return texts;
+}
+
+} // namespace
+
 std::optional<ValueOrigin> RowList::originOf(std::size_t row, std::string_view key) const
 {
     if (row >= _rows.size())
@@ -92,19 +106,19 @@ void RowList::Rewrite::show(const Field& field, std::int64_t raw)
     if (isShown(field, raw, false))
         return;
     if (const auto& text = _list._texts.textOf(field, raw))
-        store(field.key, *text, {&field, raw, false});
+        nextValue(field.key, {&field, raw, false}).setText(*text);
 }
 
 void RowList::Rewrite::showWorkedOut(const Field& field, std::int64_t number)
 {
     if (!isShown(field, number, true))
-        store(field.key, field.shown.textOfNumber(static_cast<double>(number)),
-              {&field, number, true});
+        nextValue(field.key, {&field, number, true}) =
+            field.shown.textOfNumber(static_cast<double>(number));
 }
 
 void RowList::Rewrite::showValue(std::string_view key, PlistValue value)
 {
-    store(key, std::move(value), {nullptr, 0, true});
+    nextValue(key, {nullptr, 0, true}) = std::move(value);
 }
 
 void RowList::Rewrite::show(std::span<const Field> fields, const LogPacket& element)
@@ -149,13 +163,23 @@ void RowList::Rewrite::showTexts(const Field& field, std::int64_t raw, const Fie
     if (isShown(field, raw, false))
         return;
     const unsigned width = element.place.width;
-    PlistArray texts;
-    texts.reserve(field.place.width / width);
-    for (unsigned bit = 0; bit + width <= field.place.width; bit += width) {
-        const std::int64_t part = raw >> bit & ((std::int64_t{1} << width) - 1);
-        texts.append(_list._texts.textOf(element, part).value_or(""));
-    }
-    store(field.key, texts, {&field, raw, false});
+    const std::size_t count = field.place.width / width;
+    const auto part = [&](std::int64_t number, std::size_t i) {
+        return number >> (width * i) & ((std::int64_t{1} << width) - 1);
+    };
+    const std::vector<Cell>& cells = row().cells;
+    const bool wasShown = _cells < cells.size() && cells[_cells].field == &field;
+    const std::int64_t before = wasShown ? cells[_cells].raw : 0;
+    PlistValue& value = nextValue(field.key, {&field, raw, false});
+    // Whoever else holds the texts keeps them as they were.
+    const PlistArray* present = value.array();
+    const bool isKept =
+        wasShown && present && present->size() == count && present->handleCount() == 1;
+    if (!isKept)
+        value = arrayOfTexts(count);
+    for (std::size_t i = 0; i < count; ++i)
+        if (!isKept || part(raw, i) != part(before, i))
+            value.array()->replace(i, _list._texts.textOf(element, part(raw, i)).value_or(""));
 }
 
 PlistArray RowList::Rewrite::showElements(const List& list, const LogPacket& packet)
@@ -187,22 +211,22 @@ bool RowList::Rewrite::isShown(const Field& field, std::int64_t raw, bool isWork
     return true;
 }
 
-void RowList::Rewrite::store(std::string_view key, PlistValue value, Cell cell)
+PlistValue& RowList::Rewrite::nextValue(std::string_view key, Cell cell)
 {
     copyRow();
     Row& row = this->row();
     if (row.table && _cells < row.table->fieldCount())
         row.table = nullptr;
     PlistDictionary::Entry* entry = row.values.entryAt(_cells);
-    if (entry && entry->key == key) {
-        entry->value = std::move(value);
-    } else {
+    if (!entry || entry->key != key) {
         // Another kind of row stood here.
         row.values.truncate(_cells);
-        row.values.set(key, std::move(value));
+        row.values.set(key, "");
+        entry = row.values.entryAt(_cells);
     }
     row.cells.resize(row.values.size());
     row.cells[_cells++] = cell;
+    return entry->value;
 }
 
 void RowList::Rewrite::endRow()

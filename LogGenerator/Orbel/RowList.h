@@ -98,7 +98,8 @@ class RowList::Rewrite
     bool showChanged(std::span<const Field> fields, std::uint64_t changed,
                      const LogPacket& element);
     bool isShown(const Field& field, std::int64_t raw, bool isWorkedOut);
-    void store(std::string_view key, PlistValue value, Cell cell);
+    /// The value of the row's next cell, which shows that from now on.
+    PlistValue& nextValue(std::string_view key, Cell cell);
     void endRow();
     void endList();
     void copyArray();

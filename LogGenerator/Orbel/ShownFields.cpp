@@ -1,6 +1,5 @@
 #include "LogGenerator/Orbel/ShownFields.h"
 
-#include <algorithm>
 #include <bit>
 #include <utility>
 
@@ -10,7 +9,8 @@ namespace ventrik
 void ShownFields::forgetAll()
 {
     _memory.forgetNumbers();
-    ++_handovers;
+    _tables.forgetNumbers();
+    _places.clear();
 }
 
 void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
@@ -24,43 +24,26 @@ void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
 
 void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw)
 {
-    show(dictionary, _memory.slotOf(field), field, raw, nullptr);
+    show(dictionary, _memory.slotOf(field), field, raw);
 }
 
 void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> fields,
                        const LogPacket& packet)
 {
-    for (; fields.size() > FieldBytes::maximumFields;
-         fields = fields.subspan(FieldBytes::maximumFields))
-        show(dictionary, fields.first(FieldBytes::maximumFields), packet);
-    Table& table = tableOf(fields);
-    std::uint64_t changed = table.bytes.changesIn(packet, table.words);
-    for (; table.handovers == _handovers && changed != 0; changed &= changed - 1)
-        show(dictionary, table, static_cast<std::size_t>(std::countr_zero(changed)), packet);
-    if (table.handovers == _handovers)
-        return;
-    // A key of these fields may show what another one wrote.
-    for (std::size_t i = 0; i < fields.size(); ++i)
-        show(dictionary, table, i, packet);
-    table.handovers = table.hasKeyTwice ? 0 : _handovers;
-}
-
-void ShownFields::show(PlistDictionary& dictionary, const Table& table, std::size_t index,
-                       const LogPacket& packet)
-{
-    const Field& field = table.fields[index];
-    show(dictionary, table.slots[index], field, numberOf(packet, field), &table);
+    _tables.visit(fields, packet, _memory,
+                  [&](std::size_t slot, const Field& field, std::int64_t raw) {
+                      show(dictionary, slot, field, raw);
+                  });
 }
 
 void ShownFields::show(PlistDictionary& dictionary, std::size_t slot, const Field& field,
-                       std::int64_t raw, const Table* table)
+                       std::int64_t raw)
 {
     if (_memory.shows(slot, field, raw, false))
         return;
     if (const auto& text = _texts.textOf(field, raw)) {
         _memory.keep(slot, field, _record, raw, false);
-        noteWriter(slot, table);
-        store(dictionary, slot, field.key, *text);
+        valueOf(dictionary, slot, field.key).setText(*text);
     }
 }
 
@@ -71,16 +54,14 @@ void ShownFields::showNumber(PlistDictionary& dictionary, const Field& field, do
     if (_memory.shows(slot, field, bits, true))
         return;
     _memory.keep(slot, field, _record, bits, true);
-    noteWriter(slot, nullptr);
-    store(dictionary, slot, field.key, field.shown.textOfNumber(number));
+    valueOf(dictionary, slot, field.key) = field.shown.textOfNumber(number);
 }
 
 void ShownFields::showValue(PlistDictionary& dictionary, std::string_view key, PlistValue value)
 {
     const std::size_t slot = _memory.slotOf(key);
     _memory.keepNone(slot);
-    noteWriter(slot, nullptr);
-    store(dictionary, slot, key, std::move(value));
+    valueOf(dictionary, slot, key) = std::move(value);
 }
 
 std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
@@ -88,44 +69,20 @@ std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
     return _memory.originOf(key);
 }
 
-ShownFields::Table& ShownFields::tableOf(std::span<const Field> fields)
+// A key's place stays until one is removed, and then all is forgotten.
+PlistValue& ShownFields::valueOf(PlistDictionary& dictionary, std::size_t slot,
+                                 std::string_view key)
 {
-    for (Table& table : _tables)
-        if (table.bytes.areOf(fields))
-            return table;
-    Table& table = _tables.emplace_back(Table{fields, FieldBytes(fields)});
-    for (const Field& field : fields) {
-        const std::size_t slot = _memory.slotOf(field.key);
-        table.hasKeyTwice |= std::ranges::find(table.slots, slot) != table.slots.end();
-        table.slots.push_back(slot);
+    _tables.noteWriter(slot);
+    if (slot >= _places.size())
+        _places.resize(slot + 1);
+    std::optional<std::size_t>& place = _places[slot];
+    if (!place) {
+        if (!dictionary.contains(key))
+            dictionary.set(key, "");
+        place = dictionary.placeOf(key);
     }
-    return table;
-}
-
-void ShownFields::noteWriter(std::size_t slot, const Table* table)
-{
-    if (std::exchange(spotOf(slot).table, table) != table)
-        ++_handovers;
-}
-
-ShownFields::Spot& ShownFields::spotOf(std::size_t slot)
-{
-    if (slot >= _spots.size())
-        _spots.resize(slot + 1);
-    return _spots[slot];
-}
-
-void ShownFields::store(PlistDictionary& dictionary, std::size_t slot, std::string_view key,
-                        PlistValue value)
-{
-    std::size_t& place = spotOf(slot).place;
-    PlistDictionary::Entry* entry = dictionary.entryAt(place);
-    if (entry && entry->key == key) {
-        entry->value = std::move(value);
-        return;
-    }
-    dictionary.set(key, std::move(value));
-    place = dictionary.placeOf(key).value_or(0);
+    return dictionary.entryAt(*place)->value;
 }
 
 } // namespace ventrik

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "LogGenerator/Orbel/FieldBytes.h"
 #include "LogGenerator/Orbel/FieldMemory.h"
+#include "LogGenerator/Orbel/FieldTables.h"
 #include "LogGenerator/Orbel/TextMemory.h"
 #include "PropertyList/PlistValue.h"
 
-#include <list>
 #include <string_view>
 #include <vector>
 
@@ -38,38 +37,13 @@ class ShownFields
     std::optional<ValueOrigin> originOf(std::string_view key) const;
 
   private:
-    /// A table of fields, and the bytes that it showed last.
-    struct Table {
-        std::span<const Field> fields;
-        FieldBytes bytes;
-        FieldBytes::Words words = {};
-        std::vector<std::size_t> slots = {}; // of the fields' keys
-        bool hasKeyTwice = false;
-        std::size_t handovers = 0; // after its last showing; 0: it was not shown yet
-    };
-    /// Of each slot's key.
-    struct Spot {
-        std::size_t place = 0;        // in the dictionary, as far as is known
-        const Table* table = nullptr; // which wrote it last; null: none did
-    };
-
-    Table& tableOf(std::span<const Field> fields);
-    void show(PlistDictionary& dictionary, const Table& table, std::size_t index,
-              const LogPacket& packet);
-    void show(PlistDictionary& dictionary, std::size_t slot, const Field& field, std::int64_t raw,
-              const Table* table);
-    void store(PlistDictionary& dictionary, std::size_t slot, std::string_view key,
-               PlistValue value);
-    Spot& spotOf(std::size_t slot);
-    void noteWriter(std::size_t slot, const Table* table);
+    void show(PlistDictionary& dictionary, std::size_t slot, const Field& field, std::int64_t raw);
+    PlistValue& valueOf(PlistDictionary& dictionary, std::size_t slot, std::string_view key);
 
     FieldMemory _memory;
     TextMemory _texts;
-    std::vector<Spot> _spots;
-    std::list<Table> _tables;
-    // How often a key got another writer, or all was forgotten: what a table showed then may be
-    // there no longer.
-    std::size_t _handovers = 1;
+    FieldTables _tables;
+    std::vector<std::optional<std::size_t>> _places; // of each slot's key, as far as is known
     const Record* _record = nullptr;
     std::size_t _removals = 0; // of the dictionary, as far as is known
 };

@@ -1,4 +1,5 @@
 #include "Platform/Technology.h"
+#include "TelephonyService/Scenarios.h"
 #include "Tests/LogGenerator/GeneratorFixture.h"
 #include "Tests/Support/ResourceFiles.h"
 
@@ -92,6 +93,32 @@ TEST_P(RememberedNumbersTest, ShowWhatSectionsThatRememberNothingShow)
         ASSERT_EQ(*state.find("Display"), *other.find("Display")) << i;
     }
 }
+
+using SuccessorTest = RememberedNumbersTest;
+
+// A generator that takes over another one's display knows nothing of what it shows.
+TEST_P(SuccessorTest, ShowsWhatAGeneratorThatSawAllPacketsShows)
+{
+    const auto remembering = makeGenerator();
+    const auto scenario = makeScenario(*GetParam(), 3);
+    std::mt19937 random{5};
+    PlistDictionary other;
+    for (int i = 0; i < 3000; ++i) {
+        Bytes packet = scenario->next()->data;
+        if (packet.size() > 15 && packet.size() < 1000 && random() % 2 == 0)
+            packet[15 + random() % (packet.size() - 15)] = static_cast<std::uint8_t>(random());
+        remembering->updateState(state, packet);
+        makeGenerator()->updateState(other, packet);
+        ASSERT_EQ(*state.find("Display"), *other.find("Display")) << i;
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Technologies, SuccessorTest,
+                         testing::Values(&Technologies::c2k, &Technologies::lte,
+                                         &Technologies::utran),
+                         [](const auto& technology) {
+                             return std::string(technology.param->name);
+                         });
 
 INSTANTIATE_TEST_SUITE_P(Technologies, RememberedNumbersTest,
                          testing::Values(&Technologies::gsm, &Technologies::lte,

@@ -230,6 +230,33 @@ TEST_F(RowListTest, AFieldWithoutAKeyShowsTexts)
     EXPECT_EQ(rows, (PlistArray{"5", "9"}));
 }
 
+TEST_F(RowListTest, OfAListOfTextsOnlyThoseThatChangedAreStored)
+{
+    constexpr Field levels{"Levels", u16(0)};
+    const auto show = [&](std::int64_t raw) {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.showTexts(levels, raw, textFields[0]);
+        return *rows[0].dictionary()->find("Levels")->array();
+    };
+    PlistArray(show(0x0201)).replace(0, "mine");
+    EXPECT_EQ(show(0x0301), (PlistArray{"mine", "3"}));
+}
+
+TEST_F(RowListTest, AListOfTextsThatSomebodyHoldsStaysAsItIs)
+{
+    constexpr Field levels{"Levels", u16(0)};
+    const auto show = [&](std::int64_t raw) {
+        RowList::Rewrite writing(list, rows, record);
+        writing.nextRow();
+        writing.showTexts(levels, raw, textFields[0]);
+        return *rows[0].dictionary()->find("Levels")->array();
+    };
+    const PlistArray held = show(0x0201);
+    EXPECT_EQ(show(0x0302), (PlistArray{"2", "3"}));
+    EXPECT_EQ(held, (PlistArray{"1", "2"}));
+}
+
 TEST_F(RowListTest, CopiedContainersStayAsTheyWereForWhoeverHoldsThem)
 {
     const auto show = [&](std::uint8_t cell, std::uint8_t level) {

@@ -65,6 +65,25 @@ TEST(PlistValue, CopyOfAnArrayIsIndependent)
     EXPECT_FALSE(copy.isSameContainer(array));
 }
 
+TEST(PlistValue, BecomesAText)
+{
+    PlistValue value = PlistArray();
+    value.setText("one");
+    EXPECT_EQ(value, "one");
+    const PlistValue before = value;
+    value.setText("another");
+    EXPECT_EQ(value, "another");
+    EXPECT_EQ(before, "one");
+}
+
+TEST(PlistValue, CountsWhoSharesAnArray)
+{
+    const PlistArray array;
+    EXPECT_EQ(array.handleCount(), 1U);
+    const PlistArray& other = PlistArray(array);
+    EXPECT_EQ(other.handleCount(), 2U);
+}
+
 TEST(PlistValue, NamesItsKind)
 {
     EXPECT_EQ(PlistValue("a").kindName(), "string");

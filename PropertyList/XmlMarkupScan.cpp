@@ -4,6 +4,7 @@
 #include "PropertyList/XmlText.h"
 
 #include <algorithm>
+#include <array>
 #include <utility>
 
 namespace ventrik
@@ -47,10 +48,19 @@ constexpr bool isNameStart(char character)
            character == '_' || character == ':' || static_cast<unsigned char>(character) >= 0x80;
 }
 
+constexpr std::array<bool, 256> nameParts = [] {
+    std::array<bool, 256> parts{};
+    for (std::size_t code = 0; code < parts.size(); ++code) {
+        const char character = static_cast<char>(code);
+        parts[code] = isNameStart(character) || (character >= '0' && character <= '9') ||
+                      character == '-' || character == '.';
+    }
+    return parts;
+}();
+
 constexpr bool isNamePart(char character)
 {
-    return isNameStart(character) || (character >= '0' && character <= '9') || character == '-' ||
-           character == '.';
+    return nameParts[static_cast<unsigned char>(character)];
 }
 
 } // namespace
@@ -203,6 +213,8 @@ XmlPiece XmlMarkupScan::takeStartTag()
 XmlPiece XmlMarkupScan::takeEndTag()
 {
     _place = _start + 2;
+    if (endsInnermost())
+        return closeElement();
     const std::string_view name = takeName();
     skipSpace();
     if (!take('>'))
@@ -213,6 +225,20 @@ XmlPiece XmlMarkupScan::takeEndTag()
         failPropertyList("</{}> at byte {} does not end <{}> at byte {}", printable(name), _start,
                          printable(_open.back().text), _open.back().offset);
     return closeElement();
+}
+
+// Whether the tag is the innermost element's name and nothing else; goes past it then. Nearly every
+// end tag is.
+bool XmlMarkupScan::endsInnermost()
+{
+    if (_open.empty())
+        return false;
+    const std::string_view name = _open.back().text;
+    const std::string_view rest = _text.substr(_place);
+    if (rest.size() <= name.size() || rest[name.size()] != '>' || !rest.starts_with(name))
+        return false;
+    _place += name.size() + 1;
+    return true;
 }
 
 XmlPiece XmlMarkupScan::closeElement()
@@ -268,9 +294,11 @@ std::string_view XmlMarkupScan::takeName()
     const std::size_t name = _place;
     if (name == _text.size() || !isNameStart(_text[name]))
         failTag();
-    while (_place < _text.size() && isNamePart(_text[_place]))
-        ++_place;
-    return _text.substr(name, _place - name);
+    std::size_t end = name;
+    while (end < _text.size() && isNamePart(_text[end]))
+        ++end;
+    _place = end;
+    return _text.substr(name, end - name);
 }
 
 void XmlMarkupScan::skipSpace()

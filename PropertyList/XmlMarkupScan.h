@@ -46,6 +46,7 @@ class XmlMarkupScan
     XmlPiece takeCdata();
     XmlPiece takeStartTag();
     XmlPiece takeEndTag();
+    bool endsInnermost();
     XmlPiece closeElement();
     XmlPiece endDocument() const;
     void countElement();

@@ -338,6 +338,41 @@ TEST_F(C2KOutputTest, AnotherLookupIsFilledAnew)
     EXPECT_EQ(second, (PlistDictionary{{"B", "5"}}));
 }
 
+TEST_F(C2KOutputTest, ATableShowsAgainInAnotherLookup)
+{
+    static constexpr std::array<Field, 2> table{{{"k", u8(0)}, {"l", u8(1)}}};
+    const Bytes part{5, 6};
+    C2KLabels labels;
+    for (int i = 0; i < 2; ++i) {
+        const PlistDictionary shown;
+        const PlistDictionary fresh{
+            {"k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", shown}}}},
+            {"l", PlistArray{PlistDictionary{{"key", "B"}, {"dict", shown}}}}};
+        labels.useLookup(&fresh);
+        labels.publish(table, nullptr, LogPacket(part));
+        EXPECT_EQ(shown, (PlistDictionary{{"A", "5"}, {"B", "6"}}));
+    }
+}
+
+TEST_F(C2KOutputTest, PilotsOfTheSameBytesNeedNotBeWorkedOutAgain)
+{
+    constexpr Field field{"k", u8(0)};
+    lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+    C2KLabels labels;
+    labels.useLookup(&lookup);
+    const Bytes source{1, 2};
+    EXPECT_FALSE(labels.showsPilotsOf(field, source));
+    labels.publish(field, {{0, 12, -3.5}}, source);
+    EXPECT_TRUE(labels.showsPilotsOf(field, source));
+    EXPECT_FALSE(labels.showsPilotsOf(field, Bytes{1, 3}));
+    labels.publish(field, {{0, 12, -4}}, "nothing");
+    EXPECT_FALSE(labels.showsPilotsOf(field, source));
+    EXPECT_FALSE(labels.showsPilotsOf(field, ByteView()));
+    labels.publish(field, {{0, 12, -3.5}}, source);
+    labels.publish(field, "nothing");
+    EXPECT_FALSE(labels.showsPilotsOf(field, source));
+}
+
 TEST_F(C2KOutputTest, AGroupOfPilotsThatChangesIsANewGroup)
 {
     constexpr Field field{"k", u8(0)};

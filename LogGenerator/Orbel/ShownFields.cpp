@@ -22,9 +22,10 @@ void ShownFields::begin(const PlistDictionary& dictionary, const Record* record)
     forgetAll();
 }
 
-void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw)
+void ShownFields::show(PlistDictionary& dictionary, const Field& field, std::int64_t raw,
+                       std::size_t start)
 {
-    show(dictionary, _memory.slotOf(field), field, raw);
+    showIn(dictionary, _memory.slotOf(field), field, raw, start);
 }
 
 void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> fields,
@@ -32,13 +33,14 @@ void ShownFields::show(PlistDictionary& dictionary, std::span<const Field> field
 {
     _tables.visit(fields, packet, _memory,
                   [&](std::size_t slot, const Field& field, std::int64_t raw) {
-                      show(dictionary, slot, field, raw);
+                      showIn(dictionary, slot, field, raw, 0);
                   });
 }
 
-void ShownFields::show(PlistDictionary& dictionary, std::size_t slot, const Field& field,
-                       std::int64_t raw)
+void ShownFields::showIn(PlistDictionary& dictionary, std::size_t slot, const Field& field,
+                         std::int64_t raw, std::size_t start)
 {
+    _memory.place(slot, start);
     if (_memory.shows(slot, field, raw, false))
         return;
     if (const auto& text = _texts.textOf(field, raw)) {

@@ -24,8 +24,10 @@ class ShownFields
     /// The following fields are those of this record, and go into this dictionary.
     void begin(const PlistDictionary& dictionary, const Record* record);
 
-    /// Shows the raw number as the field says, or nothing new where that shows nothing.
-    void show(PlistDictionary& dictionary, const Field& field, std::int64_t raw);
+    /// Shows the raw number as the field says, or nothing new where that shows nothing. The field's
+    /// place counts from the start.
+    void show(PlistDictionary& dictionary, const Field& field, std::int64_t raw,
+              std::size_t start = 0);
     /// Shows a table of fields, a constant.
     void show(PlistDictionary& dictionary, std::span<const Field> fields, const LogPacket& packet);
     /// Shows a number that was worked out from the record, in the field's format.
@@ -37,7 +39,8 @@ class ShownFields
     std::optional<ValueOrigin> originOf(std::string_view key) const;
 
   private:
-    void show(PlistDictionary& dictionary, std::size_t slot, const Field& field, std::int64_t raw);
+    void showIn(PlistDictionary& dictionary, std::size_t slot, const Field& field, std::int64_t raw,
+                std::size_t start);
     PlistValue& valueOf(PlistDictionary& dictionary, std::size_t slot, std::string_view key);
 
     FieldMemory _memory;

@@ -84,7 +84,6 @@ TEST_F(RowListTest, AnUnchangedNumberIsNotStoredAgain)
 // The level of 0 shows nothing.
 TEST_F(RowListTest, AValueThatShowsNothingLeavesItsRowUntilItShowsAgain)
 {
-    static constexpr std::array<Mark, 1> none{{{0, ""}}};
     constexpr std::array<Field, 2> fields{{{"Level", u8(0), marked({}, none)}, {"Cell", u8(1)}}};
     const auto rowOf = [&](std::uint8_t level) {
         const Bytes element{level, 7};

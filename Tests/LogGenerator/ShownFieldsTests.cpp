@@ -10,7 +10,6 @@ namespace ventrik
 namespace
 {
 
-constexpr std::array<Mark, 1> none{{{0, ""}}};
 constexpr std::array<Field, 2> levels{{{"Cell", u8(13)}, {"Level", u8(14), marked({}, none)}}};
 constexpr std::array<Field, 1> otherLevels{{{"Level", u8(15)}}};
 constexpr std::array<Field, 2> sameKey{{{"Level", u8(13)}, {"Level", u8(14), marked({}, none)}}};

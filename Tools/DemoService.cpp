@@ -37,7 +37,8 @@ std::string lastWords(QProcess& process)
 
 } // namespace
 
-bool DemoService::start(const DemoDirectory& directory, const std::string& technology)
+bool DemoService::start(const DemoDirectory& directory, const std::string& technology,
+                        RecordsMode records)
 {
     auto environment = QProcessEnvironment::systemEnvironment();
     environment.insert("VENTRIK_RUNTIME_DIR", QString::fromStdString(directory.path()));
@@ -56,7 +57,8 @@ bool DemoService::start(const DemoDirectory& directory, const std::string& techn
             _exit(EXIT_FAILURE);
     });
     _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
-                   {"--technology", QString::fromStdString(technology)});
+                   {"--technology", QString::fromStdString(technology), "--records",
+                    QString::fromStdString(std::string(nameOf(records)))});
     if (!waitUntilListening(directory.path()))
         return false;
     QObject::connect(&_process, &QProcess::finished, qApp, [this] {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Packets/Layouts.h"
 #include "Tools/DemoDirectory.h"
 
 #include <string>
@@ -17,7 +18,7 @@ class DemoService
     ~DemoService();
     /// Waits until the service listens; false when it does not come up, which is then told on
     /// standard error. The directory outlives the service.
-    bool start(const DemoDirectory& directory, const std::string& technology);
+    bool start(const DemoDirectory& directory, const std::string& technology, RecordsMode records);
 
   private:
     bool waitUntilListening(const std::string& runtimeDirectory);

@@ -196,7 +196,8 @@ int runDemo(const ViewerOptions& options, const DemoDirectory& directory)
         return EXIT_FAILURE;
     }
     DemoService service;
-    if (!service.start(directory, options.demoTechnology))
+    if (!service.start(directory, options.demoTechnology,
+                       options.records.value_or(RecordsMode::Base)))
         return EXIT_FAILURE;
     return runViewer(options, directory.path());
 }

@@ -84,7 +84,7 @@ TEST_F(RowListTest, AnUnchangedNumberIsNotStoredAgain)
 // The level of 0 shows nothing.
 TEST_F(RowListTest, AValueThatShowsNothingLeavesItsRowUntilItShowsAgain)
 {
-    constexpr std::array<Field, 2> fields{{{"Level", u8(0), marked({}, none)}, {"Cell", u8(1)}}};
+    constexpr std::array<Field, 2> fields{{{"Level", u8(0), {.none = 0}}, {"Cell", u8(1)}}};
     const auto rowOf = [&](std::uint8_t level) {
         const Bytes element{level, 7};
         RowList::Rewrite writing(list, rows, record);

@@ -10,9 +10,9 @@ namespace ventrik
 namespace
 {
 
-constexpr std::array<Field, 2> levels{{{"Cell", u8(13)}, {"Level", u8(14), marked({}, none)}}};
+constexpr std::array<Field, 2> levels{{{"Cell", u8(13)}, {"Level", u8(14), {.none = 0}}}};
 constexpr std::array<Field, 1> otherLevels{{{"Level", u8(15)}}};
-constexpr std::array<Field, 2> sameKey{{{"Level", u8(13)}, {"Level", u8(14), marked({}, none)}}};
+constexpr std::array<Field, 2> sameKey{{{"Level", u8(13)}, {"Level", u8(14), {.none = 0}}}};
 constexpr Record record{0x1234, "Levels", 14};
 
 constexpr std::size_t manyFields = 2 * FieldBytes::maximumFields + 1;

@@ -34,7 +34,8 @@ MemoryResources shippedTemplates()
     return resources;
 }
 
-/// The first byte picks the technology; then come messages, each behind its size in two bytes.
+/// The first byte picks the technology and the layouts that records are read by; then come
+/// messages, each behind its size in two bytes.
 void decode(ByteView input)
 {
     static const MemoryResources resources = shippedTemplates();
@@ -43,8 +44,10 @@ void decode(ByteView input)
     if (input.empty())
         return;
     const char* name = technologies.at(input[0] % technologies.size());
-    const auto generator = LogGenerator::generatorFromTechnology(technologyNamed(name)->identifier,
-                                                                 {log, resources, clock});
+    constexpr std::size_t modes = 3;
+    const auto records = static_cast<RecordsMode>(input[0] / technologies.size() % modes);
+    const auto generator = LogGenerator::generatorsReading(records)(
+        technologyNamed(name)->identifier, {log, resources, clock});
     PlistDictionary state;
     input = input.subspan(1);
     while (input.size() >= 2) {

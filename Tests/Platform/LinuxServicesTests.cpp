@@ -82,6 +82,14 @@ TEST_F(LinuxPreferencesTest, WritesTheDomainsFile)
               "[General]\nFieldTest=true\n");
 }
 
+TEST_F(LinuxPreferencesTest, KeepTexts)
+{
+    EXPECT_EQ(preferences.text("org.ventrik.Texts", "Records"), std::nullopt);
+    preferences.setText("org.ventrik.Texts", "Records", "extended");
+    EXPECT_TRUE(preferences.synchronize("org.ventrik.Texts"));
+    EXPECT_EQ(LinuxPreferences(log).text("org.ventrik.Texts", "Records"), "extended");
+}
+
 TEST_F(LinuxPreferencesTest, MakeTheirMissingDirectoriesPrivate)
 {
     const QTemporaryDir home;
@@ -207,8 +215,9 @@ TEST(LinuxResources, FindsTheTemplatesOfTheSourceTreeFromTheBuildTree)
 {
     qunsetenv("VENTRIK_RESOURCE_DIRECTORY");
     const LinuxResources resources(LinuxResources::defaultDirectories(), std::nullopt);
-    EXPECT_THAT(resources.paths("plist"), ElementsAre(HasSubstr("C2KTemplate"), HasSubstr("LTE"),
-                                                      HasSubstr("Orbel_GSM"), HasSubstr("UTRAN")));
+    EXPECT_THAT(resources.paths("plist"),
+                ElementsAre(HasSubstr("C2KTemplate"), HasSubstr("LTE.plist"), HasSubstr("LTEMore"),
+                            HasSubstr("Orbel_GSM"), HasSubstr("UTRAN")));
 }
 
 TEST(LinuxClock, KnowsTheZoneInForce)

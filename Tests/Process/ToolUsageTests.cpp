@@ -23,13 +23,16 @@ TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
                                         {"--replay", "x.pcap", "--speed", "fast"},
                                         {"--technology", "lte", "--seed", "-x"},
                                         {"--technology", "lte", "more"},
+                                        {"--technology", "lte", "--records", ""},
                                         {"--technology", "lte", "--log-level", "loud"},
                                         {"--unheard-of"}});
 }
 
 TEST_F(ToolUsage, WatchRefusesWhatIsWrong)
 {
-    expectRefused("ventrik-watch", {{"--unheard-of"}, {"more"}, {"--once=1"}, {"--log-level", ""}});
+    expectRefused(
+        "ventrik-watch",
+        {{"--unheard-of"}, {"more"}, {"--once=1"}, {"--records", "all"}, {"--log-level", ""}});
 }
 
 TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
@@ -40,6 +43,9 @@ TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)
                                      {"--technology", "5g", "a.pcap"},
                                      {"--resources", path("missing"), "a.pcap"},
                                      {"--snapshot"},
+                                     {"--records", "older", "a.pcap"},
+                                     {"--with-bytes", "a.pcap"},
+                                     {"--report-unknown", "b.txt"},
                                      {"--log-level", "3", "a.pcap"},
                                      {"--unheard-of", "a.pcap"}});
 }

@@ -18,83 +18,105 @@ namespace
 
 constexpr std::size_t readSize = 65536;
 
-struct CloseArchive {
-    void operator()(archive* handle) const { archive_read_free(handle); }
-};
-struct FileDescriptor {
-    explicit FileDescriptor(int number) : number(number) {}
-    ~FileDescriptor()
-    {
-        if (number > STDIN_FILENO)
-            close(number);
-    }
-    FileDescriptor(const FileDescriptor&) = delete;
-    FileDescriptor& operator=(const FileDescriptor&) = delete;
-    const int number;
-};
-
-// The library reads plain and compressed files alike: a file is a filter's data without an archive.
-struct OpenFile {
-    std::string name;
-    std::shared_ptr<FileDescriptor> descriptor;
-    std::shared_ptr<archive> handle;
-    bool isEmpty = false;
-
-    std::string reason() const
-    {
-        const char* text = archive_error_string(handle.get());
-        return fmt::format("{}: {}", name,
-                           text ? text : std::strerror(archive_errno(handle.get())));
-    }
-    std::size_t read(std::span<std::uint8_t> room, std::string& error) const
-    {
-        if (isEmpty)
-            return 0;
-        const la_ssize_t count = archive_read_data(handle.get(), room.data(), room.size());
-        if (count < 0) {
-            error = reason();
-            return 0;
-        }
-        return static_cast<std::size_t>(count);
-    }
-};
-
-std::shared_ptr<archive> newArchive()
+/// A file, or standard input, behind the library that tells compressed ones by content: a file is a
+/// filter's data without an archive. A read that a signal interrupts is an error.
+class OpenFile
 {
-    std::shared_ptr<archive> handle(archive_read_new(), CloseArchive());
-    archive_read_support_format_raw(handle.get());
-    archive_read_support_format_empty(handle.get());
-    archive_read_support_filter_gzip(handle.get());
-    archive_read_support_filter_bzip2(handle.get());
-    archive_read_support_filter_xz(handle.get());
-    archive_read_support_filter_zstd(handle.get());
-    return handle;
+  public:
+    explicit OpenFile(std::string name) : _name(std::move(name)), _handle(archive_read_new()) {}
+    ~OpenFile()
+    {
+        archive_read_free(_handle);
+        if (_descriptor > STDIN_FILENO)
+            close(_descriptor);
+    }
+    OpenFile(const OpenFile&) = delete;
+    OpenFile& operator=(const OpenFile&) = delete;
+
+    bool open(const std::string& path, std::string& error);
+    std::size_t read(std::span<std::uint8_t> room, std::string& error);
+
+  private:
+    static la_ssize_t readBlock(archive* handle, void* self, const void** block);
+    std::string reason() const;
+
+    std::string _name;
+    archive* _handle;
+    int _descriptor = -1;
+    Bytes _raw = Bytes(readSize);
+    ByteView _block; // what the library has given and is not taken yet
+    bool _isEmpty = false;
+};
+
+bool OpenFile::open(const std::string& path, std::string& error)
+{
+    _descriptor = path == "-" ? STDIN_FILENO : ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    if (_descriptor < 0) {
+        error = fmt::format("{}: {}", _name, std::strerror(errno));
+        return false;
+    }
+    archive_read_support_format_raw(_handle);
+    archive_read_support_format_empty(_handle);
+    archive_read_support_filter_gzip(_handle);
+    archive_read_support_filter_bzip2(_handle);
+    archive_read_support_filter_xz(_handle);
+    archive_read_support_filter_zstd(_handle);
+    archive_entry* entry = nullptr;
+    int result = archive_read_open(_handle, this, nullptr, readBlock, nullptr);
+    if (result == ARCHIVE_OK)
+        result = archive_read_next_header(_handle, &entry);
+    _isEmpty = result == ARCHIVE_EOF;
+    if (result < ARCHIVE_WARN) {
+        error = reason();
+        return false;
+    }
+    return true;
+}
+
+la_ssize_t OpenFile::readBlock(archive* handle, void* self, const void** block)
+{
+    auto& file = *static_cast<OpenFile*>(self);
+    const ssize_t count = ::read(file._descriptor, file._raw.data(), file._raw.size());
+    *block = file._raw.data();
+    if (count < 0)
+        archive_set_error(handle, errno, "%s", std::strerror(errno));
+    return count;
+}
+
+std::size_t OpenFile::read(std::span<std::uint8_t> room, std::string& error)
+{
+    while (_block.empty() && !_isEmpty) {
+        const void* data = nullptr;
+        std::size_t size = 0;
+        la_int64_t offset = 0;
+        const int result = archive_read_data_block(_handle, &data, &size, &offset);
+        _isEmpty = result != ARCHIVE_OK;
+        if (result < ARCHIVE_WARN)
+            error = reason();
+        if (!_isEmpty)
+            _block = {static_cast<const std::uint8_t*>(data), size};
+    }
+    const std::size_t count = std::min(room.size(), _block.size());
+    std::copy_n(_block.begin(), count, room.begin());
+    _block = _block.subspan(count);
+    return count;
+}
+
+std::string OpenFile::reason() const
+{
+    const char* text = archive_error_string(_handle);
+    return fmt::format("{}: {}", _name, text ? text : "it cannot be read");
 }
 
 } // namespace
 
 std::unique_ptr<ByteSource> ByteSource::open(const std::string& path, std::string& error)
 {
-    OpenFile file{path == "-" ? "standard input" : path, nullptr, newArchive()};
-    const int number = path == "-" ? STDIN_FILENO : ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
-    if (number < 0) {
-        error = fmt::format("{}: {}", file.name, std::strerror(errno));
+    const auto file = std::make_shared<OpenFile>(path == "-" ? "standard input" : path);
+    if (!file->open(path, error))
         return nullptr;
-    }
-    file.descriptor = std::make_shared<FileDescriptor>(number);
-    archive_entry* entry = nullptr;
-    if (archive_read_open_fd(file.handle.get(), number, readSize) != ARCHIVE_OK) {
-        error = file.reason();
-        return nullptr;
-    }
-    const int header = archive_read_next_header(file.handle.get(), &entry);
-    file.isEmpty = header == ARCHIVE_EOF;
-    if (header != ARCHIVE_OK && header != ARCHIVE_EOF && header != ARCHIVE_WARN) {
-        error = file.reason();
-        return nullptr;
-    }
     return std::make_unique<ByteSource>([file](std::span<std::uint8_t> room, std::string& reason) {
-        return file.read(room, reason);
+        return file->read(room, reason);
     });
 }
 
@@ -115,6 +137,13 @@ ByteView ByteSource::peek(std::size_t size)
     if (_end - _start < wanted)
         fill(wanted);
     return ByteView(_buffer).subspan(_start, std::min(wanted, _end - _start));
+}
+
+ByteView ByteSource::peekSome(std::size_t size)
+{
+    if (_start == _end)
+        fill(1);
+    return ByteView(_buffer).subspan(_start, std::min(size, _end - _start));
 }
 
 void ByteSource::skip(std::size_t size)

@@ -29,6 +29,8 @@ class ByteSource
     /// The next bytes, without taking them: so many as are asked for, fewer only at the end. They
     /// live until the next call. At most `maximumPeek`.
     ByteView peek(std::size_t size);
+    /// Likewise, but what is there without waiting for more: one byte at least, but at the end.
+    ByteView peekSome(std::size_t size);
     /// Takes bytes that were peeked.
     void skip(std::size_t size);
     /// Of the next byte, in the uncompressed capture.

@@ -1,9 +1,13 @@
 #include "Capture/CaptureReader.h"
 
-#include <array>
+#include "Capture/ByteSource.h"
+#include "Capture/PcapFile.h"
+#include "Packets/AllRecords.h"
+
+#include <algorithm>
+#include <map>
 
 #include <fmt/format.h>
-#include <pcap/pcap.h>
 
 namespace ventrik
 {
@@ -11,66 +15,76 @@ namespace ventrik
 namespace
 {
 
-// In the year 2255. What is later cannot be counted in nanoseconds for long.
-constexpr std::int64_t latestSecond = 9'000'000'000;
+// Log codes are numbered by the part of the baseband that writes them: their upper four bits.
+const Technology* technologyOfRecord(ByteView message)
+{
+    const LogPacket packet(message.size() < transportPrefixSize ? message : stripPrefix(message));
+    const std::uint32_t code = effectiveLogCode(packet);
+    if (packet.size() < logPacketHeaderSize || !recordOf(code))
+        return nullptr;
+    switch (code >> 12) {
+    case 0x1:
+        return &Technologies::c2k;
+    case 0x4:
+    case 0x5:
+    case 0x7:
+        return &Technologies::gsm;
+    case 0xB:
+        return &Technologies::lte;
+    case 0xD:
+        return &Technologies::utran;
+    default:
+        return nullptr; // of all technologies
+    }
+}
 
 } // namespace
 
-void CaptureReader::Closer::operator()(pcap* handle) const
-{
-    pcap_close(handle);
-}
-
 std::optional<CaptureReader> CaptureReader::open(const std::string& path, std::string& error)
 {
-    std::array<char, PCAP_ERRBUF_SIZE> reason{};
-    pcap* handle = pcap_open_offline_with_tstamp_precision(path.c_str(), PCAP_TSTAMP_PRECISION_NANO,
-                                                           reason.data());
     const std::string name = path == "-" ? "standard input" : path;
-    if (!handle) {
-        // The library puts the name in front of some of its reasons and not of others.
-        const std::string_view text(reason.data());
-        error = text.starts_with(path) ? std::string(text) : fmt::format("{}: {}", name, text);
+    auto source = ByteSource::open(path, error);
+    if (!source)
         return std::nullopt;
-    }
-    return CaptureReader(handle, name);
+    std::unique_ptr<CaptureContainer> container;
+    // What is nothing else is for the library to name.
+    container = PcapFile::open(std::move(source), name, error);
+    return container ? std::optional(CaptureReader(std::move(container))) : std::nullopt;
 }
 
 std::optional<Technology> CaptureReader::technology() const
 {
-    return technologyOfLinkType(linkType());
+    const auto type = linkType();
+    return type ? technologyOfLinkType(*type) : std::nullopt;
 }
 
-int CaptureReader::linkType() const
+std::optional<Technology> CaptureReader::guessTechnology()
 {
-    return pcap_datalink(_handle.get());
+    constexpr std::size_t enough = 1000;
+    while (_ahead.size() < enough) {
+        const auto message = _container->next();
+        if (!message)
+            break;
+        _ahead.push_back({*message, Bytes(message->data.begin(), message->data.end())});
+    }
+    std::map<std::string_view, std::size_t> counts;
+    for (const ReadAhead& ahead : _ahead)
+        if (const Technology* technology = technologyOfRecord(ahead.data))
+            ++counts[technology->name];
+    const auto most =
+        std::ranges::max_element(counts, {}, [](const auto& count) { return count.second; });
+    return most == counts.end() ? std::nullopt : technologyNamed(most->first);
 }
 
 std::optional<CapturedMessage> CaptureReader::next()
 {
-    pcap_pkthdr* header = nullptr;
-    const u_char* data = nullptr;
-    const int result = pcap_next_ex(_handle.get(), &header, &data);
-    if (result != 1) {
-        if (result == PCAP_ERROR)
-            _error = fmt::format("{}: message {}: {}", _path, _count, pcap_geterr(_handle.get()));
-        return std::nullopt;
-    }
-    if (header->caplen < header->len) {
-        _error = fmt::format("{}: message {}: cut short when it was captured ({} of {} bytes)",
-                             _path, _count, header->caplen, header->len);
-        return std::nullopt;
-    }
-    if (header->ts.tv_sec < 0 || header->ts.tv_sec > latestSecond) {
-        _error = fmt::format("{}: message {}: its time, {} s, is out of range", _path, _count,
-                             header->ts.tv_sec);
-        return std::nullopt;
-    }
-    ++_count;
-    // At nanosecond precision the library gives nanoseconds in the field for microseconds.
-    const auto time =
-        std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec);
-    return CapturedMessage{Clock::TimePoint(time), {data, header->caplen}};
+    if (_ahead.empty())
+        return _container->next();
+    CapturedMessage message = _ahead.front().message;
+    _current = std::move(_ahead.front().data);
+    message.data = _current;
+    _ahead.pop_front();
+    return message;
 }
 
 } // namespace ventrik

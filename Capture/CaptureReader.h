@@ -1,50 +1,54 @@
 #pragma once
 
-#include "Platform/Clock.h"
+#include "Capture/CaptureContainer.h"
 #include "Platform/Technology.h"
-#include "PropertyList/PlistValue.h"
 
+#include <deque>
 #include <memory>
 #include <optional>
 #include <string>
-
-struct pcap;
+#include <vector>
 
 namespace ventrik
 {
 
-/// One message of the log channel, as it was captured.
-struct CapturedMessage {
-    Clock::TimePoint time;
-    ByteView data; ///< lives until the next one is read
-};
-
-/// Reads a capture, a pcap file of log-channel messages, one after the other in constant memory.
+/// Reads a capture, a file of log-channel messages of any known kind, compressed or not, one
+/// message after the other in constant memory. The kind is told by content.
 class CaptureReader
 {
   public:
     /// Opens a file, or standard input for "-". On failure `error` says why in one line.
     static std::optional<CaptureReader> open(const std::string& path, std::string& error);
 
-    /// None when the link type names no technology.
+    /// None when the capture does not tell it, or its link type names none.
     std::optional<Technology> technology() const;
-    int linkType() const;
+    /// The technology that decodes most of the first 1,000 records; none where no technology
+    /// decodes any. They are read ahead.
+    std::optional<Technology> guessTechnology();
+    /// None for containers that have no such thing.
+    std::optional<int> linkType() const { return _container->linkType(); }
 
     /// The next message; none at the end of the capture and at damage.
     std::optional<CapturedMessage> next();
     /// What is wrong with the capture, in one line; empty when it ended as it should.
-    const std::string& error() const { return _error; }
+    std::string error() const { return _container->error(); }
+    /// What was skipped, a line for each kind of damage.
+    std::vector<std::string> notes() const { return _container->notes(); }
 
   private:
-    struct Closer {
-        void operator()(pcap* handle) const;
-    };
-    CaptureReader(pcap* handle, std::string path) : _handle(handle), _path(std::move(path)) {}
+    explicit CaptureReader(std::unique_ptr<CaptureContainer> container)
+        : _container(std::move(container))
+    {
+    }
 
-    std::unique_ptr<pcap, Closer> _handle;
-    std::string _path;
-    std::string _error;
-    std::size_t _count = 0;
+    struct ReadAhead {
+        CapturedMessage message; ///< but for its data
+        Bytes data;
+    };
+
+    std::unique_ptr<CaptureContainer> _container;
+    std::deque<ReadAhead> _ahead;
+    Bytes _current; // the data of the last message that had been read ahead
 };
 
 } // namespace ventrik

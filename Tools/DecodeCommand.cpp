@@ -136,12 +136,20 @@ class Decoding
                 _failure = _reader.error();
                 return;
             }
+            if (isOfOtherSubscription(*message))
+                continue;
             _decoder.take(*message);
             count(*message);
             if (_options.format == DecodeFormat::JsonLines)
                 writeLine(*message);
             progress.count(++_packets);
         }
+    }
+
+    bool isOfOtherSubscription(const CapturedMessage& message) const
+    {
+        return _options.subscription && message.subscription &&
+               *message.subscription != *_options.subscription;
     }
 
     void count(const CapturedMessage& message)
@@ -155,6 +163,8 @@ class Decoding
     // Only where there is something that the result cannot tell.
     void tellAboutRecords()
     {
+        for (const std::string& note : _reader.notes())
+            complain(note);
         for (const ReadLayout& layout : _decoder.layouts())
             if (layout.kind == LayoutKind::NotKnown)
                 complain(fmt::format("{}: {}", _options.capture, warningOf(layout)));
@@ -249,14 +259,22 @@ class Decoding
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
 
-std::optional<Technology> chooseTechnology(const DecodeOptions& options,
-                                           const CaptureReader& reader)
+std::optional<Technology> chooseTechnology(const DecodeOptions& options, CaptureReader& reader)
 {
-    const auto technology = options.technology ? options.technology : reader.technology();
-    if (!technology)
+    if (options.technology)
+        return options.technology;
+    if (const auto technology = reader.technology())
+        return technology;
+    if (const auto type = reader.linkType()) {
         complain(fmt::format("{}: link type {} names no technology; say which with --technology",
-                             options.capture, reader.linkType()));
-    return technology;
+                             options.capture, *type));
+        return std::nullopt;
+    }
+    const auto guess = reader.guessTechnology();
+    complain(guess ? fmt::format("{}: by its records it is of {}", options.capture, guess->name)
+                   : fmt::format("{}: no record tells the technology; say which with --technology",
+                                 options.capture));
+    return guess;
 }
 
 int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* output)
@@ -335,6 +353,8 @@ bool countRecords(const std::string& capture, RecordCensus& census)
             isMore = false;
         }
     }
+    for (const std::string& note : reader ? reader->notes() : std::vector<std::string>())
+        complain(note);
     if (!error.empty() && !interrupted)
         complain(error);
     return error.empty();

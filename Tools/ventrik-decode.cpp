@@ -42,6 +42,9 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    "line for every message",
                    result.format, formatValue);
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
+    line.addOption("--subscription N",
+                   "leaves out what captures tell to be of another subscription",
+                   result.subscription, wholeNumberValue);
     line.addOption("--system-log FILE",
                    "writes every system-log line to FILE: its priority, a tab, its text",
                    result.systemLogFile, textValue);
@@ -69,7 +72,8 @@ void addOptions(CommandLine& line, DecodeOptions& result)
 
 void addReportOptions(CommandLine& line, UnknownReportOptions& result)
 {
-    line.addArguments("CAPTURE", "a pcap file; - for standard input", result.captures);
+    line.addArguments("CAPTURE", "a capture of any kind, compressed or not; - for standard input",
+                      result.captures);
     line.beginGroup("Records that cannot be read");
     line.addOption("--report-unknown FILE",
                    "writes which there are to FILE, to be sent to us, and nothing else: codes, "

@@ -116,13 +116,15 @@ std::optional<LogChannelContent> makeContent(const ServiceOptions& options, Syst
                 return makeScenario(technology, seed, records);
             }};
     }
-    const auto reader = CaptureReader::open(options.replay->capture, error);
+    auto reader = CaptureReader::open(options.replay->capture, error);
     if (!reader)
         return std::nullopt;
-    const auto technology = reader->technology();
+    const auto type = reader->linkType();
+    const auto technology = type ? reader->technology() : reader->guessTechnology();
     if (!technology) {
-        error = fmt::format("{}: link type {} names no technology", options.replay->capture,
-                            reader->linkType());
+        error = type ? fmt::format("{}: link type {} names no technology", options.replay->capture,
+                                   *type)
+                     : fmt::format("{}: no record tells the technology", options.replay->capture);
         return std::nullopt;
     }
     return LogChannelContent{std::string(technology->identifier),

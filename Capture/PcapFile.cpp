@@ -1,0 +1,107 @@
+#include "Capture/PcapFile.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+
+#include <fmt/format.h>
+#include <pcap/pcap.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+// In the year 2255. What is later cannot be counted in nanoseconds for long.
+constexpr std::int64_t latestSecond = 9'000'000'000;
+
+// In either byte order: with microseconds, with nanoseconds; the newer form's first block.
+constexpr std::array<std::array<std::uint8_t, 4>, 5> magics{{
+    {0xD4, 0xC3, 0xB2, 0xA1},
+    {0xA1, 0xB2, 0xC3, 0xD4},
+    {0x4D, 0x3C, 0xB2, 0xA1},
+    {0xA1, 0xB2, 0x3C, 0x4D},
+    {0x0A, 0x0D, 0x0D, 0x0A},
+}};
+
+// The library reads from a stream; ours takes its bytes from the source.
+ssize_t readFromSource(void* cookie, char* room, std::size_t size)
+{
+    auto& source = *static_cast<ByteSource*>(cookie);
+    const ByteView bytes = source.peekSome(size);
+    std::copy(bytes.begin(), bytes.end(), reinterpret_cast<std::uint8_t*>(room));
+    source.skip(bytes.size());
+    return bytes.empty() && !source.error().empty() ? -1 : static_cast<ssize_t>(bytes.size());
+}
+
+} // namespace
+
+bool PcapFile::isIn(ByteView firstBytes)
+{
+    return std::ranges::any_of(magics, [&](const auto& magic) {
+        return firstBytes.size() >= magic.size() &&
+               std::ranges::equal(magic, firstBytes.first(magic.size()));
+    });
+}
+
+void PcapFile::Closer::operator()(pcap* handle) const
+{
+    pcap_close(handle);
+}
+
+std::unique_ptr<PcapFile> PcapFile::open(std::unique_ptr<ByteSource> source, std::string name,
+                                         std::string& error)
+{
+    std::unique_ptr<PcapFile> file(new PcapFile(std::move(source), std::move(name)));
+    std::FILE* stream =
+        fopencookie(file->_source.get(), "rb", {readFromSource, nullptr, nullptr, nullptr});
+    std::array<char, PCAP_ERRBUF_SIZE> reason{};
+    file->_handle.reset(pcap_fopen_offline_with_tstamp_precision(stream, PCAP_TSTAMP_PRECISION_NANO,
+                                                                 reason.data()));
+    if (file->_handle)
+        return file; // and the handle owns the stream
+    std::fclose(stream);
+    error = file->_source->error().empty() ? fmt::format("{}: {}", file->_name, reason.data())
+                                           : file->_source->error();
+    return nullptr;
+}
+
+std::optional<int> PcapFile::linkType() const
+{
+    return pcap_datalink(_handle.get());
+}
+
+void PcapFile::fail(std::string_view reason)
+{
+    _error = _source->error().empty() ? fmt::format("{}: message {}: {}", _name, _count, reason)
+                                      : _source->error();
+}
+
+std::optional<CapturedMessage> PcapFile::next()
+{
+    pcap_pkthdr* header = nullptr;
+    const u_char* data = nullptr;
+    const int result = pcap_next_ex(_handle.get(), &header, &data);
+    if (result != 1) {
+        if (result == PCAP_ERROR)
+            fail(pcap_geterr(_handle.get()));
+        return std::nullopt;
+    }
+    if (header->caplen < header->len) {
+        fail(fmt::format("cut short when it was captured ({} of {} bytes)", header->caplen,
+                         header->len));
+        return std::nullopt;
+    }
+    if (header->ts.tv_sec < 0 || header->ts.tv_sec > latestSecond) {
+        fail(fmt::format("its time, {} s, is out of range", header->ts.tv_sec));
+        return std::nullopt;
+    }
+    ++_count;
+    // At nanosecond precision the library gives nanoseconds in the field for microseconds.
+    const auto time =
+        std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec);
+    return CapturedMessage{Clock::TimePoint(time), {data, header->caplen}};
+}
+
+} // namespace ventrik

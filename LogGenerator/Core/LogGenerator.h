@@ -47,9 +47,12 @@ class LogGenerator
                                                 std::span<const std::string_view> path) const;
 
     /// How the records were read, the last one of each log code, that the section shows which
-    /// stands at that path or holds it; empty outside of sections. An empty path: of all sections.
+    /// stands at that path or holds it; empty outside of sections.
     virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                               std::span<const std::string_view> path) const;
+
+    /// The same of all sections.
+    virtual std::vector<ReadLayout> layouts() const { return {}; }
 
     /// A new generator for the service's technology identifier, or none if it is unknown.
     static std::unique_ptr<LogGenerator> generatorFromTechnology(const PlistValue& technology,

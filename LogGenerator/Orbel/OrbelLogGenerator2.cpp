@@ -140,17 +140,18 @@ std::vector<ReadLayout> OrbelLogGenerator2::layoutsAt(const PlistDictionary&,
     for (const std::string_view name : path)
         if (const Base* section = cIndex ? cIndex->getClass(name) : nullptr)
             return section->layouts();
-    return path.empty() && cIndex ? layoutsOfAllSections() : std::vector<ReadLayout>();
+    return {};
 }
 
-std::vector<ReadLayout> OrbelLogGenerator2::layoutsOfAllSections() const
+std::vector<ReadLayout> OrbelLogGenerator2::layouts() const
 {
-    std::map<std::uint32_t, ReadLayout> layouts;
-    for (const auto& [name, section] : cIndex->sections())
-        for (const ReadLayout& layout : section->layouts())
-            layouts.emplace(layout.logCode, layout);
+    std::map<std::uint32_t, ReadLayout> byCode;
+    if (cIndex)
+        for (const auto& [name, section] : cIndex->sections())
+            for (const ReadLayout& layout : section->layouts())
+                byCode.emplace(layout.logCode, layout);
     std::vector<ReadLayout> result;
-    for (const auto& [code, layout] : layouts)
+    for (const auto& [code, layout] : byCode)
         result.push_back(layout);
     return result;
 }

@@ -29,6 +29,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
 
     std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                       std::span<const std::string_view> path) const override;
+    std::vector<ReadLayout> layouts() const override;
 
     /// Routes one packet, as it arrived, to the subscribed sections.
     void updateWithData(ByteView data);
@@ -50,7 +51,6 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     /// The display in the state; null in the call that builds it, and when there is none.
     const PlistValue* ensureDisplay(PlistDictionary& state);
     std::optional<PlistValue> buildDisplay(PlistDictionary& state);
-    std::vector<ReadLayout> layoutsOfAllSections() const;
     /// Of which displays this one may go on with.
     std::string displayOwner() const;
     void bindSection(std::string_view name, const PlistValue& container);

@@ -270,6 +270,7 @@ TEST_F(LTERecordsModeTest, TellsTheLayoutsOfASectionAtItsPathAndBelow)
     EXPECT_THAT(warningsAt(*newer, {"Neighbors", "Neighbor Measurements", "Version"}),
                 ElementsAre(warning));
     EXPECT_THAT(warningsAt(*newer, {"Neighbors"}), IsEmpty());
+    EXPECT_THAT(warningsAt(*newer, {}), IsEmpty());
     EXPECT_THAT(warningsAt(*newer, {"Serving Cell Info"}), IsEmpty());
 }
 
@@ -278,7 +279,7 @@ TEST_F(LTERecordsModeTest, TellsTheLayoutsOfAllSectionsOnce)
     const auto newer = generator(RecordsMode::Newer);
     newer->updateState(state, cellInfo().build());
     newer->updateState(state, PacketBuilder(0xB180).size(60).u8(13, 7).build());
-    EXPECT_THAT(newer->layoutsAt(state, {}),
+    EXPECT_THAT(newer->layouts(),
                 ElementsAre(ReadLayout{0xB0C2, 3, 42, LayoutKind::Newer},
                             ReadLayout{0xB180, 7, 60, LayoutKind::NotKnown}));
 }

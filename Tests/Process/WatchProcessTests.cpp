@@ -38,6 +38,29 @@ TEST_F(WatchProcess, MarksValuesThatCannotBe)
                                            "    Download Frequency: 1300\n"));
 }
 
+TEST_F(WatchProcess, NamesARecordWhoseLayoutIsNotKnownBelowItsSection)
+{
+    const Bytes unknown = PacketBuilder(0xB17F).size(60).u8(13, 7).build();
+    const auto capture = PcapBytes(lteLinkType).record(captureStart, 0, unknown);
+    const auto service = startReplay("unknown.pcap", capture.bytes());
+    const auto watch = start("ventrik-watch", {"--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(),
+                HasSubstr("\n  Serving Cell Measurements\n"
+                          "    0xB17F version 7: layout not known, values may be wrong\n"
+                          "    Measured RSRP"));
+}
+
+TEST_F(WatchProcess, ReadsRecordsAsItIsTold)
+{
+    const Bytes state = PacketBuilder(0xB0EE).size(32).u8(13, 2).u8(14, 3).build();
+    const auto capture = PcapBytes(lteLinkType).record(captureStart, 0, state);
+    const auto service = startReplay("state.pcap", capture.bytes());
+    const auto watch = start("ventrik-watch", {"--once", "--records", "extended"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("EMM State: EMM_REGISTERED\n"));
+}
+
 TEST_F(WatchProcess, EndsOnSIGTERMAndLeavesNoSocket)
 {
     const auto watch = start("ventrik-watch", {"--verbose"});

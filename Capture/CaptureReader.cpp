@@ -1,10 +1,13 @@
 #include "Capture/CaptureReader.h"
 
 #include "Capture/ByteSource.h"
+#include "Capture/DlfFile.h"
 #include "Capture/PcapFile.h"
+#include "Capture/SerialStream.h"
 #include "Packets/AllRecords.h"
 
 #include <algorithm>
+#include <array>
 #include <map>
 
 #include <fmt/format.h>
@@ -38,18 +41,55 @@ const Technology* technologyOfRecord(ByteView message)
     }
 }
 
+/// A kind of file that captures are kept in.
+struct Container {
+    bool (*isIn)(ByteView firstBytes);
+    std::unique_ptr<CaptureContainer> (*open)(std::unique_ptr<ByteSource> source,
+                                              const std::string& name, std::string& error);
+};
+
+std::unique_ptr<CaptureContainer> openPcapFile(std::unique_ptr<ByteSource> source,
+                                               const std::string& name, std::string& error)
+{
+    return PcapFile::open(std::move(source), name, error);
+}
+
+template <typename Kind>
+std::unique_ptr<CaptureContainer> make(std::unique_ptr<ByteSource> source, const std::string& name,
+                                       std::string&)
+{
+    return std::make_unique<Kind>(std::move(source), name);
+}
+
+// In the order in which they are tried: those that are surest of themselves first.
+constexpr std::array<Container, 3> containers{{
+    {PcapFile::isIn, openPcapFile},
+    {SerialStream::isIn, make<SerialStream>},
+    {DlfFile::isIn, make<DlfFile>},
+}};
+
 } // namespace
 
 std::optional<CaptureReader> CaptureReader::open(const std::string& path, std::string& error)
 {
+    constexpr std::size_t magicSize = 4;
+    constexpr std::size_t enoughToTell = 65536;
     const std::string name = path == "-" ? "standard input" : path;
     auto source = ByteSource::open(path, error);
     if (!source)
         return std::nullopt;
-    std::unique_ptr<CaptureContainer> container;
-    // What is nothing else is for the library to name.
-    container = PcapFile::open(std::move(source), name, error);
-    return container ? std::optional(CaptureReader(std::move(container))) : std::nullopt;
+    // A pcap file tells itself by its first bytes and does not wait for more of them.
+    const Container* container = containers.data();
+    if (!container->isIn(source->peek(magicSize))) {
+        const ByteView firstBytes = source->peek(enoughToTell);
+        container = std::ranges::find_if(
+            containers, [&](const Container& kind) { return kind.isIn(firstBytes); });
+    }
+    // What is of no kind is for the first one to refuse.
+    if (container == containers.end())
+        container = containers.data();
+    auto opened = container->open(std::move(source), name, error);
+    return opened ? std::optional(CaptureReader(std::move(opened))) : std::nullopt;
 }
 
 std::optional<Technology> CaptureReader::technology() const

@@ -100,9 +100,9 @@ std::optional<LogRecords::Packet> LogRecords::next()
         const auto size = head ? sizeOf(*head) : std::nullopt;
         if (size && (*size <= _view.size() || _framing == Framing::Typed))
             return take(*head, std::min(*size, _view.size()));
-        const std::uint64_t offset = _source.offset();
+        const std::uint64_t start = offset();
         if (size || !skipToPlausible(head.has_value()))
-            endTruncated(offset, "a record is not whole");
+            endTruncated(start, "a record is not whole");
     }
     return std::nullopt;
 }
@@ -231,8 +231,7 @@ std::optional<std::size_t> LogRecords::sizeOf(const LogRecordHead& head)
 // to. Bytes that were looked through once in vain are not looked through again.
 std::optional<std::size_t> LogRecords::sizeOfPropertyList(const LogRecordHead& head)
 {
-    const std::size_t limit =
-        _source.offset() < _lookedOnTo ? lengthModulus : propertyListMaximumSize;
+    const std::size_t limit = offset() < _lookedOnTo ? lengthModulus : propertyListMaximumSize;
     const std::size_t first = head.before + head.length;
     for (std::size_t end = first; end <= limit + first; end += lengthModulus) {
         load(end + windowSize);
@@ -241,7 +240,7 @@ std::optional<std::size_t> LogRecords::sizeOfPropertyList(const LogRecordHead& h
         if (fits(end, head, TimeRule::Needed))
             return end;
     }
-    _lookedOnTo = std::max(_lookedOnTo, _source.offset() + propertyListMaximumSize);
+    _lookedOnTo = std::max(_lookedOnTo, offset() + propertyListMaximumSize);
     return fits(first, head, rule()) ? std::optional(first) : std::nullopt;
 }
 
@@ -265,7 +264,7 @@ bool LogRecords::hasPlausibleWithin(std::size_t end)
 // and may merely be cut.
 bool LogRecords::skipToPlausible(bool isRecord)
 {
-    const std::uint64_t start = _source.offset();
+    const std::uint64_t start = offset();
     consume(isRecord ? 1 : 0);
     bool isFound = false;
     while (!isFound && !_view.empty()) {
@@ -280,20 +279,20 @@ bool LogRecords::skipToPlausible(bool isRecord)
     }
     if (!isFound && isRecord && _framing == Framing::Bare)
         return false;
-    if (_source.offset() > start)
-        _damage.addBytes(start, _source.offset() - start);
+    if (offset() > start)
+        _damage.addBytes(start, offset() - start);
     return true;
 }
 
 LogRecords::Packet LogRecords::take(const LogRecordHead& head, std::size_t size)
 {
-    const std::uint64_t offset = _source.offset();
+    const std::uint64_t start = offset();
     ByteView packet = _view.first(size);
     if (_framing == Framing::Typed) {
         if (size < head.before + head.length)
-            _damage.addShort(offset);
+            _damage.addShort(start);
     } else if (head.before > 0) {
-        _damage.addTyped(offset);
+        _damage.addTyped(start);
         packet = packet.subspan(head.before - typeSize);
     } else {
         _packet.assign(1, ordinaryPacketType);
@@ -304,20 +303,20 @@ LogRecords::Packet LogRecords::take(const LogRecordHead& head, std::size_t size)
     if (head.time && fits(size, head, rule()))
         _lastTime = head.time;
     _taken = size;
-    return {packet, head.code, head.time, offset};
+    return {packet, head.code, head.time};
 }
 
 void LogRecords::endUnfinished()
 {
-    if (_framing == Framing::Typed)
-        _damage.addBytes(_source.offset(), _view.size());
-    else
-        endTruncated(_source.offset(), "a record's head is not whole");
+    if (_framing == Framing::Bare)
+        return endTruncated(offset(), "a record's head is not whole");
+    _damage.addBytes(offset(), _view.size());
+    consume(_view.size());
 }
 
-void LogRecords::endTruncated(std::uint64_t offset, std::string_view what)
+void LogRecords::endTruncated(std::uint64_t start, std::string_view what)
 {
-    _error = fmt::format("offset {}: truncated: {}", offset, what);
+    _error = fmt::format("offset {}: truncated: {}", start, what);
 }
 
 } // namespace ventrik

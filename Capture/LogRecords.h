@@ -37,13 +37,14 @@ class LogRecords
         ByteView data; ///< with its type, and the prefix of typed ones; lives until the next one
         std::uint16_t code;
         std::optional<Clock::TimePoint> time;
-        std::uint64_t offset; ///< of its first byte in the source
     };
 
     static bool isPlausibleAtStart(ByteView firstBytes, Framing framing);
 
-    LogRecords(ByteSource& source, Framing framing, RecordDamage& damage)
-        : _source(source), _framing(framing), _damage(damage)
+    /// Offsets are told from where the source stands in the whole, `baseOffset`.
+    LogRecords(ByteSource& source, Framing framing, RecordDamage& damage,
+               std::uint64_t baseOffset = 0)
+        : _source(source), _framing(framing), _damage(damage), _baseOffset(baseOffset)
     {
     }
 
@@ -57,6 +58,7 @@ class LogRecords
 
     void load(std::size_t size);
     void consume(std::size_t size);
+    std::uint64_t offset() const { return _baseOffset + _source.offset(); }
 
     TimeRule rule() const;
     std::optional<LogRecordHead> headAt(std::size_t position, std::size_t before, Time near,
@@ -73,12 +75,13 @@ class LogRecords
     bool hasPlausibleWithin(std::size_t end);
     bool skipToPlausible(bool isRecord);
     Packet take(const LogRecordHead& head, std::size_t size);
-    void endTruncated(std::uint64_t offset, std::string_view what);
+    void endTruncated(std::uint64_t start, std::string_view what);
     void endUnfinished();
 
     ByteSource& _source;
     Framing _framing;
     RecordDamage& _damage;
+    std::uint64_t _baseOffset;
     ByteView _view; // of the source, from the next byte on
     bool _isAtEnd = false;
     std::size_t _taken = 0;        // the size of the packet that was given last

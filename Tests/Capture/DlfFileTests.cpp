@@ -76,6 +76,13 @@ TEST(DlfFile, SkipsVersionReports)
     EXPECT_THAT(reading.notes, IsEmpty());
 }
 
+TEST(DlfFile, TakesAVersionReportForARecordWhateverItsTime)
+{
+    const auto reading = read(joined({first, versionReport, Bytes(40, 0xEE)}));
+    EXPECT_THAT(reading.notes, ElementsAre("x: 40 bytes that are no record, in 1 place" +
+                                           at(first.size() + versionReport.size())));
+}
+
 TEST(DlfFile, HoldsNothingWithAVersionReportAlone)
 {
     const auto reading = read(versionReport);
@@ -222,8 +229,9 @@ TEST(DlfFile, FollowsAClockThatIsSetByManyYears)
 TEST(DlfFile, IsNotLedAstrayByAFirstRecordOfAnotherTime)
 {
     const Bytes stray = logRecord(0xB193, timestampOf(5), {3});
-    EXPECT_THAT(read(joined({stray, first, second})).packets(),
-                ElementsAre(packetOf(stray), packetOf(first), packetOf(second)));
+    const auto reading = read(joined({stray, first, Bytes(40, 0xEE), second, third}));
+    EXPECT_THAT(reading.packets(),
+                ElementsAre(packetOf(stray), packetOf(first), packetOf(second), packetOf(third)));
 }
 
 TEST(DlfFile, EndsWithAnErrorInARecordThatIsNotWhole)

@@ -4,6 +4,7 @@
 #include "Capture/DlfFile.h"
 #include "Capture/PcapFile.h"
 #include "Capture/SerialStream.h"
+#include "Capture/SnapshotContainer.h"
 #include "Packets/AllRecords.h"
 
 #include <algorithm>
@@ -62,8 +63,9 @@ std::unique_ptr<CaptureContainer> make(std::unique_ptr<ByteSource> source, const
 }
 
 // In the order in which they are tried: those that are surest of themselves first.
-constexpr std::array<Container, 3> containers{{
+constexpr std::array<Container, 4> containers{{
     {PcapFile::isIn, openPcapFile},
+    {SnapshotContainer::isIn, make<SnapshotContainer>},
     {SerialStream::isIn, make<SerialStream>},
     {DlfFile::isIn, make<DlfFile>},
 }};

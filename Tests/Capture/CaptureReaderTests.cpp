@@ -1,6 +1,8 @@
 #include "Capture/CaptureReader.h"
+#include "Tests/Capture/ContainerReading.h"
 #include "Tests/Capture/OpenFiles.h"
 #include "Tests/Capture/PcapBytes.h"
+#include "Tests/Capture/SerialFrames.h"
 #include "Tests/Support/TemporaryFile.h"
 
 #include <gmock/gmock.h>
@@ -182,6 +184,99 @@ TEST(CaptureReader, AnAbsurdLengthIsDamage)
     auto reader = opened(path);
     EXPECT_FALSE(reader.next());
     EXPECT_NE(reader.error(), "");
+}
+
+// ---- Kinds of captures
+
+namespace
+{
+
+CaptureReader openedBytes(const Bytes& bytes)
+{
+    const TemporaryFile file("capture");
+    std::ofstream(file.path(), std::ios::binary)
+        .write(reinterpret_cast<const char*>(bytes.data()),
+               static_cast<std::streamsize>(bytes.size()));
+    return opened(file.path());
+}
+
+Bytes records(std::initializer_list<std::uint16_t> codes)
+{
+    Bytes bytes;
+    for (const std::uint16_t code : codes) {
+        const Bytes record = logRecord(code, stampIn2025(), {1, 2, 3});
+        bytes.insert(bytes.end(), record.begin(), record.end());
+    }
+    return bytes;
+}
+
+std::string guessedTechnology(std::initializer_list<std::uint16_t> codes)
+{
+    auto reader = openedBytes(records(codes));
+    const auto technology = reader.guessTechnology();
+    return technology ? std::string(technology->name) : "none";
+}
+
+std::size_t countMessages(CaptureReader& reader)
+{
+    std::size_t count = 0;
+    while (reader.next())
+        ++count;
+    return count;
+}
+
+} // namespace
+
+TEST(CaptureReader, TellsAFileOfRecordsByContent)
+{
+    auto reader = openedBytes(records({0xB17F, 0xB180}));
+    EXPECT_FALSE(reader.linkType());
+    EXPECT_EQ(countMessages(reader), 2U);
+}
+
+TEST(CaptureReader, TellsASerialStreamByContent)
+{
+    auto reader =
+        openedBytes(joined({{5, 6, endMark}, logFrame(logRecord(0xB17F, stampIn2025(), {1}))}));
+    EXPECT_EQ(countMessages(reader), 1U);
+    EXPECT_THAT(reader.notes(), testing::SizeIs(1)); // what stands in front of the frame
+}
+
+TEST(CaptureReader, GuessesTheTechnologyThatDecodesMostOfTheRecords)
+{
+    EXPECT_EQ(guessedTechnology({0xB17F}), "lte");
+    EXPECT_EQ(guessedTechnology({0x4127, 0x7135, 0x5134, 0xB17F}), "gsm");
+    EXPECT_EQ(guessedTechnology({0xD00A, 0xD0E0, 0xB17F}), "utran");
+    EXPECT_EQ(guessedTechnology({0x108A, 0x1183}), "c2k");
+}
+
+// 0xB0C3 is no record of ours, and the version report is nobody's.
+TEST(CaptureReader, GuessesNothingFromRecordsThatNobodyDecodes)
+{
+    EXPECT_EQ(guessedTechnology({0xB0C3, 0x1FFD}), "none");
+}
+
+TEST(CaptureReader, AGuessTakesNoMessage)
+{
+    auto reader = openedBytes(records({0xB17F, 0xB180, 0xB0C2}));
+    reader.guessTechnology();
+    const auto first = reader.next();
+    ASSERT_TRUE(first);
+    EXPECT_EQ(first->data[3], 0x7F);
+    EXPECT_EQ(countMessages(reader), 2U);
+}
+
+TEST(CaptureReader, OnlyTheFirstThousandRecordsCountForAGuess)
+{
+    Bytes bytes = records({0xB17F});
+    const Bytes other = records({0x4127});
+    const Bytes nobodys = records({0xB0C3});
+    for (int i = 0; i < 999; ++i)
+        bytes.insert(bytes.end(), nobodys.begin(), nobodys.end());
+    for (int i = 0; i < 5; ++i)
+        bytes.insert(bytes.end(), other.begin(), other.end());
+    auto reader = openedBytes(bytes);
+    EXPECT_EQ(reader.guessTechnology()->name, "lte");
 }
 
 } // namespace ventrik

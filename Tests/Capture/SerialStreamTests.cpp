@@ -1,5 +1,6 @@
 #include "Capture/SerialStream.h"
 #include "Tests/Capture/ContainerReading.h"
+#include "Tests/Capture/SerialFrames.h"
 
 namespace ventrik
 {
@@ -10,44 +11,10 @@ namespace
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-constexpr std::uint8_t endMark = 0x7E;
-
-Bytes escaped(const Bytes& bytes)
-{
-    Bytes result;
-    for (const std::uint8_t byte : bytes) {
-        if (byte == 0x7E || byte == 0x7D)
-            result.push_back(0x7D);
-        result.push_back(byte == 0x7E || byte == 0x7D ? byte ^ 0x20 : byte);
-    }
-    return result;
-}
-
-Bytes frame(const Bytes& content)
-{
-    const Bytes whole = ByteRow().bytes(content).number(2, frameChecksum(content));
-    return ByteRow().bytes(escaped(whole)).number(1, endMark);
-}
-
 Bytes badFrame(const Bytes& content)
 {
     const Bytes whole = ByteRow().bytes(content).number(2, frameChecksum(content) ^ 1);
     return ByteRow().bytes(escaped(whole)).number(1, endMark);
-}
-
-Bytes logContent(const Bytes& record)
-{
-    return ByteRow().number(2, 0x10).number(2, record.size()).bytes(record);
-}
-
-Bytes logFrame(const Bytes& record)
-{
-    return frame(logContent(record));
-}
-
-Bytes wrapped(std::uint32_t subscription, const Bytes& content)
-{
-    return ByteRow().number(4, 0x98).number(4, subscription).bytes(content);
 }
 
 Bytes packetOf(const Bytes& record)

@@ -78,9 +78,9 @@ TEST(DlfFile, SkipsVersionReports)
 
 TEST(DlfFile, TakesAVersionReportForARecordWhateverItsTime)
 {
-    const auto reading = read(joined({first, versionReport, Bytes(40, 0xEE)}));
+    const auto reading = read(joined({first, third, versionReport, Bytes(40, 0xEE)}));
     EXPECT_THAT(reading.notes, ElementsAre("x: 40 bytes that are no record, in 1 place" +
-                                           at(first.size() + versionReport.size())));
+                                           at(first.size() + third.size() + versionReport.size())));
 }
 
 TEST(DlfFile, HoldsNothingWithAVersionReportAlone)
@@ -119,9 +119,10 @@ TEST(DlfFile, TellsATypeByteFromALengthByWhatFollows)
 {
     const Bytes early = logRecord(0xB193, 5, Bytes(300, 0));
     const Bytes next = logRecord(0xB193, 7, {3, 4});
-    const auto reading = read(joined({early, packetOf(early), packetOf(next), packetOf(early)}));
-    EXPECT_THAT(reading.packets(),
-                ElementsAre(packetOf(early), packetOf(early), packetOf(next), packetOf(early)));
+    const auto reading =
+        read(joined({early, packetOf(early, 255), packetOf(next, 255), packetOf(early)}));
+    EXPECT_THAT(reading.packets(), ElementsAre(packetOf(early), packetOf(early, 255),
+                                               packetOf(next, 255), packetOf(early)));
 }
 
 TEST(DlfFile, ReadsAPropertyListThatIsLongerThanItsLengthSays)

@@ -56,7 +56,7 @@ std::optional<HdlcFrame> HdlcFrames::next()
 bool HdlcFrames::readToEndMark()
 {
     while (true) {
-        const ByteView block = _source.peek(blockSize);
+        const ByteView block = _source.peekSome(blockSize);
         const auto end =
             static_cast<std::size_t>(std::ranges::find(block, endMark) - block.begin());
         append(block.first(end));

@@ -270,7 +270,9 @@ std::optional<std::uint8_t> versionOf(const Record& record, const LogPacket& pac
 
 std::span<const Layout> layoutsOf(std::uint32_t logCode)
 {
-    return std::ranges::equal_range(layouts, logCode, {}, codeOf);
+    const auto first = std::ranges::lower_bound(layouts, logCode, {}, codeOf);
+    const auto last = std::ranges::upper_bound(layouts, logCode, {}, codeOf);
+    return {first, last};
 }
 
 ChosenLayout chooseLayout(const Record& base, std::span<const Layout> layouts,

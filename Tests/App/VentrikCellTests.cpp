@@ -49,7 +49,7 @@ double luminance(const QColor& color)
 
 double contrastBetween(const QColor& one, const QColor& other)
 {
-    const auto [less, more] = std::minmax(luminance(one), luminance(other));
+    const auto [less, more] = std::minmax({luminance(one), luminance(other)});
     return (more + 0.05) / (less + 0.05);
 }
 

@@ -19,7 +19,8 @@ struct DecodeOptions {
     std::optional<Technology> technology;
     DecodeFormat format = DecodeFormat::Text;
     RecordsMode records = RecordsMode::Newer;
-    /// Of captures that tell the subscriptions of their messages: those of another one are left out.
+    /// Of captures that tell the subscriptions of their messages: those of another one are left
+    /// out.
     std::optional<std::uint32_t> subscription;
     std::optional<std::string> systemLogFile;
     std::optional<std::string> snapshotFile;

@@ -279,9 +279,8 @@ TEST_F(LTERecordsModeTest, TellsTheLayoutsOfAllSectionsOnce)
     const auto newer = generator(RecordsMode::Newer);
     newer->updateState(state, cellInfo().build());
     newer->updateState(state, PacketBuilder(0xB180).size(60).u8(13, 7).build());
-    EXPECT_THAT(newer->layouts(),
-                ElementsAre(ReadLayout{0xB0C2, 3, 42, LayoutKind::Newer},
-                            ReadLayout{0xB180, 7, 60, LayoutKind::NotKnown}));
+    EXPECT_THAT(newer->layouts(), ElementsAre(ReadLayout{0xB0C2, 3, 42, LayoutKind::Newer},
+                                              ReadLayout{0xB180, 7, 60, LayoutKind::NotKnown}));
 }
 
 // A warning goes when a record comes whose layout is known.

@@ -20,13 +20,13 @@ class WindowRecords : public ProcessFixture
         writeFile("home/config/org.ventrik.Ventrik.conf",
                   "[General]\nRecords=" + std::string(records) + "\n");
     }
-    /// Starts it, waits until it shows something, and ends it.
+    /// Starts it, waits until it decodes a record, when all sections have been named, and ends it.
     bool readsExtendedRecords(Arguments options = {})
     {
         const auto service = startService({"--technology", "lte"});
         options.emplace_back("--verbose");
         const auto window = start("ventrik", options);
-        EXPECT_TRUE(waitUntil([&] { return window->says("Serving Cell Info\n"); }))
+        EXPECT_TRUE(waitUntil([&] { return window->says("LTE Serving Cell Info\n"); }))
             << window->errors();
         const bool isExtended = window->says("Last RRC Message\n");
         window->send(SIGTERM);

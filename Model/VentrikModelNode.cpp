@@ -1,6 +1,7 @@
 #include "Model/VentrikModelNode.h"
 
 #include "LogGenerator/Orbel/ArrayLock.h"
+#include "Model/DisplayNames.h"
 
 #include <algorithm>
 #include <optional>
@@ -12,18 +13,6 @@ namespace ventrik
 
 namespace
 {
-
-constexpr std::string_view sortedMarker = "_sorted";
-constexpr std::string_view notText = "(unknown)";
-
-// In sorted mode a key of the form order;label shows as its label.
-std::string_view labelOfSortedKey(std::string_view key)
-{
-    const auto separator = key.find(';');
-    if (separator == std::string_view::npos || key.find(';', separator + 1) != key.npos)
-        return key;
-    return key.substr(separator + 1);
-}
 
 class TreeBuilder
 {
@@ -107,6 +96,14 @@ class TreeBuilder
 };
 
 } // namespace
+
+std::string_view labelOfSortedKey(std::string_view key)
+{
+    const auto separator = key.find(';');
+    if (separator == std::string_view::npos || key.find(';', separator + 1) != key.npos)
+        return key;
+    return key.substr(separator + 1);
+}
 
 ModelNodePointer VentrikModelNode::makeTreeFromObject(const PlistValue* object, PathIndex& index)
 {

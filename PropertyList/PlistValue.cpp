@@ -39,75 +39,93 @@ std::string PlistInteger::decimal() const
     return _negative ? fmt::format_int(signedBits()).str() : fmt::format_int(_bits).str();
 }
 
-PlistArray::PlistArray() : _values(std::make_shared<Storage>()) {}
+struct PlistArray::Storage {
+    std::vector<PlistValue> values;
+    ContainerWatch watch;
+};
 
-PlistArray::PlistArray(std::initializer_list<PlistValue> values)
-    : _values(std::make_shared<Storage>(values))
+PlistArray::PlistArray() : _storage(std::make_shared<Storage>()) {}
+
+PlistArray::PlistArray(std::initializer_list<PlistValue> values) : PlistArray()
 {
+    _storage->values = values;
 }
 
 std::size_t PlistArray::size() const
 {
-    return _values->size();
+    return _storage->values.size();
 }
 
 const PlistValue& PlistArray::operator[](std::size_t index) const
 {
-    return _values->at(index);
+    return _storage->values.at(index);
 }
 
 const PlistValue* PlistArray::begin() const
 {
-    return _values->data();
+    return _storage->values.data();
 }
 
 const PlistValue* PlistArray::end() const
 {
-    return _values->data() + _values->size();
+    return begin() + size();
 }
 
 void PlistArray::append(PlistValue value)
 {
-    if (_values->capacity() == 0)
-        _values->reserve(firstCapacity);
-    _values->push_back(std::move(value));
+    std::vector<PlistValue>& values = _storage->values;
+    if (values.capacity() == 0)
+        values.reserve(firstCapacity);
+    values.push_back(std::move(value));
+    _storage->watch.note();
 }
 
 void PlistArray::removeFirst(std::size_t count)
 {
-    const auto first = _values->begin();
-    _values->erase(first, first + static_cast<std::ptrdiff_t>(std::min(count, size())));
+    const auto first = _storage->values.begin();
+    _storage->values.erase(first, first + static_cast<std::ptrdiff_t>(std::min(count, size())));
+    _storage->watch.note();
 }
 
 void PlistArray::replace(std::size_t index, PlistValue value)
 {
-    _values->at(index) = std::move(value);
+    _storage->values.at(index) = std::move(value);
+    _storage->watch.note(index);
 }
 
 void PlistArray::truncate(std::size_t count)
 {
-    if (count < size())
-        _values->erase(_values->begin() + static_cast<std::ptrdiff_t>(count), _values->end());
+    if (count >= size())
+        return;
+    const auto first = _storage->values.begin();
+    _storage->values.erase(first + static_cast<std::ptrdiff_t>(count), _storage->values.end());
+    _storage->watch.note();
 }
 
 void PlistArray::clear()
 {
-    _values->clear();
+    _storage->values.clear();
+    _storage->watch.note();
 }
 
 void PlistArray::reserve(std::size_t count)
 {
-    _values->reserve(count);
+    _storage->values.reserve(count);
 }
 
 PlistArray PlistArray::copy() const
 {
-    return PlistArray(std::make_shared<Storage>(*_values));
+    return PlistArray(std::make_shared<Storage>(*_storage));
 }
 
 bool PlistArray::operator==(const PlistArray& other) const
 {
-    return isSameContainer(other) || *_values == *other._values;
+    return isSameContainer(other) || _storage->values == other._storage->values;
+}
+
+ContainerWatch& PlistArray::watch()
+{
+    return _storage->watch;
 }
 
 struct PlistDictionary::Storage {
@@ -115,6 +133,7 @@ struct PlistDictionary::Storage {
     // Key to place in `entries`; kept only once there are more than `linearSearchLimit` of them.
     std::unordered_map<std::string, std::size_t, KeyHash, std::equal_to<>> places;
     std::size_t removals = 0;
+    ContainerWatch watch;
 
     std::optional<std::size_t> place(std::string_view key) const
     {
@@ -126,6 +145,12 @@ struct PlistDictionary::Storage {
             if (isSame(entries[i].key, key))
                 return i;
         return std::nullopt;
+    }
+
+    void noteRemoval()
+    {
+        ++removals;
+        watch.note();
     }
 
     void rebuildPlaces()
@@ -162,7 +187,10 @@ const PlistValue* PlistDictionary::find(std::string_view key) const
 PlistValue* PlistDictionary::find(std::string_view key)
 {
     const auto place = _storage->place(key);
-    return place ? &_storage->entries[*place].value : nullptr;
+    if (!place)
+        return nullptr;
+    _storage->watch.note(*place);
+    return &_storage->entries[*place].value;
 }
 
 std::optional<std::size_t> PlistDictionary::placeOf(std::string_view key) const
@@ -177,7 +205,10 @@ std::size_t PlistDictionary::removalCount() const
 
 PlistDictionary::Entry* PlistDictionary::entryAt(std::size_t place)
 {
-    return place < size() ? &_storage->entries[place] : nullptr;
+    if (place >= size())
+        return nullptr;
+    _storage->watch.note(place);
+    return &_storage->entries[place];
 }
 
 const PlistDictionary::Entry* PlistDictionary::entryAt(std::size_t place) const
@@ -195,6 +226,7 @@ void PlistDictionary::set(std::string_view key, PlistValue value)
     auto& places = _storage->places;
     if (entries.capacity() == 0)
         entries.reserve(firstCapacity);
+    _storage->watch.note();
     entries.push_back({std::string(key), std::move(value)});
     if (!places.empty())
         places.emplace(key, entries.size() - 1);
@@ -208,7 +240,7 @@ bool PlistDictionary::remove(std::string_view key)
     if (!place)
         return false;
     _storage->entries.erase(_storage->entries.begin() + static_cast<std::ptrdiff_t>(*place));
-    ++_storage->removals;
+    _storage->noteRemoval();
     _storage->rebuildPlaces();
     return true;
 }
@@ -219,7 +251,7 @@ void PlistDictionary::truncate(std::size_t count)
         return;
     auto& entries = _storage->entries;
     entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(count), entries.end());
-    ++_storage->removals;
+    _storage->noteRemoval();
     _storage->rebuildPlaces();
 }
 
@@ -227,7 +259,7 @@ void PlistDictionary::clear()
 {
     _storage->entries.clear();
     _storage->places.clear();
-    ++_storage->removals;
+    _storage->noteRemoval();
 }
 
 void PlistDictionary::reserve(std::size_t count)
@@ -255,6 +287,11 @@ PlistDictionary PlistDictionary::copy() const
 std::size_t PlistDictionary::handleCount() const
 {
     return static_cast<std::size_t>(_storage.use_count());
+}
+
+ContainerWatch& PlistDictionary::watch()
+{
+    return _storage->watch;
 }
 
 bool PlistDictionary::operator==(const PlistDictionary& other) const
@@ -303,7 +340,7 @@ bool PlistValue::operator==(const PlistValue& other) const
 WeakContainer::WeakContainer(const PlistValue& value)
 {
     if (const PlistArray* values = value.array())
-        _array = values->_values;
+        _array = values->_storage;
     else if (const PlistDictionary* entries = value.dictionary())
         _dictionary = entries->_storage;
 }
@@ -327,7 +364,7 @@ bool WeakContainer::refersTo(const PlistValue& container) const
         return !weak.owner_before(owner) && !owner.owner_before(weak);
     };
     if (const PlistArray* values = container.array())
-        return isSame(_array, values->_values);
+        return isSame(_array, values->_storage);
     const PlistDictionary* entries = container.dictionary();
     return entries && isSame(_dictionary, entries->_storage);
 }

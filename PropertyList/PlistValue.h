@@ -1,6 +1,7 @@
 #pragma once
 
 #include "PropertyList/Bytes.h"
+#include "PropertyList/ChangeLog.h"
 
 #include <concepts>
 #include <cstddef>
@@ -74,16 +75,19 @@ class PlistArray
     /// A new array of the same elements; nested containers stay shared.
     PlistArray copy() const;
     /// How many handles share the container, this one included.
-    std::size_t handleCount() const { return static_cast<std::size_t>(_values.use_count()); }
-    bool isSameContainer(const PlistArray& other) const { return _values == other._values; }
+    std::size_t handleCount() const { return static_cast<std::size_t>(_storage.use_count()); }
+    bool isSameContainer(const PlistArray& other) const { return _storage == other._storage; }
     bool operator==(const PlistArray& other) const;
+
+    /// What tells whoever watches the container that it changes. Copies have their own.
+    ContainerWatch& watch();
 
   private:
     friend class WeakContainer;
-    using Storage = std::vector<PlistValue>;
-    explicit PlistArray(std::shared_ptr<Storage> values) : _values(std::move(values)) {}
+    struct Storage;
+    explicit PlistArray(std::shared_ptr<Storage> storage) : _storage(std::move(storage)) {}
 
-    std::shared_ptr<Storage> _values;
+    std::shared_ptr<Storage> _storage;
 };
 
 /// Values under string keys, in the order in which the keys were first set. A handle: copies share
@@ -133,6 +137,10 @@ class PlistDictionary
     bool isSameContainer(const PlistDictionary& other) const { return _storage == other._storage; }
     /// Equal keys with equal values, in any order.
     bool operator==(const PlistDictionary& other) const;
+
+    /// What tells whoever watches the container that it changes, or is about to: whoever gets at a
+    /// value that can be written is taken to write it. Copies have their own.
+    ContainerWatch& watch();
 
   private:
     friend class WeakContainer;

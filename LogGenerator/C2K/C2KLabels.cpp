@@ -152,10 +152,22 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
 std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
                                                std::string_view label) const
 {
+    const auto slot = slotAt(group, label);
+    return slot ? _memory.originOf(*slot) : std::nullopt;
+}
+
+std::optional<ShownCell> C2KLabels::cellOf(std::size_t slot) const
+{
+    return slot < _labels.size() ? _memory.cellOf(slot) : std::nullopt;
+}
+
+std::optional<std::size_t> C2KLabels::slotAt(const PlistDictionary& group,
+                                             std::string_view label) const
+{
     for (std::size_t slot = 0; slot < _labels.size(); ++slot)
         for (const Target& target : _labels[slot].targets)
-            if (target.label == label && target.group.isSameContainer(group))
-                return _memory.originOf(slot);
+            if (target.group.isSameContainer(group) && target.label == label)
+                return slot;
     return std::nullopt;
 }
 

@@ -51,6 +51,10 @@ class C2KLabels
 
     /// Where the value under a label of a group comes from; none where no field shows there.
     std::optional<ValueOrigin> originOf(const PlistDictionary& group, std::string_view label) const;
+    /// Which slot shows under a label of a group; none so far where none does.
+    std::optional<std::size_t> slotAt(const PlistDictionary& group, std::string_view label) const;
+    /// None where no field shows.
+    std::optional<ShownCell> cellOf(std::size_t slot) const;
 
   private:
     struct Target {

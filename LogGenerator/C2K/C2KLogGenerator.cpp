@@ -51,6 +51,15 @@ bool hasItsSize(const LogPacket& packet, const Decoder& decoder, SystemLog& log)
     return false;
 }
 
+// The group of the display that holds what stands at the path, or null.
+const PlistDictionary* groupOf(const PlistDictionary& state, std::span<const std::string_view> path)
+{
+    const PlistValue* group = path.empty() ? nullptr : state.find(StateKey::display);
+    for (std::size_t i = 0; group && i + 1 < path.size(); ++i)
+        group = group->dictionary() ? group->dictionary()->find(path[i]) : nullptr;
+    return group ? group->dictionary() : nullptr;
+}
+
 } // namespace
 
 std::unique_ptr<C2KLogGenerator> C2KLogGenerator::generator(const GeneratorServices& services)
@@ -108,13 +117,21 @@ std::optional<PlistValue> C2KLogGenerator::generateLogUsingState(PlistDictionary
 std::optional<ValueOrigin> C2KLogGenerator::originOf(const PlistDictionary& state,
                                                      std::span<const std::string_view> path) const
 {
-    const PlistValue* group = state.find(StateKey::display);
-    if (path.empty())
-        return std::nullopt;
-    for (const std::string_view key : path.first(path.size() - 1))
-        group = group && group->dictionary() ? group->dictionary()->find(key) : nullptr;
-    return group && group->dictionary() ? _labels.originOf(*group->dictionary(), path.back())
-                                        : std::nullopt;
+    const PlistDictionary* group = groupOf(state, path);
+    return group ? _labels.originOf(*group, path.back()) : std::nullopt;
+}
+
+std::optional<CellPlace> C2KLogGenerator::cellPlaceAt(const PlistDictionary& state,
+                                                      std::span<const std::string_view> path) const
+{
+    const PlistDictionary* group = groupOf(state, path);
+    const auto slot = group ? _labels.slotAt(*group, path.back()) : std::nullopt;
+    return slot ? std::optional(CellPlace{.key = path.back(), .slot = *slot}) : std::nullopt;
+}
+
+std::optional<ShownCell> C2KLogGenerator::cellAt(CellPlace& place) const
+{
+    return _labels.cellOf(place.slot);
 }
 
 std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& state)

@@ -23,6 +23,9 @@ class C2KLogGenerator : public OrbelLogGenerator
 
     std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                         std::span<const std::string_view> path) const override;
+    std::optional<CellPlace> cellPlaceAt(const PlistDictionary& state,
+                                         std::span<const std::string_view> path) const override;
+    std::optional<ShownCell> cellAt(CellPlace& place) const override;
 
     /// Fills the display with the template's groups and empty values, and the lookup with an array
     /// of entries for each lookup key: the label, and the group of the display that holds it.

@@ -46,6 +46,23 @@ std::optional<ValueOrigin> LogGenerator::originOf(const PlistDictionary&,
     return std::nullopt;
 }
 
+std::optional<CellPlace> LogGenerator::cellPlaceAt(const PlistDictionary&,
+                                                   std::span<const std::string_view>) const
+{
+    return std::nullopt;
+}
+
+std::optional<ShownCell> LogGenerator::cellAt(CellPlace&) const
+{
+    return std::nullopt;
+}
+
+std::string_view LogGenerator::sectionAt(const PlistDictionary&,
+                                         std::span<const std::string_view>) const
+{
+    return {};
+}
+
 std::vector<ReadLayout> LogGenerator::layoutsAt(const PlistDictionary&,
                                                 std::span<const std::string_view>) const
 {

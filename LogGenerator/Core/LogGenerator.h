@@ -46,6 +46,16 @@ class LogGenerator
     virtual std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                                 std::span<const std::string_view> path) const;
 
+    /// Where to look for what the value at such a path shows; none where it is no field's, so far.
+    virtual std::optional<CellPlace> cellPlaceAt(const PlistDictionary& state,
+                                                 std::span<const std::string_view> path) const;
+    /// What shows there; none where no field does.
+    virtual std::optional<ShownCell> cellAt(CellPlace& place) const;
+
+    /// The name of the section that shows what stands at that path; empty outside of sections.
+    virtual std::string_view sectionAt(const PlistDictionary& state,
+                                       std::span<const std::string_view> path) const;
+
     /// How the records were read, the last one of each log code, that the section shows which
     /// stands at that path or holds it; empty outside of sections.
     virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,

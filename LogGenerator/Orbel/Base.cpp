@@ -153,6 +153,14 @@ std::optional<ValueOrigin> Base::originOf(std::string_view listKey, std::size_t 
     return rows ? withVersion(rows->originOf(row, key)) : std::nullopt;
 }
 
+std::optional<ShownCell> Base::cellAt(CellPlace& place) const
+{
+    if (!place.row)
+        return _fields.cellOf(place.key, place.slot);
+    const RowList* rows = rowsUnder(place.list);
+    return rows ? rows->cellOf(*place.row, place.key) : std::nullopt;
+}
+
 std::vector<ReadLayout> Base::layouts() const
 {
     std::vector<ReadLayout> layouts;

@@ -74,6 +74,9 @@ class Base
     std::optional<ValueOrigin> originOf(std::string_view listKey, std::size_t row,
                                         std::string_view key) const;
 
+    /// What the value there shows; none where no field does.
+    std::optional<ShownCell> cellAt(CellPlace& place) const;
+
     /// How the records were read that the section shows, the last one of each code.
     std::vector<ReadLayout> layouts() const;
 

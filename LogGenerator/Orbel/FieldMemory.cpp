@@ -1,6 +1,7 @@
 #include "LogGenerator/Orbel/FieldMemory.h"
 
 #include <algorithm>
+#include <bit>
 #include <functional>
 
 namespace ventrik
@@ -60,9 +61,36 @@ std::optional<ValueOrigin> FieldMemory::originOf(std::size_t slot) const
 
 std::optional<ValueOrigin> FieldMemory::originOf(std::string_view key) const
 {
+    const auto slot = knownSlotOf(key);
+    return slot ? originOf(*slot) : std::nullopt;
+}
+
+std::optional<ShownCell> FieldMemory::cellOf(std::size_t slot) const
+{
+    const Slot& known = _slots[slot];
+    if (!known.field)
+        return std::nullopt;
+    const auto workedOut =
+        known.isWorkedOut ? std::optional(std::bit_cast<double>(known.raw)) : std::nullopt;
+    return ShownCell{known.field, known.raw, workedOut};
+}
+
+std::optional<ShownCell> FieldMemory::cellOf(std::string_view key, std::size_t& slot) const
+{
+    if (slot >= _slots.size() || _slots[slot].key != key) {
+        const auto known = knownSlotOf(key);
+        if (!known)
+            return std::nullopt;
+        slot = *known;
+    }
+    return cellOf(slot);
+}
+
+std::optional<std::size_t> FieldMemory::knownSlotOf(std::string_view key) const
+{
     const auto slot = std::ranges::find(_slots, key, &Slot::key);
     return slot == _slots.end() ? std::nullopt
-                                : originOf(static_cast<std::size_t>(slot - _slots.begin()));
+                                : std::optional(static_cast<std::size_t>(slot - _slots.begin()));
 }
 
 } // namespace ventrik

@@ -37,7 +37,14 @@ class FieldMemory
     /// None for a key that no field shows. The version is for the caller to fill in.
     std::optional<ValueOrigin> originOf(std::string_view key) const;
 
+    /// None for a key that no field shows.
+    std::optional<ShownCell> cellOf(std::size_t slot) const;
+    /// The slot is where to look first.
+    std::optional<ShownCell> cellOf(std::string_view key, std::size_t& slot) const;
+
   private:
+    std::optional<std::size_t> knownSlotOf(std::string_view key) const;
+
     struct Slot {
         std::string_view key;
         const Field* asked = nullptr; // the field that the slot was last asked for

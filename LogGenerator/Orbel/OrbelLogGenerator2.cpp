@@ -114,8 +114,9 @@ const PlistValue* OrbelLogGenerator2::ensureDisplay(PlistDictionary& state)
     return nullptr;
 }
 
-std::optional<ValueOrigin>
-OrbelLogGenerator2::originOf(const PlistDictionary&, std::span<const std::string_view> path) const
+std::optional<CellPlace>
+OrbelLogGenerator2::cellPlaceAt(const PlistDictionary&,
+                                std::span<const std::string_view> path) const
 {
     for (std::size_t i = 0; cIndex && i + 1 < path.size(); ++i) {
         const Base* section = cIndex->getClass(path[i]);
@@ -124,14 +125,40 @@ OrbelLogGenerator2::originOf(const PlistDictionary&, std::span<const std::string
         const auto rest = path.subspan(i + 1);
         // A value; a value of one of the section's rows; one of a row under a key.
         if (rest.size() == 1)
-            return section->originOf(rest[0]);
+            return CellPlace{.section = section, .key = rest[0]};
         const auto row = rowNumber(rest[rest.size() - 2]);
         if (rest.size() > 3 || !row)
             return std::nullopt;
-        return section->originOf(rest.size() == 3 ? rest[0] : std::string_view(), *row,
-                                 rest.back());
+        return CellPlace{section, rest.size() == 3 ? rest[0] : std::string_view(), row,
+                         rest.back()};
     }
     return std::nullopt;
+}
+
+std::optional<ShownCell> OrbelLogGenerator2::cellAt(CellPlace& place) const
+{
+    return static_cast<const Base*>(place.section)->cellAt(place);
+}
+
+std::optional<ValueOrigin>
+OrbelLogGenerator2::originOf(const PlistDictionary& state,
+                             std::span<const std::string_view> path) const
+{
+    const auto place = cellPlaceAt(state, path);
+    if (!place)
+        return std::nullopt;
+    const Base& section = *static_cast<const Base*>(place->section);
+    return place->row ? section.originOf(place->list, *place->row, place->key)
+                      : section.originOf(place->key);
+}
+
+std::string_view OrbelLogGenerator2::sectionAt(const PlistDictionary&,
+                                               std::span<const std::string_view> path) const
+{
+    for (const std::string_view name : path)
+        if (const Base* section = cIndex ? cIndex->getClass(name) : nullptr)
+            return section->getSectionName();
+    return {};
 }
 
 std::vector<ReadLayout> OrbelLogGenerator2::layoutsAt(const PlistDictionary&,

@@ -26,6 +26,11 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
 
     std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                         std::span<const std::string_view> path) const override;
+    std::optional<CellPlace> cellPlaceAt(const PlistDictionary& state,
+                                         std::span<const std::string_view> path) const override;
+    std::optional<ShownCell> cellAt(CellPlace& place) const override;
+    std::string_view sectionAt(const PlistDictionary& state,
+                               std::span<const std::string_view> path) const override;
 
     std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                       std::span<const std::string_view> path) const override;

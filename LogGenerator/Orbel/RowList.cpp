@@ -31,6 +31,18 @@ std::optional<ValueOrigin> RowList::originOf(std::size_t row, std::string_view k
     return std::nullopt;
 }
 
+std::optional<ShownCell> RowList::cellOf(std::size_t row, std::string_view key) const
+{
+    if (row >= _rows.size())
+        return std::nullopt;
+    for (const Cell& cell : _rows[row].cells)
+        if (cell.field && cell.field->key == key)
+            return ShownCell{cell.field, cell.raw,
+                             cell.isWorkedOut ? std::optional(static_cast<double>(cell.raw))
+                                              : std::nullopt};
+    return std::nullopt;
+}
+
 const FieldBytes& RowList::tableOf(std::span<const Field> fields)
 {
     for (const FieldBytes& table : _tables)

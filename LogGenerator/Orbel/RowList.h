@@ -33,6 +33,8 @@ class RowList
 
     /// None for a key that the row does not show. The version is for the caller to fill in.
     std::optional<ValueOrigin> originOf(std::size_t row, std::string_view key) const;
+    /// None for a key that no field of the row shows.
+    std::optional<ShownCell> cellOf(std::size_t row, std::string_view key) const;
 
   private:
     struct Cell {

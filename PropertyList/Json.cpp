@@ -1,4 +1,4 @@
-#include "Tools/Json.h"
+#include "PropertyList/Json.h"
 
 #include "PropertyList/Base64.h"
 #include "PropertyList/CharacterRun.h"
@@ -45,20 +45,6 @@ void appendEscape(std::string& text, char character)
     }
 }
 
-void appendString(std::string& text, std::string_view string)
-{
-    text += '"';
-    for (;;) {
-        const std::size_t plain = endOfRun<standsAsItIs>(string, 0);
-        text += string.substr(0, plain);
-        if (plain == string.size())
-            break;
-        appendEscape(text, string[plain]);
-        string.remove_prefix(plain + 1);
-    }
-    text += '"';
-}
-
 void appendReal(std::string& text, double real)
 {
     if (std::isfinite(real))
@@ -90,7 +76,7 @@ void appendDictionary(std::string& text, const PlistDictionary& dictionary)
     for (const auto& entry : dictionary) {
         if (&entry != dictionary.begin())
             text += separator;
-        appendString(text, entry.key);
+        appendJsonText(text, entry.key);
         text += ": "sv;
         appendJson(text, entry.value);
     }
@@ -103,7 +89,7 @@ void appendJson(std::string& text, const PlistValue& value)
 {
     switch (value.kind()) {
     case PlistValue::Kind::String:
-        return appendString(text, *value.string());
+        return appendJsonText(text, *value.string());
     case PlistValue::Kind::Integer:
         text += value.integer()->decimal();
         return;
@@ -122,6 +108,20 @@ void appendJson(std::string& text, const PlistValue& value)
     case PlistValue::Kind::Dictionary:
         return appendDictionary(text, *value.dictionary());
     }
+}
+
+void appendJsonText(std::string& json, std::string_view text)
+{
+    json += '"';
+    for (;;) {
+        const std::size_t plain = endOfRun<standsAsItIs>(text, 0);
+        json += text.substr(0, plain);
+        if (plain == text.size())
+            break;
+        appendEscape(json, text[plain]);
+        text.remove_prefix(plain + 1);
+    }
+    json += '"';
 }
 
 } // namespace ventrik

@@ -3,6 +3,7 @@
 #include "PropertyList/PlistValue.h"
 
 #include <string>
+#include <string_view>
 
 namespace ventrik
 {
@@ -12,5 +13,8 @@ namespace ventrik
 /// {"date": "2026-11-16T06:10:28Z"}. A real that is not finite, which JSON does not have, and a
 /// date outside the years 1 to 9999 become null.
 void appendJson(std::string& text, const PlistValue& value);
+
+/// Appends a text as a JSON string, in its quotes.
+void appendJsonText(std::string& json, std::string_view text);
 
 } // namespace ventrik

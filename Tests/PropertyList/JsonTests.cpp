@@ -1,4 +1,4 @@
-#include "Tools/Json.h"
+#include "PropertyList/Json.h"
 
 #include <gtest/gtest.h>
 

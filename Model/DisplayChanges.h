@@ -1,0 +1,141 @@
+#pragma once
+
+#include "LogGenerator/Core/LogGenerator.h"
+#include "PropertyList/ChangeLog.h"
+#include "PropertyList/PlistValue.h"
+
+#include <cstdint>
+#include <deque>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace ventrik
+{
+
+struct DisplayGroup;
+
+/// A place of the display: of a value, an element of a list or a group.
+struct DisplayPlace {
+    std::string key;  ///< in its dictionary; in a list the element's number
+    std::string text; ///< what shows; empty for what holds others
+    const DisplayGroup* holder;
+    bool isSorted; ///< shows as its holder's keys do that are in order
+    /// Places that go leave their number to later ones, which have another serial.
+    std::size_t number;
+    std::uint64_t serial;
+    mutable std::optional<CellPlace> cell = {}; ///< once it was looked for
+};
+
+/// The number that a text is which no field shows, as those of property lists; none where it is no
+/// plain one.
+std::optional<double> plainNumber(std::string_view text);
+
+/// What is to be said of a place.
+struct DisplayPlaceDescription {
+    std::string path;    ///< as the panes have it
+    std::string name;    ///< the last part of the path
+    std::string section; ///< outside of sections the group, where that is no element of a list
+    std::optional<std::size_t> index; ///< in the innermost list on the way
+};
+
+/// A change of the display.
+struct DisplayChange {
+    enum class Kind {
+        Shown, ///< a value that is new, or another one than before
+        Empty, ///< a group that came without values; one that loses them later just stays
+        Gone,  ///< a value, or an element or a group with all that it holds
+    };
+    Kind kind;
+    const DisplayPlace* place; ///< lives until the next changes are taken
+};
+
+/// A dictionary or a list of the display, as it was when it was last looked at.
+struct DisplayGroup {
+    struct Entry {
+        DisplayPlace* place;
+        DisplayGroup* group; ///< null for a value
+    };
+    WeakContainer container = {};
+    std::vector<Entry> entries = {};     ///< as they stand in the container
+    const DisplayPlace* place = nullptr; ///< null for the display itself
+    std::size_t token = 0;
+    bool isNew = false; ///< another container than before
+    bool isList = false;
+    bool isSorted = false;
+    bool hasDoubles = false; ///< several keys have one label
+    bool isUsed = false;
+};
+
+/// Follows what changes in a display, at a cost that goes with the changes: it watches the
+/// display's containers and compares only those that changed with what they showed before. All
+/// changes, put together, give the display.
+class DisplayChanges
+{
+  public:
+    /// The generator, which tells numbers and sections, outlives it.
+    explicit DisplayChanges(const LogGenerator& generator) : _generator(generator) {}
+
+    /// What has changed in the state's display since the last time; all of it the first time.
+    std::span<const DisplayChange> take(const PlistDictionary& state);
+
+    /// The places of all values, in the order of the display.
+    std::vector<const DisplayPlace*> values() const;
+
+    DisplayPlaceDescription describe(const DisplayPlace& place, const PlistDictionary& state) const;
+    /// What a value shows, before the next message is decoded; none where no field does.
+    std::optional<ShownCell> cellAt(const DisplayPlace& place, const PlistDictionary& state) const;
+
+  private:
+    void compare(DisplayGroup& group);
+    const PlistValue* displayIn(const PlistDictionary& state);
+    void prepareForChanges();
+    template <typename Container>
+    void compareWith(DisplayGroup& group, Container& container);
+    template <typename Container>
+    void compareValues(DisplayGroup& group, const Container& container,
+                       std::vector<std::size_t>& entries);
+    void compareAll(DisplayGroup& group, const PlistArray& array);
+    void compareAll(DisplayGroup& group, const PlistDictionary& dictionary);
+    void findDoubles(DisplayGroup& group) const;
+    void repeatDoubles(const DisplayGroup& group, std::size_t firstChange);
+    void repeat(const DisplayGroup::Entry& entry);
+    std::vector<bool> takeOverKeys(DisplayGroup& group, const PlistDictionary& dictionary);
+    void compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
+    void compareContainer(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
+    void follow(DisplayGroup& group, const PlistValue& container);
+    bool isFollowed(const DisplayGroup& group, const PlistValue& container) const;
+    DisplayGroup& newGroup(const DisplayPlace* place);
+    DisplayPlace& newPlace(const DisplayGroup& holder, std::string_view key);
+    void remove(const DisplayGroup::Entry& entry);
+    void release(const DisplayGroup::Entry& entry);
+    void release(DisplayGroup& group);
+    void add(DisplayChange::Kind kind, const DisplayPlace& place);
+    /// The way to a place, from the outside in; lives until it is asked for another one.
+    std::span<const std::string_view> keysOf(const DisplayPlace& place) const;
+
+    const LogGenerator& _generator;
+    std::shared_ptr<ChangeLog> _log = std::make_shared<ChangeLog>();
+    DisplayGroup* _root = nullptr;
+    std::vector<DisplayChange> _changes;
+
+    // Groups by their tokens, places by their numbers. What goes is free when the changes have been
+    // looked at.
+    std::deque<DisplayGroup> _groups;
+    std::deque<DisplayPlace> _places;
+    std::vector<std::size_t> _freeGroups;
+    std::vector<std::size_t> _goneGroups;
+    std::vector<std::size_t> _freePlaces;
+    std::vector<std::size_t> _gonePlaces;
+    std::uint64_t _lastSerial = 0;
+
+    mutable std::vector<std::string_view> _keys;
+    std::vector<std::size_t> _entries; // room for those that changed
+    std::vector<std::size_t> _tokens;  // likewise
+    std::size_t _displayPlace = 0;     // in the state, as far as is known
+};
+
+} // namespace ventrik

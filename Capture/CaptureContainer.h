@@ -32,6 +32,8 @@ class CaptureContainer
     /// Why the reading ended before the end, in one line that says where and what; empty when it
     /// did not.
     virtual std::string error() const { return {}; }
+    /// Of the damage in the file, uncompressed, where that is known.
+    virtual std::optional<std::uint64_t> errorOffset() const { return std::nullopt; }
     /// What was skipped so far.
     virtual std::vector<std::string> notes() const { return {}; }
     /// A pcap capture's link type, which names the technology.

@@ -32,6 +32,8 @@ class CaptureReader
     std::optional<CapturedMessage> next();
     /// What is wrong with the capture, in one line; empty when it ended as it should.
     std::string error() const { return _container->error(); }
+    /// Where that is, of the uncompressed file's bytes; none where it is not known.
+    std::optional<std::uint64_t> errorOffset() const { return _container->errorOffset(); }
     /// What was skipped, a line for each kind of damage.
     std::vector<std::string> notes() const { return _container->notes(); }
 

@@ -16,13 +16,19 @@ namespace
 // In the year 2255. What is later cannot be counted in nanoseconds for long.
 constexpr std::int64_t latestSecond = 9'000'000'000;
 
-// In either byte order: with microseconds, with nanoseconds; the newer form's first block.
+// Of the plain form.
+constexpr std::uint64_t headSize = 24;
+constexpr std::uint64_t messageHeadSize = 16;
+
+// The newer form's first block.
+constexpr std::array<std::uint8_t, 4> newerMagic{0x0A, 0x0D, 0x0D, 0x0A};
+// In either byte order: with microseconds, with nanoseconds.
 constexpr std::array<std::array<std::uint8_t, 4>, 5> magics{{
     {0xD4, 0xC3, 0xB2, 0xA1},
     {0xA1, 0xB2, 0xC3, 0xD4},
     {0x4D, 0x3C, 0xB2, 0xA1},
     {0xA1, 0xB2, 0x3C, 0x4D},
-    {0x0A, 0x0D, 0x0D, 0x0A},
+    newerMagic,
 }};
 
 // The library reads from a stream; ours takes its bytes from the source.
@@ -54,6 +60,8 @@ std::unique_ptr<PcapFile> PcapFile::open(std::unique_ptr<ByteSource> source, std
                                          std::string& error)
 {
     std::unique_ptr<PcapFile> file(new PcapFile(std::move(source), std::move(name)));
+    if (!std::ranges::equal(newerMagic, file->_source->peek(newerMagic.size())))
+        file->_offset = headSize;
     std::FILE* stream =
         fopencookie(file->_source.get(), "rb", {readFromSource, nullptr, nullptr, nullptr});
     std::array<char, PCAP_ERRBUF_SIZE> reason{};
@@ -98,6 +106,8 @@ std::optional<CapturedMessage> PcapFile::next()
         return std::nullopt;
     }
     ++_count;
+    if (_offset)
+        *_offset += messageHeadSize + header->caplen;
     // At nanosecond precision the library gives nanoseconds in the field for microseconds.
     const auto time =
         std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec);

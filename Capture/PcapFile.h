@@ -21,6 +21,8 @@ class PcapFile : public CaptureContainer
 
     std::optional<CapturedMessage> next() override;
     std::string error() const override { return _error; }
+    /// Of the message that cannot be read; only the plain form tells.
+    std::optional<std::uint64_t> errorOffset() const override { return _offset; }
     std::optional<int> linkType() const override;
 
   private:
@@ -38,6 +40,7 @@ class PcapFile : public CaptureContainer
     std::string _name;
     std::string _error;
     std::size_t _count = 0;
+    std::optional<std::uint64_t> _offset; // of the next message, where that is known
 };
 
 } // namespace ventrik

@@ -15,39 +15,46 @@ bool isRecord(const LogPacket& packet)
            (type == ordinaryPacketType || type == extraCodePacketType);
 }
 
+LogPacket packetOf(ByteView message)
+{
+    return LogPacket(message.size() < transportPrefixSize ? message : stripPrefix(message));
+}
+
 } // namespace
 
 void RecordCensus::take(ByteView message)
 {
-    const LogPacket packet(message.size() < transportPrefixSize ? message : stripPrefix(message));
-    if (!isRecord(packet)) {
+    const auto kind = recordKindOf(message, _mode);
+    if (!kind) {
         ++_brokenCount;
         return;
     }
-    const Kind kind = kindOf(packet);
-    auto counted = _kinds.find(kind);
+    auto counted = _kinds.find(*kind);
     if (counted == _kinds.end() && _kinds.size() >= maximumKinds) {
         ++_otherCount;
         return;
     }
     if (counted == _kinds.end()) {
-        const ByteView payload = packet.payload();
-        counted = _kinds.insert({kind, {0, Bytes(payload.begin(), payload.end())}}).first;
+        const ByteView payload = packetOf(message).payload();
+        counted = _kinds.insert({*kind, {0, Bytes(payload.begin(), payload.end())}}).first;
     }
     ++counted->second.count;
 }
 
-RecordCensus::Kind RecordCensus::kindOf(const LogPacket& packet) const
+std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode)
 {
+    const LogPacket packet = packetOf(message);
+    if (!isRecord(packet))
+        return std::nullopt;
     const std::uint32_t code = effectiveLogCode(packet);
-    Kind kind{code, std::nullopt, packet.size(), std::nullopt};
+    RecordKind kind{code, std::nullopt, packet.size(), std::nullopt};
     const Record* base = recordOf(code);
     if (!base)
         return kind;
-    const auto layouts = _mode == RecordsMode::Base ? std::span<const Layout>() : layoutsOf(code);
+    const auto layouts = mode == RecordsMode::Base ? std::span<const Layout>() : layoutsOf(code);
     const ChosenLayout chosen = chooseLayout(*base, layouts, packet);
     kind.version = versionOf(*chosen.record, packet);
-    if (!base->isExtension || _mode == RecordsMode::Extended)
+    if (!base->isExtension || mode == RecordsMode::Extended)
         kind.layout = chosen.kind;
     return kind;
 }

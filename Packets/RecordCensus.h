@@ -9,6 +9,21 @@
 namespace ventrik
 {
 
+/// Of which kind a record is.
+struct RecordKind {
+    std::uint32_t logCode; ///< effective
+    std::optional<std::uint8_t> version;
+    std::size_t size; ///< of the packet, its header included
+    /// None for a code that nobody decodes.
+    std::optional<LayoutKind> layout;
+
+    auto operator<=>(const RecordKind&) const = default;
+};
+
+/// None for what is too short to have a code, or of a type that no record has. The layouts are
+/// judged by the mode.
+std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode);
+
 /// Counts the records of messages, as they arrive, by log code, version, size and layout. Of kinds
 /// beyond a limit only the records are counted, so that no input makes it grow without end.
 class RecordCensus
@@ -19,15 +34,7 @@ class RecordCensus
 
     void take(ByteView message);
 
-    struct Kind {
-        std::uint32_t logCode; ///< effective
-        std::optional<std::uint8_t> version;
-        std::size_t size; ///< of the packet, its header included
-        /// None for a code that nobody decodes.
-        std::optional<LayoutKind> layout;
-
-        auto operator<=>(const Kind&) const = default;
-    };
+    using Kind = RecordKind;
     struct Counted {
         std::size_t count = 0;
         Bytes firstPayload;
@@ -42,8 +49,6 @@ class RecordCensus
     static constexpr std::size_t maximumKinds = 10000;
 
   private:
-    Kind kindOf(const LogPacket& packet) const;
-
     RecordsMode _mode;
     std::map<Kind, Counted> _kinds;
     std::size_t _otherCount = 0;

@@ -1,0 +1,281 @@
+#include "Capture/RowWriter.h"
+
+#include "PropertyList/Json.h"
+
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <cmath>
+#include <concepts>
+
+#include <fmt/chrono.h>
+#include <fmt/compile.h>
+#include <fmt/format.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr int schemaNumber = 1;
+
+struct Column {
+    std::string_view name;
+    std::string_view type;
+    std::string_view meaning;
+};
+
+constexpr std::array<Column, 15> valueColumns{{
+    {"capture", "text", "the capture, as it was named"},
+    {"record", "whole number", "its number in the capture, from 0"},
+    {"time", "text", "of the record: ISO 8601, UTC, with microseconds"},
+    {"subscription", "whole number or null", "of the phone's two, where the capture tells"},
+    {"technology", "text", "ifx, gsm, c2k, lte or utran"},
+    {"code", "text or null", "the record's log code, as 0xB17F; null where no record tells"},
+    {"version", "whole number or null", "of the record, where it has one"},
+    {"layout", "text or null", "by which the record was read: base, newer or not known"},
+    {"section", "text", "the part of the display that shows the value"},
+    {"path", "text", "of the value among the panes; with a / at its end that of an empty group"},
+    {"index", "whole number or null", "the place in the innermost list on the path, from 0"},
+    {"name", "text", "the value's name, the last part of the path"},
+    {"number", "number or null", "the value, where it is one; null in a row of what went away"},
+    {"unit", "text or null", "the number's"},
+    {"text", "text or null",
+     "the value as it shows; null where what is at the path went away, with all below it"},
+}};
+
+// Of the row that ends a capture, beside the first one of the others.
+constexpr std::array<Column, 7> closingColumns{{
+    {"status", "text", "ok, damaged (in part or at its end) or empty"},
+    {"offset", "whole number or null", "of the damage in the capture, where that is known"},
+    {"reason", "text or null", "what is wrong with it"},
+    {"records", "whole number", "in the capture"},
+    {"decoded", "whole number", "of them those that the technology's decoders ask for"},
+    {"rows", "whole number", "those of values"},
+    {"bytes", "whole number", "of the records"},
+}};
+
+void appendCsvText(std::string& row, std::string_view text)
+{
+    const bool isPlain = !text.empty() && text.find_first_of(",\"\r\n") == text.npos;
+    if (isPlain) {
+        row += text;
+        return;
+    }
+    row += '"';
+    for (const char character : text) {
+        if (character == '"')
+            row += '"';
+        row += character;
+    }
+    row += '"';
+}
+
+template <std::integral Number>
+void appendDigits(std::string& row, Number number)
+{
+    const fmt::format_int digits(number);
+    row.append(digits.data(), digits.size());
+}
+
+// So many digits as tell the number from all others.
+void appendDigits(std::string& row, double number)
+{
+    constexpr double largestWhole = 1e15;
+    const bool isWhole = std::abs(number) < largestWhole && std::trunc(number) == number;
+    if (isWhole)
+        appendDigits(row, static_cast<std::int64_t>(number));
+    else
+        fmt::format_to(std::back_inserter(row), FMT_COMPILE("{}"), number);
+}
+
+// So many kinds of records are kept, which few captures have.
+constexpr std::size_t kindPartCount = 256;
+
+std::size_t hashOf(const RecordKind& kind)
+{
+    return kind.logCode * 31U + kind.version.value_or(0) * 7U +
+           (kind.layout ? static_cast<std::size_t>(*kind.layout) : 3);
+}
+
+// Rows tell nothing of a record's size.
+bool areAlike(const std::optional<RecordKind>& a, const std::optional<RecordKind>& b)
+{
+    return a.has_value() == b.has_value() &&
+           (!a || (a->logCode == b->logCode && a->version == b->version && a->layout == b->layout));
+}
+
+// Beyond that many fields of nothing a row of values, or before them the closing one, begins.
+template <std::size_t size>
+std::string nothings(const std::array<Column, size>&)
+{
+    return std::string(size, ',');
+}
+
+} // namespace
+
+std::string rowSchema()
+{
+    std::string text = fmt::format("schema\t{}\n", schemaNumber);
+    for (const Column& column : valueColumns)
+        text += fmt::format("{}\t{}\t{}\n", column.name, column.type, column.meaning);
+    text += "\nThe row that ends a capture has \"capture\" and\n";
+    for (const Column& column : closingColumns)
+        text += fmt::format("{}\t{}\t{}\n", column.name, column.type, column.meaning);
+    return text;
+}
+
+std::string rowHeading(RowFormat format)
+{
+    if (format == RowFormat::JsonLines)
+        return {};
+    std::string heading;
+    for (const Column& column : valueColumns)
+        heading += fmt::format("{}{}", heading.empty() ? "" : ",", column.name);
+    for (const Column& column : closingColumns)
+        heading += fmt::format(",{}", column.name);
+    return heading + "\n";
+}
+
+RowWriter::RowWriter(RowFormat format, std::string_view capture, std::string_view technology)
+    : _format(format), _technology(technology), _csvEnd(nothings(closingColumns) + "\n")
+{
+    if (isJson()) {
+        _capture = "{\"capture\":";
+        appendJsonText(_capture, capture);
+    } else {
+        appendCsvText(_capture, capture);
+    }
+}
+
+void RowWriter::addName(std::string& row, std::string_view column) const
+{
+    row += ',';
+    if (!isJson())
+        return;
+    row += '"';
+    row += column;
+    row += "\":";
+}
+
+void RowWriter::addText(std::string& row, std::string_view column, std::string_view text) const
+{
+    addName(row, column);
+    if (isJson())
+        appendJsonText(row, text);
+    else
+        appendCsvText(row, text);
+}
+
+void RowWriter::addNull(std::string& row, std::string_view column) const
+{
+    addName(row, column);
+    if (isJson())
+        row += "null";
+}
+
+void RowWriter::addTextOrNull(std::string& row, std::string_view column,
+                              std::string_view text) const
+{
+    if (text.empty())
+        addNull(row, column);
+    else
+        addText(row, column, text);
+}
+
+template <typename Number>
+void RowWriter::addNumber(std::string& row, std::string_view column, const Number& number) const
+{
+    if (!number)
+        return addNull(row, column);
+    addName(row, column);
+    appendDigits(row, *number);
+}
+
+std::string_view RowWriter::recordPart(const RowRecord& record)
+{
+    const auto micros = std::chrono::floor<std::chrono::microseconds>(record.time);
+    const auto second = std::chrono::floor<std::chrono::seconds>(micros);
+    if (_secondPart.empty() || second != _second) {
+        _second = second;
+        _secondPart.clear();
+        addName(_secondPart, "time");
+        _secondPart += fmt::format(FMT_COMPILE("{}{:%FT%T}."), isJson() ? "\"" : "", second);
+    }
+    _recordPart = _capture;
+    _recordPart += isJson() ? ",\"record\":" : ",";
+    appendDigits(_recordPart, record.number);
+    _recordPart += _secondPart;
+    // Of seven digits the last six.
+    const fmt::format_int fraction(1000000U +
+                                   static_cast<std::uint32_t>((micros - second).count()));
+    _recordPart.append(fraction.data() + 1, fraction.size() - 1);
+    _recordPart += isJson() ? "Z\"" : "Z";
+    _recordPart += kindPart(record);
+    return _recordPart;
+}
+
+std::string_view RowWriter::kindPart(const RowRecord& record)
+{
+    _kindParts.resize(kindPartCount);
+    KindPart& part = _kindParts[(record.kind ? hashOf(*record.kind) : 0) % kindPartCount];
+    if (!part.text.empty() && part.subscription == record.subscription &&
+        areAlike(part.kind, record.kind))
+        return part.text;
+    part = {record.subscription, record.kind, {}};
+    addNumber(part.text, "subscription", record.subscription);
+    addTextOrNull(part.text, "technology", _technology);
+    if (record.kind)
+        addText(part.text, "code", fmt::format(FMT_COMPILE("0x{:04X}"), record.kind->logCode));
+    else
+        addNull(part.text, "code");
+    addNumber(part.text, "version", record.kind ? record.kind->version : std::nullopt);
+    addTextOrNull(part.text, "layout",
+                  record.kind && record.kind->layout ? nameOf(*record.kind->layout)
+                                                     : std::string_view());
+    return part.text;
+}
+
+std::string RowWriter::placePart(const RowPlace& place) const
+{
+    std::string row;
+    addText(row, "section", place.section);
+    addText(row, "path", place.path);
+    addNumber(row, "index", place.index);
+    addText(row, "name", place.name);
+    return row;
+}
+
+std::string RowWriter::valuePart(const RowValue& value) const
+{
+    std::string row;
+    row.reserve(64 + 2 * value.text.value_or("").size());
+    // JSON has no number that is not finite.
+    const bool isNumber = value.number && std::isfinite(*value.number);
+    addNumber(row, "number", isNumber ? value.number : std::nullopt);
+    addTextOrNull(row, "unit", isNumber ? value.unit : std::string_view());
+    if (value.text)
+        addText(row, "text", *value.text);
+    else
+        addNull(row, "text");
+    row += isJson() ? "}\n" : _csvEnd;
+    return row;
+}
+
+void RowWriter::appendClosing(std::string& rows, const RowClosing& closing) const
+{
+    rows += _capture;
+    if (!isJson())
+        rows += nothings(valueColumns).substr(1);
+    addText(rows, "status", closing.status);
+    addNumber(rows, "offset", closing.offset);
+    addTextOrNull(rows, "reason", closing.reason);
+    addNumber(rows, "records", std::optional(closing.records));
+    addNumber(rows, "decoded", std::optional(closing.decoded));
+    addNumber(rows, "rows", std::optional(closing.rows));
+    addNumber(rows, "bytes", std::optional(closing.bytes));
+    rows += isJson() ? "}\n" : "\n";
+}
+
+} // namespace ventrik

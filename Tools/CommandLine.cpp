@@ -222,14 +222,25 @@ void CommandLine::addArgument(std::string name, std::string help, std::string& t
         ->required();
 }
 
-void CommandLine::addArguments(std::string name, std::string help, std::vector<std::string>& target)
+void CommandLine::addArguments(std::string name, std::string help, std::vector<std::string>& target,
+                               Arguments count)
 {
     _parser
         ->add(std::move(name), std::move(help),
               [&target](const auto& value) { target.push_back(value); })
         ->expected(-1)
         ->type_name("")
-        ->required();
+        ->required(count == Arguments::AtLeastOne);
+}
+
+void CommandLine::addInformation(std::string name, std::string help, std::string text)
+{
+    _parser->app
+        .add_flag_callback(
+            std::move(name),
+            [this, text = std::move(text)] { tell(_parser->app.get_name(), text); },
+            std::move(help))
+        ->group("Information");
 }
 
 void CommandLine::addLogOptions(std::string_view lines, int& level, std::string verboseHelp,

@@ -43,8 +43,11 @@ class CommandLine
     }
     /// The one argument, which must be there.
     void addArgument(std::string name, std::string help, std::string& target);
-    /// The arguments, of which there must be one at least.
-    void addArguments(std::string name, std::string help, std::vector<std::string>& target);
+    enum class Arguments { AtLeastOne, Any };
+    void addArguments(std::string name, std::string help, std::vector<std::string>& target,
+                      Arguments count = Arguments::AtLeastOne);
+    /// A flag that has the text told, as --help does, in the place of all else.
+    void addInformation(std::string name, std::string help, std::string text);
     /// --log-level and --verbose, with their present values as the defaults. The level's help says
     /// which lines it is about.
     void addLogOptions(std::string_view lines, int& level, std::string verboseHelp, bool& verbose);

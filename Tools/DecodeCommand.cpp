@@ -1,5 +1,6 @@
 #include "Tools/DecodeCommand.h"
 
+#include "Capture/CaptureFile.h"
 #include "Capture/SnapshotFile.h"
 #include "Files/PrivateFile.h"
 #include "LogGenerator/Core/AssertionFailure.h"
@@ -8,9 +9,9 @@
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/StandardStreams.h"
+#include "PropertyList/Json.h"
 #include "Tools/ConsoleSystemLog.h"
 #include "Tools/FileSystemLog.h"
-#include "Tools/Json.h"
 #include "Tools/OfflineDecoder.h"
 #include "Tools/RecordReports.h"
 
@@ -50,6 +51,7 @@ void complain(std::string_view text)
 class Progress
 {
   public:
+    explicit Progress(bool isWanted) : _isWanted(isWanted) {}
     ~Progress()
     {
         if (_shown)
@@ -58,7 +60,7 @@ class Progress
 
     void count(std::size_t messages)
     {
-        if (messages % interval != 0 || !isatty(STDERR_FILENO))
+        if (messages % interval != 0 || !_isWanted || !isatty(STDERR_FILENO))
             return;
         show(fmt::format("\r{} messages", messages));
         _shown = true;
@@ -66,6 +68,7 @@ class Progress
 
   private:
     static constexpr std::size_t interval = 10000;
+    bool _isWanted;
     bool _shown = false;
 };
 
@@ -82,10 +85,14 @@ class Decoding
           _decoder(generator, clock),
           _census(options.records)
     {
+        if (options.format == DecodeFormat::Rows)
+            _rows.emplace(options.rows, options.capture, technology, generator, options.records);
     }
 
     int run()
     {
+        if (!openCapture())
+            return DecodeStatus::badInput;
         readAll();
         writeResult();
         int status = DecodeStatus::done;
@@ -103,7 +110,7 @@ class Decoding
         // An interrupted write is no failure of the output's.
         if (_outputError != 0 && !(interrupted && _outputError == EINTR))
             status = tellOutputFailure("ventrik-decode", "writing the result", _outputError);
-        if (!writeSnapshotFile())
+        if (!writeSnapshotFile() || !commitCapture())
             status = DecodeStatus::badInput;
         tellAboutRecords();
         return interrupted ? DecodeStatus::interrupted : status;
@@ -129,7 +136,7 @@ class Decoding
 
     void readMessages()
     {
-        Progress progress;
+        Progress progress(_options.showsProgress);
         while (!interrupted && _outputError == 0) {
             const auto message = _reader.next();
             if (!message) {
@@ -138,9 +145,13 @@ class Decoding
             }
             if (isOfOtherSubscription(*message))
                 continue;
+            if (_rows)
+                _rows->runStepsBefore(message->time, _decoder.state());
             _decoder.take(*message);
             count(*message);
-            if (_options.format == DecodeFormat::JsonLines)
+            if (_rows)
+                writeRows(*message);
+            else if (_options.format == DecodeFormat::JsonLines)
                 writeLine(*message);
             progress.count(++_packets);
         }
@@ -156,6 +167,10 @@ class Decoding
     {
         if (_options.statistics)
             _census.take(message.data);
+        if (_capture && message.data.size() > CaptureFile::maximumMessageSize)
+            ++_oversizedCount;
+        else if (_capture)
+            _capture->write(message.time, message.data);
         if (_options.records != RecordsMode::Extended && message.data.size() >= logPacketHeaderSize)
             _extensionCount += isExtensionOnly(LogPacket(stripPrefix(message.data))) ? 1 : 0;
     }
@@ -215,8 +230,40 @@ class Decoding
         write();
     }
 
+    void writeRows(const CapturedMessage& message)
+    {
+        constexpr std::size_t blockSize = 65536;
+        _rows->take(message, _decoder.state());
+        if (_rows->text().size() >= blockSize)
+            flushRows();
+    }
+
+    void flushRows()
+    {
+        std::swap(_text, _rows->text());
+        write();
+    }
+
+    void closeRows()
+    {
+        _rows->finish(_decoder.state());
+        RowClosing closing = _rows->closing();
+        const auto notes = _reader.notes();
+        const std::string reason =
+            !_failure.empty() ? _failure : (notes.empty() ? std::string() : notes.front());
+        closing.reason = reason;
+        closing.status = !reason.empty() ? "damaged" : (closing.records == 0 ? "empty" : "ok");
+        if (!_failure.empty())
+            closing.offset = _reader.errorOffset();
+        if (!interrupted)
+            _rows->close(closing);
+        flushRows();
+    }
+
     void writeResult()
     {
+        if (_rows)
+            return closeRows();
         if (_options.format == DecodeFormat::Json) {
             fmt::format_to(std::back_inserter(_text),
                            "{{\"technology\": \"{}\", \"packets\": {}, \"display\": ",
@@ -228,6 +275,32 @@ class Decoding
             _text = printTree(*VentrikModelNode::makeTreeFromObject(_decoder.display(), index));
         }
         write();
+    }
+
+    // Before anything is decoded that could not be kept.
+    bool openCapture()
+    {
+        if (!_options.captureToWrite)
+            return true;
+        std::string error;
+        _capture =
+            CaptureFile::create(*_options.captureToWrite, _technology, _options.version, error);
+        if (!_capture)
+            complain(error);
+        return _capture != nullptr;
+    }
+
+    bool commitCapture()
+    {
+        std::string error;
+        if (!_capture || _capture->commit(error)) {
+            if (_oversizedCount > 0)
+                complain(fmt::format("{}: {} messages are too large for a capture and left out",
+                                     *_options.captureToWrite, _oversizedCount));
+            return true;
+        }
+        complain(error);
+        return false;
     }
 
     bool writeSnapshotFile()
@@ -252,6 +325,9 @@ class Decoding
     std::FILE* _output;
     int _outputError = 0;
     OfflineDecoder _decoder;
+    std::optional<CaptureRows> _rows;      // where they are wanted
+    std::unique_ptr<CaptureFile> _capture; // likewise
+    std::size_t _oversizedCount = 0;       // of messages that no capture takes
     RecordCensus _census;
     std::size_t _extensionCount = 0; // of records that the present mode leaves aside
     std::size_t _packets = 0;
@@ -259,22 +335,39 @@ class Decoding
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
 
-std::optional<Technology> chooseTechnology(const DecodeOptions& options, CaptureReader& reader)
+// None, with the reason, where nothing tells it.
+std::optional<Technology> chooseTechnology(const DecodeOptions& options, CaptureReader& reader,
+                                           std::string& reason)
 {
     if (options.technology)
         return options.technology;
     if (const auto technology = reader.technology())
         return technology;
     if (const auto type = reader.linkType()) {
-        complain(fmt::format("{}: link type {} names no technology; say which with --technology",
-                             options.capture, *type));
+        reason = fmt::format("{}: link type {} names no technology; say which with --technology",
+                             options.capture, *type);
         return std::nullopt;
     }
     const auto guess = reader.guessTechnology();
-    complain(guess ? fmt::format("{}: by its records it is of {}", options.capture, guess->name)
-                   : fmt::format("{}: no record tells the technology; say which with --technology",
-                                 options.capture));
+    if (guess)
+        complain(fmt::format("{}: by its records it is of {}", options.capture, guess->name));
+    else
+        reason = fmt::format("{}: no record tells the technology; say which with --technology",
+                             options.capture);
     return guess;
+}
+
+// Of a capture that nothing can be read of.
+int refuse(const DecodeOptions& options, const std::string& reason, int status, std::FILE* output)
+{
+    complain(reason);
+    if (options.format == DecodeFormat::Rows) {
+        std::string row;
+        RowWriter(options.rows.format, options.capture, {})
+            .appendClosing(row, {.status = "damaged", .reason = reason});
+        std::fwrite(row.data(), 1, row.size(), output);
+    }
+    return status;
 }
 
 int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* output)
@@ -283,13 +376,11 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
     auto reader = CaptureReader::open(options.capture, error);
     if (!reader && interrupted)
         return DecodeStatus::interrupted;
-    if (!reader) {
-        complain(error);
-        return DecodeStatus::badInput;
-    }
-    const auto technology = chooseTechnology(options, *reader);
+    if (!reader)
+        return refuse(options, error, DecodeStatus::badInput, output);
+    const auto technology = chooseTechnology(options, *reader, error);
     if (!technology)
-        return DecodeStatus::badUsage;
+        return refuse(options, error, DecodeStatus::badUsage, output);
 
     const LinuxResources resources(options.resourceDirectories.empty()
                                        ? LinuxResources::defaultDirectories()
@@ -299,11 +390,11 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
     CaptureClock clock(systemClock);
     const auto generator = LogGenerator::generatorFromTechnology(
         technology->identifier, {log, resources, clock, AssertionPolicy::Throw, options.records});
-    if (!generator) {
-        complain(fmt::format("{}: there is no decoder for the technology {}", options.capture,
-                             technology->name));
-        return DecodeStatus::badInput;
-    }
+    if (!generator)
+        return refuse(options,
+                      fmt::format("{}: there is no decoder for the technology {}", options.capture,
+                                  technology->name),
+                      DecodeStatus::badInput, output);
     return Decoding(options, *reader, *generator, clock, *technology, output).run();
 }
 
@@ -341,7 +432,7 @@ bool countRecords(const std::string& capture, RecordCensus& census)
 {
     std::string error;
     auto reader = CaptureReader::open(capture, error);
-    Progress progress;
+    Progress progress(true);
     std::size_t count = 0;
     for (bool isMore = reader.has_value(); isMore && !interrupted;) {
         const auto message = reader->next();
@@ -385,6 +476,11 @@ int reportUnknownRecords(const UnknownReportOptions& options)
 void interruptDecoding()
 {
     interrupted = true;
+}
+
+bool isDecodingInterrupted()
+{
+    return interrupted;
 }
 
 } // namespace ventrik

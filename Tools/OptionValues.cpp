@@ -53,6 +53,14 @@ std::uint32_t wholeNumberValue(const std::string& text)
     return static_cast<std::uint32_t>(number);
 }
 
+std::uint32_t positiveWholeNumberValue(const std::string& text)
+{
+    const std::uint32_t number = wholeNumberValue(text);
+    if (number == 0)
+        throw WrongValue(fmt::format("'{}' is not above 0", text));
+    return number;
+}
+
 double positiveNumberValue(const std::string& text)
 {
     char* end = nullptr;

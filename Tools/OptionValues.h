@@ -18,6 +18,8 @@ struct WrongValue : std::runtime_error {
 /// Values of options from their texts; WrongValue for what is none.
 std::string textValue(const std::string& text);
 std::uint32_t wholeNumberValue(const std::string& text);
+/// At least 1.
+std::uint32_t positiveWholeNumberValue(const std::string& text);
 /// Finite and above 0.
 double positiveNumberValue(const std::string& text);
 std::string directoryValue(const std::string& text); ///< one that is there

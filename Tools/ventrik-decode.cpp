@@ -1,8 +1,9 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Tools/CommandLine.h"
-#include "Tools/DecodeCommand.h"
+#include "Tools/ManyCaptures.h"
 #include "Tools/OptionValues.h"
 
+#include <chrono>
 #include <csignal>
 #include <map>
 
@@ -15,21 +16,41 @@ using namespace ventrik;
 namespace
 {
 
-DecodeFormat formatValue(const std::string& text)
+/// A format that has a name.
+struct NamedFormat {
+    DecodeFormat format;
+    RowFormat rows = RowFormat::JsonLines;
+};
+
+NamedFormat formatValue(const std::string& text)
 {
-    static const std::map<std::string_view, DecodeFormat> formats{
-        {"text", DecodeFormat::Text},
-        {"json", DecodeFormat::Json},
-        {"jsonl", DecodeFormat::JsonLines}};
+    static const std::map<std::string_view, NamedFormat> formats{
+        {"text", {DecodeFormat::Text}},
+        {"json", {DecodeFormat::Json}},
+        {"jsonl", {DecodeFormat::JsonLines}},
+        {"rows", {DecodeFormat::Rows, RowFormat::JsonLines}},
+        {"csv", {DecodeFormat::Rows, RowFormat::Csv}}};
     const auto format = formats.find(text);
     if (format == formats.end())
         throw WrongValue(fmt::format("there is no format '{}'", text));
     return format->second;
 }
 
+// A billion seconds are 32 years.
+std::chrono::nanoseconds secondsValue(const std::string& text)
+{
+    const double seconds = positiveNumberValue(text);
+    if (seconds < 1e-6 || seconds > 1e9)
+        throw WrongValue(fmt::format("'{}' is no step between a microsecond and 32 years", text));
+    return std::chrono::round<std::chrono::nanoseconds>(std::chrono::duration<double>(seconds));
+}
+
 struct Options {
-    DecodeOptions decode;
+    ManyCapturesOptions captures;
+    std::vector<std::string> selected;
     UnknownReportOptions report; // where it has a file
+
+    DecodeOptions& decode() { return captures.decode; }
 };
 
 void addOptions(CommandLine& line, DecodeOptions& result)
@@ -39,8 +60,13 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    result.technology, technologyValue);
     line.addOption("--format FORMAT",
                    "text: the display tree at the end (default); json: one document; jsonl: a "
-                   "line for every message",
-                   result.format, formatValue);
+                   "line for every message; rows: a line of JSON for every value that changed; "
+                   "csv: the same as a table",
+                   [&](const std::string& text) {
+                       const NamedFormat format = formatValue(text);
+                       result.format = format.format;
+                       result.rows.format = format.rows;
+                   });
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     line.addOption("--subscription N",
                    "leaves out what captures tell to be of another subscription",
@@ -53,6 +79,10 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    result.snapshotFile, textValue);
     line.addOption("--description TEXT", "the snapshot's description", result.description,
                    textValue);
+    line.addOption("--write-capture FILE",
+                   "writes what was read as a capture of ours, in the pcapng form where FILE ends "
+                   "with .pcapng",
+                   result.captureToWrite, textValue);
     line.addOption("--resources DIR", "takes the display templates from DIR",
                    [&](const std::string& directory) {
                        result.resourceDirectories = {directoryValue(directory)};
@@ -61,27 +91,62 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                  "ends with a table of the records by code, version, size and layout, on standard "
                  "error",
                  result.statistics);
-    line.addLogOptions("--verbose shows", result.logLevel,
-                       "shows the system log on standard error, and what decoders tell",
-                       result.verbose);
-    line.addExitStatus(DecodeStatus::done, "all was decoded");
-    line.addExitStatus(DecodeStatus::badInput,
-                       "the input cannot be read or is damaged (what was decoded before is still "
-                       "printed), or the result cannot be written");
 }
 
-void addReportOptions(CommandLine& line, UnknownReportOptions& result)
+void addRowOptions(CommandLine& line, Options& result)
 {
-    line.addArguments("CAPTURE", "a capture of any kind, compressed or not; - for standard input",
-                      result.captures);
+    line.beginGroup("Rows");
+    line.addOption("--select PATH",
+                   "only the values there and below; * stands for any characters of a part, ** "
+                   "for any parts; may be given again",
+                   [&](const std::string& path) { result.selected.push_back(textValue(path)); });
+    line.addOption("--every SECONDS", "the state at each such step in the place of each change",
+                   result.decode().rows.every, secondsValue);
+    line.addOption(
+        "--files-from FILE",
+        "decodes the captures that FILE names, one a line; - for standard input",
+        [&](const std::string& file) { result.captures.lists.push_back(textValue(file)); });
+    line.addOption("--jobs N", "decodes so many captures at a time (default 1)",
+                   result.captures.jobs, positiveWholeNumberValue);
+    line.addFlag("--strict", "several captures give exit status 1 when one of them does",
+                 result.captures.isStrict);
+    line.addInformation("--schema", "tells the columns of rows", rowSchema());
+}
+
+void addReportOptions(CommandLine& line, Options& result)
+{
+    line.addArguments("CAPTURE",
+                      "a capture of any kind, compressed or not; - for standard input; for rows "
+                      "several, and directories",
+                      result.captures.captures, CommandLine::Arguments::Any);
     line.beginGroup("Records that cannot be read");
     line.addOption("--report-unknown FILE",
                    "writes which there are to FILE, to be sent to us, and nothing else: codes, "
                    "versions, sizes and counts",
-                   result.file, textValue);
+                   result.report.file, textValue);
     line.addFlag("--with-bytes",
                  "also the first payload of each, of measurements that hold no identities",
-                 result.withBytes);
+                 result.report.withBytes);
+}
+
+void refuseWrongTogether(const CommandLine& line, const Options& options)
+{
+    const DecodeOptions& decode = options.captures.decode;
+    const auto& captures = options.captures.captures;
+    const bool isReport = !options.report.file.empty();
+    const bool areRows = decode.format == DecodeFormat::Rows && !isReport;
+    if (captures.empty() && (options.captures.lists.empty() || !areRows))
+        line.refuse("CAPTURE is required");
+    if (captures.size() > 1 && !isReport && !areRows)
+        line.refuse(fmt::format("what is '{}'?", captures[1]));
+    if (!isReport && options.report.withBytes)
+        line.refuse("--with-bytes goes with --report-unknown");
+    for (const char* option : {"--select", "--every", "--files-from", "--jobs", "--strict"})
+        if (line.has(option) && !areRows)
+            line.refuse(fmt::format("{} goes with --format rows or csv", option));
+    for (const char* option : {"--system-log", "--snapshot", "--write-capture"})
+        if (line.has(option) && (captures.size() != 1 || !options.captures.lists.empty()))
+            line.refuse(fmt::format("{} goes with one capture", option));
 }
 
 Options parseArguments(int argc, char** argv)
@@ -90,17 +155,26 @@ Options parseArguments(int argc, char** argv)
                      "Decodes a capture of log-channel messages and prints the display that the "
                      "viewer would show. Time is the capture's.");
     line.addUsage("[OPTION]... CAPTURE");
+    line.addUsage("--format rows|csv [OPTION]... CAPTURE...");
     line.addUsage("--report-unknown FILE [--with-bytes] CAPTURE...");
     Options result;
-    result.decode.version = VENTRIK_VERSION;
-    addOptions(line, result.decode);
-    addReportOptions(line, result.report);
+    result.decode().version = VENTRIK_VERSION;
+    addOptions(line, result.decode());
+    addRowOptions(line, result);
+    addReportOptions(line, result);
+    line.addLogOptions("--verbose shows", result.decode().logLevel,
+                       "shows the system log on standard error, and what decoders tell",
+                       result.decode().verbose);
+    line.addExitStatus(DecodeStatus::done, "all was decoded");
+    line.addExitStatus(DecodeStatus::badInput,
+                       "the input cannot be read or is damaged (what was decoded before is still "
+                       "printed), or the result cannot be written");
     line.parse(argc, argv);
-    if (result.report.file.empty() && result.report.captures.size() > 1)
-        line.refuse(fmt::format("what is '{}'?", result.report.captures[1]));
-    if (result.report.file.empty() && result.report.withBytes)
-        line.refuse("--with-bytes goes with --report-unknown");
-    result.decode.capture = result.report.captures.front();
+    refuseWrongTogether(line, result);
+    result.decode().rows.selection = PathSelection(result.selected);
+    if (!result.captures.captures.empty())
+        result.decode().capture = result.captures.captures.front();
+    result.report.captures = result.captures.captures;
     return result;
 }
 
@@ -134,16 +208,17 @@ void endOnInterrupt()
 int main(int argc, char** argv)
 {
     prepareStandardStreams();
-    const Options options = parseArguments(argc, argv);
+    Options options = parseArguments(argc, argv);
     if (!options.report.file.empty()) {
         endOnInterrupt();
         return reportUnknownRecords(options.report);
     }
-    std::FILE* output = takeStandardOutput(options.decode.verbose);
+    std::FILE* output = takeStandardOutput(options.decode().verbose);
     if (!output) {
         complain("ventrik-decode", "standard output is closed");
         return DecodeStatus::badInput;
     }
     endOnInterrupt();
-    return decodeCapture(options.decode, output);
+    return options.decode().format == DecodeFormat::Rows ? decodeCaptures(options.captures, output)
+                                                         : decodeCapture(options.decode(), output);
 }

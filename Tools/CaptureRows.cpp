@@ -1,0 +1,199 @@
+#include "Tools/CaptureRows.h"
+
+#include "Packets/LogPacket.h"
+
+#include <functional>
+#include <utility>
+
+namespace ventrik
+{
+
+namespace
+{
+
+// A display of more places than that is none that a person looks at; what it costs is its service's
+// affair, what it takes is not.
+constexpr std::size_t maximumKnownPlaces = 65536;
+constexpr unsigned knownValueBits = 13;
+constexpr unsigned knownValueShift = 64 - knownValueBits;
+
+void addCodes(const PlistDictionary& command, std::string_view key, std::uint64_t base,
+              std::unordered_set<std::uint64_t>& codes)
+{
+    const PlistValue* list = command.find(key);
+    if (!list || !list->array())
+        return;
+    for (const PlistValue& code : *list->array())
+        codes.insert(code.integer()->bits() + base);
+}
+
+} // namespace
+
+CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
+                         const Technology& technology, const LogGenerator& generator,
+                         RecordsMode records)
+    : _options(options),
+      _records(records),
+      _generator(generator),
+      _changes(generator),
+      _writer(options.format, capture, technology.name)
+{
+    _values.resize(std::size_t{1} << knownValueBits);
+    const PlistDictionary command = generator.getStartCommand();
+    _areRecords = command.contains("SetOrbelLogCodes");
+    addCodes(command, "SetOrbelLogCodes", 0, _wanted);
+    addCodes(command, "SetQxExtraCodes", extraCodeBase, _wanted);
+}
+
+void CaptureRows::runStepsBefore(Clock::TimePoint time, const PlistDictionary& state)
+{
+    if (!_options.every)
+        return;
+    const std::chrono::nanoseconds step = *_options.every;
+    if (!_nextStep || time < _lastTime - step) {
+        // Times that run back begin anew, after what stood until then.
+        if (std::exchange(_isUpdated, false))
+            writeState(*_nextStep, state);
+        _nextStep = time + step;
+    } else if (*_nextStep < time) {
+        if (std::exchange(_isUpdated, false))
+            writeState(*_nextStep, state);
+        // Steps in which nothing came are passed over.
+        *_nextStep += (time - *_nextStep + step - std::chrono::nanoseconds(1)) / step * step;
+    }
+    _lastTime = time;
+}
+
+void CaptureRows::take(const CapturedMessage& message, const PlistDictionary& state)
+{
+    count(message);
+    if (_options.every)
+        _isUpdated = true;
+    else
+        writeChanges(message, state);
+    ++_closing.records;
+}
+
+void CaptureRows::finish(const PlistDictionary& state)
+{
+    if (std::exchange(_isUpdated, false))
+        writeState(*_nextStep, state);
+}
+
+void CaptureRows::count(const CapturedMessage& message)
+{
+    _closing.bytes += message.data.size();
+    const ByteView packet =
+        message.data.size() < transportPrefixSize ? message.data : stripPrefix(message.data);
+    if (!_areRecords || (packet.size() >= logPacketHeaderSize &&
+                         _wanted.contains(effectiveLogCode(LogPacket(packet)))))
+        ++_closing.decoded;
+}
+
+void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictionary& state)
+{
+    const auto changes = _changes.take(state);
+    if (changes.empty())
+        return;
+    const RowRecord none{_closing.records, message.time, message.subscription, {}};
+    RowRecord record = none;
+    if (_areRecords)
+        record.kind = recordKindOf(message.data, _records);
+    if (!std::exchange(_hasDisplay, true)) {
+        // It also shows what no record told.
+        for (const DisplayChange& change : changes)
+            writeRow(_writer.recordPart(_changes.cellAt(*change.place, state) ? record : none),
+                     change, state);
+        return;
+    }
+    const std::string_view part = _writer.recordPart(record);
+    for (const DisplayChange& change : changes)
+        writeRow(part, change, state);
+}
+
+void CaptureRows::writeState(Clock::TimePoint time, const PlistDictionary& state)
+{
+    _changes.take(state);
+    const std::string_view part =
+        _writer.recordPart({_closing.records == 0 ? 0 : _closing.records - 1, time, {}, {}});
+    for (const DisplayPlace* place : _changes.values())
+        writeRow(part, {DisplayChange::Kind::Shown, place}, state);
+}
+
+void CaptureRows::writeRow(std::string_view recordPart, const DisplayChange& change,
+                           const PlistDictionary& state)
+{
+    if (change.kind != DisplayChange::Kind::Shown)
+        return writeHolder(recordPart, change, state);
+    const KnownPlace& known = knownPlace(*change.place, state);
+    if (!known.isSelected)
+        return;
+    _text += recordPart;
+    _text += known.part;
+    _text += valuePart(_changes.cellAt(*change.place, state), change.place->text);
+    ++_closing.rows;
+}
+
+// Values come again and again.
+std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& cell, std::string_view text)
+{
+    const Field* field = cell ? cell->field : nullptr;
+    const auto number = static_cast<std::uint64_t>(
+        cell ? cell->raw : static_cast<std::int64_t>(std::hash<std::string_view>{}(text)));
+    const std::uint64_t hash =
+        (std::hash<const Field*>{}(field) + number) * 0x9E3779B97F4A7C15U; // spreads neighbors
+    KnownValue& known = _values[hash >> knownValueShift];
+    if (known.field == field && known.raw == number && known.text == text && !known.part.empty() &&
+        known.workedOut == (cell ? cell->workedOut : std::nullopt))
+        return known.part;
+    known.field = field;
+    known.raw = number;
+    known.workedOut = cell ? cell->workedOut : std::nullopt;
+    known.text = text;
+    known.part = cell ? _writer.valuePart({cell->number(), field->shown.unit, text})
+                      : _writer.valuePart({plainNumber(text), {}, text});
+    return known.part;
+}
+
+// What goes takes with it what is below.
+void CaptureRows::writeHolder(std::string_view recordPart, const DisplayChange& change,
+                              const PlistDictionary& state)
+{
+    const bool isGone = change.kind == DisplayChange::Kind::Gone;
+    const DisplayPlaceDescription description = _changes.describe(*change.place, state);
+    if (isGone ? !_options.selection.reaches(description.path)
+               : !_options.selection.selects(description.path))
+        return;
+    const std::string path = isGone ? description.path : description.path + "/";
+    const std::string part =
+        _writer.placePart({description.section, path, description.index, description.name});
+    _text += recordPart;
+    _text += part;
+    _text += _writer.valuePart(isGone ? RowValue{} : RowValue{.text = std::string_view()});
+    ++_closing.rows;
+}
+
+const CaptureRows::KnownPlace& CaptureRows::knownPlace(const DisplayPlace& place,
+                                                       const PlistDictionary& state)
+{
+    const bool isKept = place.number < maximumKnownPlaces;
+    if (isKept && place.number >= _places.size())
+        _places.resize(place.number + 1);
+    KnownPlace& known = isKept ? _places[place.number] : _otherPlace;
+    if (known.serial != place.serial)
+        describe(known, place, state);
+    return known;
+}
+
+void CaptureRows::describe(KnownPlace& known, const DisplayPlace& place,
+                           const PlistDictionary& state) const
+{
+    const DisplayPlaceDescription description = _changes.describe(place, state);
+    known.serial = place.serial;
+    known.isSelected = _options.selection.selects(description.path);
+    if (known.isSelected)
+        known.part = _writer.placePart(
+            {description.section, description.path, description.index, description.name});
+}
+
+} // namespace ventrik

@@ -1,0 +1,95 @@
+#pragma once
+
+#include "Capture/CaptureContainer.h"
+#include "Capture/RowWriter.h"
+#include "LogGenerator/Core/LogGenerator.h"
+#include "Model/DisplayChanges.h"
+#include "Platform/Technology.h"
+#include "Tools/PathSelection.h"
+
+#include <chrono>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_set>
+#include <vector>
+
+namespace ventrik
+{
+
+struct RowOptions {
+    RowFormat format = RowFormat::JsonLines;
+    PathSelection selection;
+    /// The state at each such step in the place of the changes.
+    std::optional<std::chrono::nanoseconds> every;
+};
+
+/// The rows of one capture: what each message changed in the display, or at each step all values as
+/// they stand. They are appended to a text that the caller takes away.
+class CaptureRows
+{
+  public:
+    /// The generator outlives it.
+    CaptureRows(const RowOptions& options, std::string_view capture, const Technology& technology,
+                const LogGenerator& generator, RecordsMode records);
+
+    /// Before a message is decoded: the steps that end before it.
+    void runStepsBefore(Clock::TimePoint time, const PlistDictionary& state);
+    /// After it was decoded.
+    void take(const CapturedMessage& message, const PlistDictionary& state);
+    /// After the last one: the rows that are left.
+    void finish(const PlistDictionary& state);
+
+    std::string& text() { return _text; }
+    /// What the closing row counts.
+    RowClosing closing() const { return _closing; }
+    void close(const RowClosing& closing) { _writer.appendClosing(_text, closing); }
+
+  private:
+    /// What the rows of a place begin with, as long as it is the same place.
+    struct KnownPlace {
+        std::uint64_t serial = 0;
+        std::string part;
+        bool isSelected = false;
+    };
+
+    /// The part of a row that tells a value.
+    struct KnownValue {
+        const Field* field = nullptr;
+        std::uint64_t raw = 0; ///< of a text that no field shows something of its own
+        std::optional<double> workedOut;
+        std::string text;
+        std::string part;
+    };
+
+    void count(const CapturedMessage& message);
+    void writeChanges(const CapturedMessage& message, const PlistDictionary& state);
+    void writeState(Clock::TimePoint time, const PlistDictionary& state);
+    void writeRow(std::string_view recordPart, const DisplayChange& change,
+                  const PlistDictionary& state);
+    void writeHolder(std::string_view recordPart, const DisplayChange& change,
+                     const PlistDictionary& state);
+    std::string_view valuePart(const std::optional<ShownCell>& cell, std::string_view text);
+    const KnownPlace& knownPlace(const DisplayPlace& place, const PlistDictionary& state);
+    void describe(KnownPlace& known, const DisplayPlace& place, const PlistDictionary& state) const;
+
+    RowOptions _options;
+    RecordsMode _records;
+    const LogGenerator& _generator;
+    DisplayChanges _changes;
+    RowWriter _writer;
+    std::string _text;
+    RowClosing _closing;
+    bool _areRecords;                          // of log codes; else property lists
+    std::unordered_set<std::uint64_t> _wanted; // log codes
+    std::vector<KnownPlace> _places;           // by number, as far as they are kept
+    KnownPlace _otherPlace;
+    std::vector<KnownValue> _values; // each where its field and its number lead
+    bool _hasDisplay = false;        // there were changes already
+    // Where values are told at steps.
+    std::optional<Clock::TimePoint> _nextStep;
+    Clock::TimePoint _lastTime;
+    bool _isUpdated = false; // since the last step
+};
+
+} // namespace ventrik

@@ -1,6 +1,7 @@
 #include "App/VentrikApp.h"
 
 #include "App/Toolkit/PlainText.h"
+#include "Model/ChannelNote.h"
 
 #include <QGuiApplication>
 #include <QScreen>

@@ -8,6 +8,7 @@
 #include "App/Toolkit/PushButton.h"
 #include "App/Toolkit/StatusLabel.h"
 #include "App/VentrikCell.h"
+#include "Model/NodeRows.h"
 
 #include <utility>
 
@@ -59,38 +60,15 @@ std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
     return button;
 }
 
-const VentrikModelNode::Children& childrenOf(const ModelNodePointer& node)
-{
-    static const VentrikModelNode::Children none;
-    const auto* childNodes = node ? node->childNodes() : nullptr;
-    return childNodes ? *childNodes : none;
-}
-
-// The child of that name nearest to a place. Rows seldom move: the first look finds it as a rule.
-std::optional<int> nearestNamed(const VentrikModelNode::Children& children, const std::string& name,
-                                int place)
-{
-    const int count = static_cast<int>(children.size());
-    const auto isIt = [&](int row) {
-        return row >= 0 && row < count &&
-               children[static_cast<std::size_t>(row)]->displayName() == name;
-    };
-    for (int away = 0; place - away >= 0 || place + away < count; ++away)
-        for (const int row : {place - away, place + away})
-            if (isIt(row))
-                return row;
-    return std::nullopt;
-}
-
 // Where the rows of one node are in another one.
 TableView::RowMapping mappingBetween(const ModelNodePointer& from, const ModelNodePointer& to)
 {
     return [from, to](int row) -> std::optional<int> {
-        const auto& former = childrenOf(from);
+        const auto& former = rowsOf(from);
         const auto place = static_cast<std::size_t>(row);
         if (place >= former.size())
             return std::nullopt;
-        return nearestNamed(childrenOf(to), former[place]->displayName(), row);
+        return nearestNamed(rowsOf(to), former[place]->displayName(), row);
     };
 }
 
@@ -233,7 +211,7 @@ void VentrikPaneController::viewWillDisappear(bool)
 
 const VentrikModelNode::Children& VentrikPaneController::children() const
 {
-    return childrenOf(_nodes);
+    return rowsOf(_nodes);
 }
 
 const ModelNodePointer& VentrikPaneController::childAt(IndexPath indexPath) const
@@ -255,7 +233,7 @@ std::unique_ptr<TableRow> VentrikPaneController::rowForIndexPath(TableView& tabl
         const auto offset = _contentOffsets.find(cell->key().text());
         view->setContentOffset(offset == _contentOffsets.end() ? 0 : offset->second);
     }
-    if (_host.tintsChanges() && hasChanged(child, indexPath.row))
+    if (_host.tintsChanges() && hasChanged(rowsOf(_formerNodes), child, indexPath.row))
         cell->tintValue();
     return cell;
 }
@@ -269,15 +247,6 @@ void VentrikPaneController::rowWillBeReused(TableRow& row)
         _contentOffsets[cell.key().text()] = cell.view()->contentOffset();
     else
         _contentOffsets.erase(cell.key().text());
-}
-
-// Does the leaf show something else than before the reload?
-bool VentrikPaneController::hasChanged(const VentrikModelNode& leaf, int row) const
-{
-    const auto& former = childrenOf(_formerNodes);
-    const auto place = nearestNamed(former, leaf.displayName(), row);
-    const std::string* before = place ? former[static_cast<std::size_t>(*place)]->value() : nullptr;
-    return before && leaf.value() && *before != *leaf.value();
 }
 
 QString VentrikPaneController::textForCopying(IndexPath indexPath)

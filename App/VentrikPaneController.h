@@ -2,8 +2,7 @@
 
 #include "App/StatusNote.h"
 #include "App/Toolkit/TableScreen.h"
-#include "Model/NodeNotes.h"
-#include "Model/VentrikModelNode.h"
+#include "Model/DisplayTree.h"
 
 #include <map>
 #include <memory>
@@ -13,12 +12,9 @@ namespace ventrik
 {
 
 /// What the panes ask of the application.
-class VentrikPaneHost : public NodeNotes
+class VentrikPaneHost : public DisplayTree
 {
   public:
-    /// The nodes that panes show; null where there is none.
-    virtual ModelNodePointer topLevelNodes() { return nullptr; }
-    virtual ModelNodePointer nodeAtPath(const std::string&) { return nullptr; }
     virtual bool allowSaveButton() const = 0;
     virtual void showSaveView() = 0;
     /// Whether values that have changed are tinted for a moment.
@@ -68,7 +64,6 @@ class VentrikPaneController : public TableScreen
     QString reasonForNoRows() const;
     const VentrikModelNode::Children& children() const;
     const ModelNodePointer& childAt(IndexPath indexPath) const;
-    bool hasChanged(const VentrikModelNode& leaf, int row) const;
 
     VentrikPaneHost& _host;
     ModelNodePointer _nodes;

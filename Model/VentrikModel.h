@@ -1,8 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Core/LogGenerator.h"
-#include "Model/NodeNotes.h"
-#include "Model/VentrikModelNode.h"
+#include "Model/DisplayTree.h"
 #include "Platform/Platform.h"
 
 #include <functional>
@@ -34,7 +33,7 @@ std::string_view channelFaultText(ChannelFault fault);
 ///
 /// Everything runs on the main queue, which blocks only in the sends to the service. Failures are
 /// told to the system log; the screens learn of them through `isConnected`.
-class VentrikModel : public NodeNotes
+class VentrikModel : public DisplayTree
 {
   public:
     using UpdateCallback = std::function<void()>;
@@ -74,8 +73,8 @@ class VentrikModel : public NodeNotes
 
     /// The root of the display tree, built on demand and kept until the next refresh with news;
     /// none while there is no generator.
-    ModelNodePointer topLevelNodes();
-    ModelNodePointer nodeAtPath(const std::string& path);
+    ModelNodePointer topLevelNodes() override;
+    ModelNodePointer nodeAtPath(const std::string& path) override;
 
     /// Nothing is said of a tree that is not built.
     std::string_view doubtAt(const std::string& path) const override;

@@ -1,3 +1,4 @@
+#include "Model/ChannelNote.h"
 #include "Tests/App/AppFixture.h"
 
 #include <QLocale>

@@ -1,8 +1,7 @@
-#include "App/StatusNote.h"
-
-#include "App/DateFormatter.h"
+#include "Model/ChannelNote.h"
 
 #include <algorithm>
+#include <chrono>
 
 #include <fmt/format.h>
 
@@ -15,13 +14,6 @@ namespace
 using namespace std::chrono_literals;
 
 constexpr auto longSilence = 10s;
-
-std::string timeOfDay(const Clock& clock, Clock::TimePoint time)
-{
-    DateFormatter formatter(clock);
-    formatter.setDateFormat(QStringLiteral("HH:mm:ss"));
-    return formatter.stringFromDate(time);
-}
 
 std::string silenceNote(const ChannelState& state, Clock::TimePoint now)
 {
@@ -62,6 +54,17 @@ std::string reasonForNoData(const ChannelState& state)
     if (reason.front() >= 'a' && reason.front() <= 'z')
         reason.front() = static_cast<char>(reason.front() - 'a' + 'A');
     return reason;
+}
+
+std::string timeOfDay(const Clock& clock, Clock::TimePoint time)
+{
+    const auto local =
+        time.time_since_epoch() + std::chrono::seconds(clock.timeZone(time).secondsFromUtc);
+    const auto sinceMidnight = std::chrono::floor<std::chrono::seconds>(
+        local - std::chrono::floor<std::chrono::days>(local));
+    const std::chrono::hh_mm_ss parts(sinceMidnight);
+    return fmt::format("{:02}:{:02}:{:02}", parts.hours().count(), parts.minutes().count(),
+                       parts.seconds().count());
 }
 
 } // namespace ventrik

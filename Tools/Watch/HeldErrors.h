@@ -1,0 +1,31 @@
+#pragma once
+
+#include "Platform/Linux/Socket.h"
+
+namespace ventrik
+{
+
+/// Keeps what is written to standard error away from a terminal that shows a screen, and writes the
+/// last 1000 lines of it to the terminal at the end. Where standard error is no terminal, or
+/// another one than standard output, it is left alone.
+class HeldErrors
+{
+  public:
+    HeldErrors();
+    /// Gives standard error back, and writes what was kept.
+    ~HeldErrors();
+    HeldErrors(const HeldErrors&) = delete;
+    HeldErrors& operator=(const HeldErrors&) = delete;
+
+    /// Lets go of all but the last lines; to be called now and then.
+    void trim();
+    /// What the end does, for a signal handler too: nothing that could want a lock.
+    void release() noexcept;
+
+  private:
+    FileDescriptor _kept;     // none: nothing is held
+    FileDescriptor _terminal; // standard error as it was
+    bool _isReleased = false;
+};
+
+} // namespace ventrik

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "Model/VentrikModel.h"
+#include "Platform/Platform.h"
+#include "Tools/Watch/CursesScreen.h"
+#include "Tools/Watch/ScreenSignals.h"
+#include "Tools/Watch/WatchPanes.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+
+#include <QSocketNotifier>
+
+namespace ventrik
+{
+
+/// The viewer on a terminal: keys to panes, panes to the screen, on the main queue. It draws after
+/// a refresh, a key, and where what is said of the channel has changed; a screen that looks as it
+/// did is not drawn again.
+class WatchViewer
+{
+  public:
+    /// The model and what the platform refers to outlive this. `end` is called once, when the user
+    /// quits or the terminal has gone. Throws std::runtime_error where the terminal cannot show it.
+    WatchViewer(const Platform& platform, VentrikModel& model, std::function<void()> end);
+
+    /// The model has a new tree.
+    void refresh();
+
+  private:
+    void readKeys();
+    void draw();
+    WatchStatus status() const;
+
+    Platform _platform;
+    VentrikModel& _model;
+    std::function<void()> _end;
+    std::optional<Clock::TimePoint> _lastUpdate;
+    bool _wasConnected = false;
+
+    WatchPanes _panes;
+    CursesScreen _screen;
+    ScreenSignals _signals;
+    QSocketNotifier _input;
+    std::unique_ptr<RepeatingTimer> _ticks;
+};
+
+} // namespace ventrik

@@ -1,0 +1,106 @@
+#include "Tools/WatchCommand.h"
+
+#include "Model/TreePrinter.h"
+#include "Platform/Linux/LinuxPlatform.h"
+#include "Platform/Linux/StandardStreams.h"
+#include "Platform/Linux/TerminationSignals.h"
+
+#include <QCoreApplication>
+
+#include <cerrno>
+#include <cstdlib>
+#include <stdexcept>
+
+#include <unistd.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr const char* programName = "ventrik-watch";
+constexpr std::string_view clearScreen = "\033[H\033[2J";
+
+LinuxPlatformOptions platformOptions(const WatchOptions& options)
+{
+    LinuxPlatformOptions result;
+    result.programName = programName;
+    result.verbose = options.verbose;
+    result.logThreshold = options.logLevel;
+    result.version = VENTRIK_VERSION;
+    return result;
+}
+
+} // namespace
+
+int WatchCommand::run()
+{
+    if (showsPanes())
+        if (const std::string reason = CursesScreen::reasonAgainst(); !reason.empty()) {
+            complain(programName, reason + "; --plain prints the tree instead");
+            return EXIT_FAILURE;
+        }
+    const TerminationSignals termination([] { QCoreApplication::quit(); });
+    LinuxPlatform linuxPlatform(platformOptions(_options));
+    const Platform platform = linuxPlatform.platform();
+    _model = makeModel(platform);
+    if (showsPanes())
+        _viewer =
+            std::make_unique<WatchViewer>(platform, *_model, [] { QCoreApplication::quit(); });
+    platform.mainQueue.async([this] { _model->restartMonitor(); });
+    const int status = QCoreApplication::exec();
+    // What is still to be logged is kept from the screen, too.
+    linuxPlatform.log().flush();
+    _viewer.reset();
+    _model.reset();
+    return status;
+}
+
+bool WatchCommand::showsPanes() const
+{
+    return !_options.once && !_options.plain && isatty(STDIN_FILENO) && isatty(STDOUT_FILENO);
+}
+
+std::unique_ptr<VentrikModel> WatchCommand::makeModel(const Platform& platform)
+{
+    return std::make_unique<VentrikModel>(
+        platform, [this] { refresh(); }, LogGenerator::generatorsReading(_options.records));
+}
+
+void WatchCommand::refresh()
+{
+    if (_viewer)
+        _viewer->refresh();
+    else
+        printTree();
+}
+
+void WatchCommand::printTree()
+{
+    const ModelNodePointer root = _model->topLevelNodes();
+    if (!root)
+        return;
+    if (!print(*root))
+        QCoreApplication::exit(tellOutputFailure(programName, "standard output", errno));
+    else if (_options.once)
+        QCoreApplication::quit();
+}
+
+// On a terminal the new tree takes the place of the old one; elsewhere, and where it is the only
+// one, nothing is cleared. False, with errno, when it could not be written. A reader that takes
+// nothing is waited for, but not against the wish that the program ends.
+bool WatchCommand::print(const VentrikModelNode& root) const
+{
+    std::string text;
+    if (isatty(STDOUT_FILENO) && (_options.plain || !_options.once))
+        text += clearScreen;
+    text += ventrik::printTree(root, *_model);
+    std::string_view rest = text;
+    while (!writeText(STDOUT_FILENO, rest, Patience::Brief))
+        if (errno != EAGAIN || TerminationSignals::haveCome())
+            return errno == EAGAIN;
+    return true;
+}
+
+} // namespace ventrik

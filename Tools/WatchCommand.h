@@ -1,0 +1,43 @@
+#pragma once
+
+#include "LogGenerator/Core/LogGenerator.h"
+#include "Model/VentrikModel.h"
+#include "Platform/Platform.h"
+#include "Platform/SystemLog.h"
+#include "Tools/Watch/WatchViewer.h"
+
+#include <memory>
+
+namespace ventrik
+{
+
+struct WatchOptions {
+    bool once = false;  ///< ends after the first tree
+    bool plain = false; ///< prints trees on a terminal, too
+    RecordsMode records = RecordsMode::Newer;
+    int logLevel = LogPriority::error;
+    bool verbose = false;
+};
+
+/// `ventrik-watch`: the model with panes on a terminal, or with a tree printed at each refresh.
+class WatchCommand
+{
+  public:
+    explicit WatchCommand(const WatchOptions& options) : _options(options) {}
+
+    /// Runs the main loop to the end; gives the exit status. The application object exists.
+    int run();
+
+  private:
+    bool showsPanes() const;
+    std::unique_ptr<VentrikModel> makeModel(const Platform& platform);
+    void refresh();
+    void printTree();
+    bool print(const VentrikModelNode& root) const;
+
+    WatchOptions _options;
+    std::unique_ptr<VentrikModel> _model;
+    std::unique_ptr<WatchViewer> _viewer; // none: trees are printed
+};
+
+} // namespace ventrik

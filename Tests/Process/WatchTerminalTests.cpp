@@ -258,6 +258,20 @@ TEST_F(WatchTerminal, AFailedAssertionIsReadOnACleanTerminal)
     EXPECT_TRUE(shown.shows("Assertion failure: "));
 }
 
+TEST_F(WatchTerminal, WipesTheScreenWhereThereIsNoOtherOne)
+{
+    for (const char* end : {"q", "C-\\"}) {
+        Terminal shown = terminal();
+        shown.run("TERM=vt100 " + std::string(program) + "; echo ended");
+        ASSERT_TRUE(shown.shows("waiting for the service"));
+        EXPECT_FALSE(shown.isOnOtherScreen());
+        shown.press({end});
+        EXPECT_TRUE(shown.shows("ended\nshell:"));
+        EXPECT_THAT(shown.screen(), Not(HasSubstr("waiting")));
+        EXPECT_THAT(shown.screen(), Not(HasSubstr("$<")));
+    }
+}
+
 TEST_P(WatchTerminalSignal, LeavesTheTerminalAsItWas)
 {
     const auto service = startScenario();

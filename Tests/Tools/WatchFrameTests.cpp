@@ -108,6 +108,19 @@ TEST_F(Frame, TitlesAreThePanesFromTheRootOn)
     EXPECT_EQ(lines({20, 5})[0], " …k › Neighbors › 0");
 }
 
+TEST_F(Frame, WhereNotAllRowsShowTheirNumbersStandBesideTheTitle)
+{
+    PlistArray list;
+    for (int row = 0; row < 100; ++row)
+        list.append("x");
+    show(list);
+    press({Key::Down});
+    EXPECT_EQ(lines()[0], " Ventrik" + std::string(26, ' ') + "2/100");
+    type(U"/9");
+    EXPECT_EQ(lines()[0], " Ventrik" + std::string(27, ' ') + "1/19");
+    EXPECT_EQ(lines({40, 30})[0], " Ventrik");
+}
+
 TEST_F(Frame, TheSelectedRowIsSelectedAllAlong)
 {
     press({Key::Down});
@@ -173,9 +186,9 @@ TEST_F(Frame, RecordsOfNoKnownLayoutAreNamedBelowTheTitle)
 TEST_F(Frame, LinesAboveTheRowsLeaveRoomForOne)
 {
     tree.warnings["/"] = {"one", "two", "and 3 more"};
-    EXPECT_THAT(lines({40, 5}),
-                ElementsAre(" Ventrik", " one", " two", " Serving Cell                         ›",
-                            " LTE · connected · updated 06:10:28"));
+    EXPECT_THAT(lines({40, 5}), ElementsAre(" Ventrik" + std::string(28, ' ') + "1/3", " one",
+                                            " two", " Serving Cell                         ›",
+                                            " LTE · connected · updated 06:10:28"));
 }
 
 TEST_F(Frame, AnEmptyPaneSaysWhy)

@@ -57,10 +57,28 @@ std::string capability(const char* name)
     return text && text != reinterpret_cast<const char*>(-1) ? text : "";
 }
 
+// Where a terminal has no other screen, ours is wiped off.
+bool hasOtherScreen()
+{
+    return !capability("rmcup").empty();
+}
+
+// What only delays, as "$<2>", is for the library.
+std::string withoutDelays(std::string text)
+{
+    for (std::size_t start = 0; (start = text.find("$<", start)) != std::string::npos;) {
+        const std::size_t end = text.find('>', start);
+        if (end == std::string::npos)
+            break;
+        text.erase(start, end - start + 1);
+    }
+    return text;
+}
+
 std::string restoringSequence()
 {
-    return capability("rmkx") + capability("sgr0") + capability("op") + capability("cnorm") +
-           capability("rmcup");
+    return withoutDelays(capability("rmkx") + capability("sgr0") + capability("op") +
+                         capability("cnorm") + capability(hasOtherScreen() ? "rmcup" : "clear"));
 }
 
 attr_t attributesOf(const FramePart& part)
@@ -233,6 +251,10 @@ void CursesScreen::leave()
 {
     if (!std::exchange(_isShown, false))
         return;
+    if (!hasOtherScreen()) {
+        wclear(stdscr);
+        wrefresh(stdscr);
+    }
     endwin();
     send();
     _output.finish();

@@ -89,8 +89,10 @@ void HeldErrors::trim()
     struct stat status = {};
     if (!_kept.isOpen() || fstat(_kept.get(), &status) != 0)
         return;
-    if (const off_t start = startOfLastLines(_kept.get(), status.st_size); start > 0)
-        fallocate(_kept.get(), FALLOC_FL_PUNCH_HOLE | FALLOC_FL_KEEP_SIZE, 0, start);
+    // The line break before them stays: it tells the next look where they begin.
+    const off_t dropped = startOfLastLines(_kept.get(), status.st_size) - 1;
+    if (dropped > 0)
+        fallocate(_kept.get(), FALLOC_FL_PUNCH_HOLE | FALLOC_FL_KEEP_SIZE, 0, dropped);
 }
 
 void HeldErrors::release() noexcept

@@ -37,6 +37,14 @@ void restoreAction(int number)
             sigaction(number, &rescue.actions[place], nullptr);
 }
 
+// What the processor raised does so by itself when the handler returns.
+bool comesAgain(const siginfo_t& info)
+{
+    const bool isFault = info.si_signo == SIGSEGV || info.si_signo == SIGBUS ||
+                         info.si_signo == SIGFPE || info.si_signo == SIGILL;
+    return isFault && info.si_code > 0;
+}
+
 void handle(int number, siginfo_t* info, void*)
 {
     if (isWanted.exchange(false)) {
@@ -47,8 +55,7 @@ void handle(int number, siginfo_t* info, void*)
         rescue.errors->release();
     }
     restoreAction(number);
-    // What the processor raised comes again by itself.
-    if (info->si_code <= 0)
+    if (!comesAgain(*info))
         raise(number);
 }
 

@@ -73,8 +73,8 @@ class Composer
                 put(0, 0, cutToWidth("too small", columns()));
             return std::move(_frame);
         }
-        putTitle();
         putBody({0, 1, columns(), lines() - 2});
+        putTitle();
         if (_panes.mode() == WatchPanes::Mode::Finding)
             putPrompt();
         else
@@ -106,8 +106,23 @@ class Composer
         std::vector<std::string> titles;
         for (const WatchPane& pane : _panes.panes())
             titles.push_back(harmless(pane.title()));
-        const int room = columns() - 2;
+        const std::string place = placeInList();
+        const int placeWidth = static_cast<int>(place.size());
+        const int room = columns() - 2 - (place.empty() ? 0 : placeWidth + 2);
         put(0, 1, cutFrontToWidth(joined(titles, " › "), room), Ink::Title);
+        if (!place.empty())
+            put(0, columns() - 1 - placeWidth, place, Ink::Quiet);
+    }
+
+    // Which row of how many is selected, where not all of them show.
+    std::string placeInList() const
+    {
+        const bool isSearch = _panes.mode() == WatchPanes::Mode::Finding;
+        const ListPlace& place = isSearch ? _panes.foundPlace() : _panes.pane().place;
+        const int count =
+            isSearch ? static_cast<int>(_panes.found().count()) : _panes.pane().rowCount();
+        return count > place.height ? fmt::format("{}/{}", place.selected + 1, count)
+                                    : std::string();
     }
 
     // So much of a name as can ever show.

@@ -11,6 +11,7 @@
 #include <cstdlib>
 #include <stdexcept>
 
+#include <fmt/format.h>
 #include <unistd.h>
 
 namespace ventrik
@@ -36,18 +37,18 @@ LinuxPlatformOptions platformOptions(const WatchOptions& options)
 
 int WatchCommand::run()
 {
-    if (showsPanes())
-        if (const std::string reason = CursesScreen::reasonAgainst(); !reason.empty()) {
-            complain(programName, reason + "; --plain prints the tree instead");
-            return EXIT_FAILURE;
-        }
     const TerminationSignals termination([] { QCoreApplication::quit(); });
     LinuxPlatform linuxPlatform(platformOptions(_options));
     const Platform platform = linuxPlatform.platform();
     _model = makeModel(platform);
-    if (showsPanes())
-        _viewer =
-            std::make_unique<WatchViewer>(platform, *_model, [] { QCoreApplication::quit(); });
+    try {
+        if (showsPanes())
+            _viewer =
+                std::make_unique<WatchViewer>(platform, *_model, [] { QCoreApplication::quit(); });
+    } catch (const std::runtime_error& error) {
+        complain(programName, fmt::format("{}; --plain prints the tree instead", error.what()));
+        return EXIT_FAILURE;
+    }
     platform.mainQueue.async([this] { _model->restartMonitor(); });
     const int status = QCoreApplication::exec();
     // What is still to be logged is kept from the screen, too.

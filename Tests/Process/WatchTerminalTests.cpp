@@ -198,7 +198,7 @@ TEST_F(WatchTerminal, MarksWhatCannotBeAndTellsWhy)
     ASSERT_TRUE(shown.shows("connected · updated"));
     shown.press({"Enter"});
     EXPECT_TRUE(shown.shows(" 504 !\n"));
-    EXPECT_TRUE(shown.shows("\n ! Physical cell identity is above 503"));
+    EXPECT_TRUE(shown.shows("! Physical cell identity is above 503\n"));
     EXPECT_THAT(shown.styledScreen(), HasSubstr("\033[33m"));
 }
 
@@ -345,7 +345,7 @@ TEST_F(WatchTerminal, EndsWhileTheTerminalTakesNothing)
 {
     const auto service = startScenario();
     Terminal shown = terminal(200, 60);
-    shown.run(viewer());
+    shown.run(viewer("--verbose"));
     ASSERT_TRUE(shown.shows("connected · updated"));
     shown.press({"C-s"});
     for (int count = 0; count < 50; ++count)

@@ -3,7 +3,9 @@
 #include "PropertyList/Utf8.h"
 
 #include <algorithm>
+#include <array>
 #include <clocale>
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -39,6 +41,28 @@ void useUtf8()
     if (std::strcmp(nl_langinfo(CODESET), "UTF-8") != 0)
         std::setlocale(LC_CTYPE, "C.UTF-8");
 }
+
+/// Keeps the signals' actions as they are: the library's own would draw and end the process.
+class SignalActions
+{
+  public:
+    SignalActions()
+    {
+        for (std::size_t place = 0; place < numbers.size(); ++place)
+            sigaction(numbers[place], nullptr, &_actions[place]);
+    }
+    ~SignalActions()
+    {
+        for (std::size_t place = 0; place < numbers.size(); ++place)
+            sigaction(numbers[place], &_actions[place], nullptr);
+    }
+    SignalActions(const SignalActions&) = delete;
+    SignalActions& operator=(const SignalActions&) = delete;
+
+  private:
+    static constexpr std::array numbers{SIGINT, SIGTERM, SIGTSTP, SIGWINCH};
+    std::array<struct sigaction, numbers.size()> _actions = {};
+};
 
 std::wstring wide(std::string_view text)
 {
@@ -164,9 +188,8 @@ KeyPress pressOf(wint_t character)
     }
 }
 
-} // namespace
-
-std::string CursesScreen::reasonAgainst()
+// Why the terminal cannot be a screen; empty when it can.
+std::string reasonAgainst()
 {
     const char* name = std::getenv("TERM");
     if (!name || !*name)
@@ -180,12 +203,15 @@ std::string CursesScreen::reasonAgainst()
                         : fmt::format("the terminal cannot place text (TERM={})", name);
 }
 
+} // namespace
+
 /// The library's screen. It is set up on the terminal, and from then on draws into memory: its own
 /// writing would wait for a terminal that takes nothing.
 struct CursesScreen::Curses {
     Curses() : drawing(memfd_create("ventrik-screen", MFD_CLOEXEC))
     {
         output = fdopen(fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1), "w");
+        const SignalActions actions;
         screen = output ? newterm(nullptr, output, stdin) : nullptr;
         if (!screen || !drawing.isOpen())
             throw std::runtime_error("the terminal's screen cannot be set up");

@@ -22,10 +22,8 @@ namespace ventrik
 class CursesScreen
 {
   public:
-    /// Why the terminal cannot be a screen, in one line; empty when it can.
-    static std::string reasonAgainst();
-
-    /// Where there is a reason against it, std::runtime_error. `ready` is called on the main queue
+    /// Throws std::runtime_error, with the reason in one line, where the terminal cannot be a
+    /// screen; nothing has happened to it then. `ready` is called on the main queue
     /// when a screen can be drawn again after `canDraw` was false.
     explicit CursesScreen(std::function<void()> ready);
     ~CursesScreen();

@@ -1,6 +1,7 @@
 #include "Tools/Watch/HeldErrors.h"
 
 #include "Platform/Linux/StandardStreams.h"
+#include "Tools/Watch/TerminalOutput.h"
 
 #include <algorithm>
 #include <array>
@@ -70,12 +71,14 @@ HeldErrors::HeldErrors()
     if (!isTheScreen())
         return;
     FileDescriptor kept(memfd_create("ventrik-errors", MFD_CLOEXEC));
-    FileDescriptor terminal(fcntl(STDERR_FILENO, F_DUPFD_CLOEXEC, 3));
+    FileDescriptor former(fcntl(STDERR_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1));
+    FileDescriptor terminal = openedAnew(STDERR_FILENO);
     // Each line goes to the end, whoever writes it.
-    if (!kept.isOpen() || !terminal.isOpen() || fcntl(kept.get(), F_SETFL, O_APPEND) != 0 ||
-        dup2(kept.get(), STDERR_FILENO) < 0)
+    if (!kept.isOpen() || !former.isOpen() || !terminal.isOpen() ||
+        fcntl(kept.get(), F_SETFL, O_APPEND) != 0 || dup2(kept.get(), STDERR_FILENO) < 0)
         return;
     _kept = std::move(kept);
+    _former = std::move(former);
     _terminal = std::move(terminal);
 }
 
@@ -101,8 +104,9 @@ void HeldErrors::release() noexcept
     if (_isReleased || !_kept.isOpen() || fstat(_kept.get(), &status) != 0)
         return;
     _isReleased = true;
-    dup2(_terminal.get(), STDERR_FILENO);
-    copy(_kept.get(), startOfLastLines(_kept.get(), status.st_size), status.st_size, STDERR_FILENO);
+    dup2(_former.get(), STDERR_FILENO);
+    copy(_kept.get(), startOfLastLines(_kept.get(), status.st_size), status.st_size,
+         _terminal.get());
 }
 
 } // namespace ventrik

@@ -24,7 +24,8 @@ class HeldErrors
 
   private:
     FileDescriptor _kept;     // none: nothing is held
-    FileDescriptor _terminal; // standard error as it was
+    FileDescriptor _former;   // standard error as it was
+    FileDescriptor _terminal; // the same, for writing without waiting
     bool _isReleased = false;
 };
 

@@ -50,9 +50,6 @@ ScreenSignals::~ScreenSignals()
 {
     _notifier.reset();
     close(_descriptor);
-    for (const int number : {SIGWINCH, SIGTSTP, SIGCONT})
-        if (sigismember(&handledSignals(), number) == 1)
-            std::signal(number, SIG_DFL);
     pthread_sigmask(SIG_UNBLOCK, &handledSignals(), nullptr);
 }
 
@@ -77,7 +74,6 @@ void ScreenSignals::stop()
     sigset_t stopSignal;
     sigemptyset(&stopSignal);
     sigaddset(&stopSignal, SIGTSTP);
-    std::signal(SIGTSTP, SIG_DFL);
     raise(SIGTSTP);
     pthread_sigmask(SIG_UNBLOCK, &stopSignal, nullptr);
     pthread_sigmask(SIG_BLOCK, &stopSignal, nullptr);

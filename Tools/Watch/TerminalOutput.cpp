@@ -10,12 +10,7 @@
 namespace ventrik
 {
 
-namespace
-{
-
-// Opened anew: not to wait is a matter of the open file, which others share with us. A terminal of
-// another user cannot be opened; that one may make us wait.
-FileDescriptor openTerminal(int terminal)
+FileDescriptor openedAnew(int terminal)
 {
     const std::string name = fmt::format("/proc/self/fd/{}", terminal);
     FileDescriptor own(open(name.c_str(), O_WRONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
@@ -23,10 +18,8 @@ FileDescriptor openTerminal(int terminal)
                         : FileDescriptor(fcntl(terminal, F_DUPFD_CLOEXEC, STDERR_FILENO + 1));
 }
 
-} // namespace
-
 TerminalOutput::TerminalOutput(int terminal, std::function<void()> taken)
-    : _terminal(openTerminal(terminal)),
+    : _terminal(openedAnew(terminal)),
       _taken(std::move(taken)),
       _notifier(std::make_unique<QSocketNotifier>(_terminal.get(), QSocketNotifier::Write))
 {

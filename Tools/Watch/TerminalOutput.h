@@ -9,6 +9,11 @@
 namespace ventrik
 {
 
+/// A terminal opened anew, so that writing does not wait: whether it does is a matter of the open
+/// file, which others share with us. A terminal of another user cannot be opened; its descriptor is
+/// copied, and may make us wait.
+FileDescriptor openedAnew(int terminal);
+
 /// Writes to a terminal without waiting for it: one that takes nothing (Ctrl+S, a stuck connection)
 /// holds up neither the service's messages nor the end of the program.
 class TerminalOutput

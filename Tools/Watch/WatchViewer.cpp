@@ -45,6 +45,11 @@ WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, std::fun
     draw();
 }
 
+WatchViewer::~WatchViewer()
+{
+    _model.setChannelCallback({});
+}
+
 void WatchViewer::refresh()
 {
     _panes.reload();

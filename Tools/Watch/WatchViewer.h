@@ -24,6 +24,9 @@ class WatchViewer
     /// The model and what the platform refers to outlive this. `end` is called once, when the user
     /// quits or the terminal has gone. Throws std::runtime_error where the terminal cannot show it.
     WatchViewer(const Platform& platform, VentrikModel& model, std::function<void()> end);
+    ~WatchViewer();
+    WatchViewer(const WatchViewer&) = delete;
+    WatchViewer& operator=(const WatchViewer&) = delete;
 
     /// The model has a new tree.
     void refresh();

@@ -21,6 +21,9 @@ namespace
 {
 
 constexpr const char* programName = "ventrik-watch";
+// Of what was kept from the screen: what was asked for, or what tells how it ended.
+constexpr int linesWhenVerbose = 1000;
+constexpr int linesOtherwise = 20;
 constexpr std::string_view clearScreen = "\033[H\033[2J";
 
 LinuxPlatformOptions platformOptions(const WatchOptions& options)
@@ -41,10 +44,11 @@ int WatchCommand::run()
     LinuxPlatform linuxPlatform(platformOptions(_options));
     const Platform platform = linuxPlatform.platform();
     _model = makeModel(platform);
+    const int mostErrorLines = _options.verbose ? linesWhenVerbose : linesOtherwise;
     try {
         if (showsPanes())
-            _viewer =
-                std::make_unique<WatchViewer>(platform, *_model, [] { QCoreApplication::quit(); });
+            _viewer = std::make_unique<WatchViewer>(platform, *_model, mostErrorLines,
+                                                    [] { QCoreApplication::quit(); });
     } catch (const std::runtime_error& error) {
         complain(programName, fmt::format("{}; --plain prints the tree instead", error.what()));
         return EXIT_FAILURE;

@@ -144,7 +144,7 @@ TEST_F(TerminalOutputTest, IsIdleWhenTheTerminalHasGone)
 
 TEST_F(HeldErrorsTest, KeepStandardErrorAndGiveTheLastThousandLines)
 {
-    std::optional<HeldErrors> held(std::in_place);
+    std::optional<HeldErrors> held(std::in_place, 1000);
     writeLines(1, 2500);
     read();
     EXPECT_EQ(seen, "");
@@ -158,7 +158,7 @@ TEST_F(HeldErrorsTest, KeepStandardErrorAndGiveTheLastThousandLines)
 
 TEST_F(HeldErrorsTest, AFewLinesComeWhole)
 {
-    std::optional<HeldErrors> held(std::in_place);
+    std::optional<HeldErrors> held(std::in_place, 1000);
     writeLines(1, 2);
     dprintf(STDERR_FILENO, "no end");
     held->trim();
@@ -168,7 +168,7 @@ TEST_F(HeldErrorsTest, AFewLinesComeWhole)
 
 TEST_F(HeldErrorsTest, TakeNoMoreMemoryThanTheirLastLines)
 {
-    std::optional<HeldErrors> held(std::in_place);
+    std::optional<HeldErrors> held(std::in_place, 1000);
     const std::string line(1000, 'x');
     for (int count = 0; count < 20'000; ++count)
         dprintf(STDERR_FILENO, "%s\n", line.c_str());
@@ -182,7 +182,7 @@ TEST_F(HeldErrorsTest, TakeNoMoreMemoryThanTheirLastLines)
 
 TEST_F(HeldErrorsTest, OfLongLinesTheLastMebibyteComes)
 {
-    std::optional<HeldErrors> held(std::in_place);
+    std::optional<HeldErrors> held(std::in_place, 1000);
     const std::string line(3 << 20, 'x');
     dprintf(STDERR_FILENO, "%s\n", line.c_str());
     release(held);
@@ -193,7 +193,7 @@ TEST_F(HeldErrorsTest, LeaveAloneWhatGoesElsewhere)
 {
     const FileDescriptor file(memfd_create("errors", MFD_CLOEXEC));
     dup2(file.get(), STDERR_FILENO);
-    std::optional<HeldErrors> held(std::in_place);
+    std::optional<HeldErrors> held(std::in_place, 1000);
     writeLines(1, 1);
     struct stat status = {};
     fstat(file.get(), &status);

@@ -3,6 +3,7 @@
 #include "Tests/Process/ProcessFixture.h"
 #include "Tests/Process/Terminal.h"
 
+#include <algorithm>
 #include <csignal>
 
 namespace ventrik
@@ -235,6 +236,22 @@ TEST_F(WatchTerminal, KeepsTheLogFromTheScreenUntilTheEnd)
     shown.press({"q"});
     expectCleanEnd(shown, 0);
     EXPECT_THAT(shown.history(), HasSubstr("<3> Starting the display update timer\n"));
+}
+
+TEST_F(WatchTerminal, TellsAtTheEndNoMoreThanWasAskedFor)
+{
+    const auto service = startService({"--technology", "utran"});
+    Terminal shown = terminal(80, 60);
+    shown.run(viewer());
+    ASSERT_TRUE(shown.shows("connected · updated"));
+    shown.press({"q"});
+    expectCleanEnd(shown, 0);
+    // The decoder tells of each state, asked or not.
+    const auto lines = linesOf(shown.history());
+    const auto told = std::ranges::count_if(
+        lines, [](const std::string& line) { return line.starts_with("Display Dict = "); });
+    EXPECT_GT(told, 0);
+    EXPECT_LE(told, 20);
 }
 
 TEST_F(WatchTerminal, LetsTheLogGoToAFileAtOnce)

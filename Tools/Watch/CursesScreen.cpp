@@ -254,7 +254,8 @@ struct CursesScreen::Curses {
     WINDOW* keys = nullptr;
 };
 
-CursesScreen::CursesScreen(std::function<void()> ready) : _output(STDOUT_FILENO, std::move(ready))
+CursesScreen::CursesScreen(int mostErrorLines, std::function<void()> ready)
+    : _errors(mostErrorLines), _output(STDOUT_FILENO, std::move(ready))
 {
     if (const std::string reason = reasonAgainst(); !reason.empty())
         throw std::runtime_error(reason);

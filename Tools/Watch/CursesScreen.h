@@ -24,8 +24,9 @@ class CursesScreen
   public:
     /// Throws std::runtime_error, with the reason in one line, where the terminal cannot be a
     /// screen; nothing has happened to it then. `ready` is called on the main queue
-    /// when a screen can be drawn again after `canDraw` was false.
-    explicit CursesScreen(std::function<void()> ready);
+    /// when a screen can be drawn again after `canDraw` was false. So many lines of standard error
+    /// are kept for the end.
+    CursesScreen(int mostErrorLines, std::function<void()> ready);
     ~CursesScreen();
     CursesScreen(const CursesScreen&) = delete;
     CursesScreen& operator=(const CursesScreen&) = delete;

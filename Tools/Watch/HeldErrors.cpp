@@ -19,7 +19,6 @@ namespace ventrik
 namespace
 {
 
-constexpr int mostLines = 1000;
 constexpr off_t mostBytes = off_t{1} << 20;
 
 bool isTheScreen()
@@ -34,7 +33,7 @@ bool isTheScreen()
 }
 
 // Where the last lines of a file begin.
-off_t startOfLastLines(int file, off_t end)
+off_t startOfLastLines(int file, off_t end, int mostLines)
 {
     std::array<char, 4096> part{};
     const off_t limit = std::max<off_t>(0, end - mostBytes);
@@ -66,7 +65,7 @@ void copy(int file, off_t start, off_t end, int target)
 
 } // namespace
 
-HeldErrors::HeldErrors()
+HeldErrors::HeldErrors(int mostLines) : _mostLines(mostLines)
 {
     if (!isTheScreen())
         return;
@@ -93,7 +92,7 @@ void HeldErrors::trim()
     if (!_kept.isOpen() || fstat(_kept.get(), &status) != 0)
         return;
     // The line break before them stays: it tells the next look where they begin.
-    const off_t dropped = startOfLastLines(_kept.get(), status.st_size) - 1;
+    const off_t dropped = startOfLastLines(_kept.get(), status.st_size, _mostLines) - 1;
     if (dropped > 0)
         fallocate(_kept.get(), FALLOC_FL_PUNCH_HOLE | FALLOC_FL_KEEP_SIZE, 0, dropped);
 }
@@ -105,7 +104,7 @@ void HeldErrors::release() noexcept
         return;
     _isReleased = true;
     dup2(_former.get(), STDERR_FILENO);
-    copy(_kept.get(), startOfLastLines(_kept.get(), status.st_size), status.st_size,
+    copy(_kept.get(), startOfLastLines(_kept.get(), status.st_size, _mostLines), status.st_size,
          _terminal.get());
 }
 

@@ -6,12 +6,12 @@ namespace ventrik
 {
 
 /// Keeps what is written to standard error away from a terminal that shows a screen, and writes the
-/// last 1000 lines of it to the terminal at the end. Where standard error is no terminal, or
-/// another one than standard output, it is left alone.
+/// last lines of it to the terminal at the end, a mebibyte at most. Where standard error is no
+/// terminal, or another one than standard output, it is left alone.
 class HeldErrors
 {
   public:
-    HeldErrors();
+    explicit HeldErrors(int mostLines);
     /// Gives standard error back, and writes what was kept.
     ~HeldErrors();
     HeldErrors(const HeldErrors&) = delete;
@@ -23,6 +23,7 @@ class HeldErrors
     void release() noexcept;
 
   private:
+    int _mostLines;
     FileDescriptor _kept;     // none: nothing is held
     FileDescriptor _former;   // standard error as it was
     FileDescriptor _terminal; // the same, for writing without waiting

@@ -17,12 +17,13 @@ constexpr auto tick = 1s;
 
 } // namespace
 
-WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, std::function<void()> end)
+WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, int mostErrorLines,
+                         std::function<void()> end)
     : _platform(platform),
       _model(model),
       _end(std::move(end)),
       _panes(model),
-      _screen([this] { draw(); }),
+      _screen(mostErrorLines, [this] { draw(); }),
       _signals({.resized =
                     [this] {
                         _screen.redrawAll();

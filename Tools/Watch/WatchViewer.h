@@ -22,8 +22,10 @@ class WatchViewer
 {
   public:
     /// The model and what the platform refers to outlive this. `end` is called once, when the user
-    /// quits or the terminal has gone. Throws std::runtime_error where the terminal cannot show it.
-    WatchViewer(const Platform& platform, VentrikModel& model, std::function<void()> end);
+    /// quits or the terminal has gone; then come so many lines of standard error at most. Throws
+    /// std::runtime_error where the terminal cannot show it.
+    WatchViewer(const Platform& platform, VentrikModel& model, int mostErrorLines,
+                std::function<void()> end);
     ~WatchViewer();
     WatchViewer(const WatchViewer&) = delete;
     WatchViewer& operator=(const WatchViewer&) = delete;

@@ -51,12 +51,13 @@ int WatchCommand::run()
                                                     [] { QCoreApplication::quit(); });
     } catch (const std::runtime_error& error) {
         complain(programName, fmt::format("{}; --plain prints the tree instead", error.what()));
+        _model.reset(); // before its platform
         return EXIT_FAILURE;
     }
     platform.mainQueue.async([this] { _model->restartMonitor(); });
     const int status = QCoreApplication::exec();
-    // What is still to be logged is kept from the screen, too.
-    linuxPlatform.log().flush();
+    if (_viewer)
+        linuxPlatform.log().flush(); // while that is still kept from the screen
     _viewer.reset();
     _model.reset();
     return status;

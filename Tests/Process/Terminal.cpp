@@ -29,7 +29,8 @@ Terminal::Terminal(const std::string& directory, const QProcessEnvironment& envi
 
 std::string Terminal::ask(const std::vector<std::string>& command)
 {
-    QStringList arguments{"-u", "-S", QString::fromStdString(_socket)};
+    // The server is ours alone to start.
+    QStringList arguments{"-N", "-u", "-S", QString::fromStdString(_socket)};
     for (const std::string& word : command)
         arguments.append(QString::fromStdString(word));
     QProcess client;

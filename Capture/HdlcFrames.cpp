@@ -37,37 +37,73 @@ std::uint16_t frameChecksum(ByteView bytes)
     return static_cast<std::uint16_t>(~rest);
 }
 
-std::optional<HdlcFrame> HdlcFrames::next()
+Bytes hdlcFrame(ByteView content)
 {
-    do {
-        _frame.clear();
-        _isEscaped = false;
-        _isTooLarge = false;
-        _offset = _source.offset();
-        if (!readToEndMark()) {
-            if (_source.offset() > _offset)
-                _unfinished.add(_offset);
-            return std::nullopt;
-        }
-    } while (!isWhole());
-    return HdlcFrame{ByteView(_frame).first(_frame.size() - checksumSize), _offset};
+    const std::uint16_t checksum = frameChecksum(content);
+    Bytes whole(content.begin(), content.end());
+    whole.push_back(static_cast<std::uint8_t>(checksum & 0xFFU));
+    whole.push_back(static_cast<std::uint8_t>(checksum >> 8U));
+    Bytes frame;
+    frame.reserve(whole.size() + 1);
+    for (const std::uint8_t byte : whole) {
+        const bool isMark = byte == endMark || byte == escapeMark;
+        if (isMark)
+            frame.push_back(escapeMark);
+        frame.push_back(isMark ? byte ^ escapeBit : byte);
+    }
+    frame.push_back(endMark);
+    return frame;
 }
 
-bool HdlcFrames::readToEndMark()
+std::optional<HdlcFrame> HdlcFrames::next()
 {
     while (true) {
         const ByteView block = _source.peekSome(blockSize);
-        const auto end =
-            static_cast<std::size_t>(std::ranges::find(block, endMark) - block.begin());
-        append(block.first(end));
-        const bool hasEnd = end < block.size();
-        _source.skip(hasEnd ? end + 1 : end);
-        if (hasEnd || block.empty())
-            return hasEnd;
+        if (block.empty()) {
+            _assembler.end();
+            return std::nullopt;
+        }
+        _source.skip(_assembler.take(block));
+        if (auto frame = _assembler.frame())
+            return frame;
     }
 }
 
-void HdlcFrames::append(ByteView escaped)
+std::size_t FrameAssembler::take(ByteView bytes)
+{
+    if (_isEnded)
+        beginFrame();
+    const auto end = static_cast<std::size_t>(std::ranges::find(bytes, endMark) - bytes.begin());
+    append(bytes.first(end));
+    _isEnded = end < bytes.size();
+    const std::size_t taken = _isEnded ? end + 1 : end;
+    _offset += taken;
+    _isWhole = _isEnded && checkFrame();
+    return taken;
+}
+
+std::optional<HdlcFrame> FrameAssembler::frame() const
+{
+    if (!_isWhole)
+        return std::nullopt;
+    return HdlcFrame{ByteView(_frame).first(_frame.size() - checksumSize), _start};
+}
+
+void FrameAssembler::end()
+{
+    if (!_isEnded && _offset > _start)
+        _unfinished.add(_start);
+    beginFrame();
+}
+
+void FrameAssembler::beginFrame()
+{
+    _frame.clear();
+    _start = _offset;
+    _isEscaped = _isTooLarge = _isEnded = _isWhole = false;
+}
+
+void FrameAssembler::append(ByteView escaped)
 {
     for (const std::uint8_t byte : escaped) {
         if (byte == escapeMark && !_isEscaped) {
@@ -84,26 +120,26 @@ void HdlcFrames::append(ByteView escaped)
 
 // Two end marks in a row hold no frame between them. An escape without its byte is a frame that the
 // sender gave up: its checksum is as good as wrong.
-bool HdlcFrames::isWhole()
+bool FrameAssembler::checkFrame()
 {
     if (_isTooLarge) {
-        _tooLarge.add(_offset);
+        _tooLarge.add(_start);
         return false;
     }
     if (_frame.size() <= checksumSize) {
         if (!_frame.empty() || _isEscaped)
-            _tooShort.add(_offset);
+            _tooShort.add(_start);
         return false;
     }
     const std::size_t size = _frame.size() - checksumSize;
     const int checksum = _frame[size] | _frame[size + 1] << 8;
     const bool isRight = !_isEscaped && checksum == frameChecksum(ByteView(_frame).first(size));
     if (!isRight)
-        _badChecksums.add(_offset);
+        _badChecksums.add(_start);
     return isRight;
 }
 
-void HdlcFrames::tell(std::vector<std::string>& notes, std::string_view name) const
+void FrameAssembler::tell(std::vector<std::string>& notes, std::string_view name) const
 {
     _badChecksums.tell(notes, name, "frame", "with a bad checksum");
     _tooShort.tell(notes, name, "piece", "of junk between frames");

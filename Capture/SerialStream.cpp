@@ -1,28 +1,7 @@
 #include "Capture/SerialStream.h"
 
-#include "Packets/LogPacket.h"
-
-#include <fmt/format.h>
-
 namespace ventrik
 {
-
-namespace
-{
-
-// Log frame, little-endian
-//   0 u8 kind | 1 u8 records that wait | 2 u16 length | 4 u16 length again, of the record from
-//   here on | 6 u16 log code | 8 8 bytes timestamp | 16 payload
-constexpr std::uint8_t logKind = 0x10;
-constexpr std::size_t recordOffset = 4;
-constexpr std::size_t recordHeaderSize = 12;
-// Frame of one of the phone's two subscriptions: 0 u8 kind | 4 u32 subscription | 8 another frame
-constexpr std::uint8_t wrappingKind = 0x98;
-constexpr std::size_t subscriptionOffset = 4;
-constexpr std::size_t wrappedOffset = 8;
-constexpr std::size_t timestampOffset = 5; // in a packet
-
-} // namespace
 
 bool SerialStream::isIn(ByteView firstBytes)
 {
@@ -38,59 +17,17 @@ SerialStream::SerialStream(std::unique_ptr<ByteSource> source, std::string name)
 std::optional<CapturedMessage> SerialStream::next()
 {
     while (const auto frame = _frames.next()) {
-        if (auto found = message(*frame))
+        if (auto found = _records.record(*frame))
             return found;
     }
     return std::nullopt;
-}
-
-std::optional<CapturedMessage> SerialStream::message(const HdlcFrame& frame)
-{
-    ByteView content = frame.content;
-    std::optional<std::uint32_t> subscription;
-    if (content[0] == wrappingKind) {
-        if (content.size() <= wrappedOffset) {
-            _badWrappings.add(frame.offset);
-            return std::nullopt;
-        }
-        subscription = LogPacket(content).u32(subscriptionOffset);
-        content = content.subspan(wrappedOffset);
-    }
-    if (content[0] != logKind) {
-        ++_otherKinds.at(content[0]);
-        return std::nullopt;
-    }
-    if (!takeRecord(content)) {
-        _badRecords.add(frame.offset);
-        return std::nullopt;
-    }
-    _time = timeOfTimestamp(LogPacket(_packet).littleEndianWord(timestampOffset)).value_or(_time);
-    return CapturedMessage{_time, _packet, subscription};
-}
-
-// A record is a packet without its type.
-bool SerialStream::takeRecord(ByteView content)
-{
-    const std::size_t length = LogPacket(content).u16(recordOffset);
-    if (length < recordHeaderSize || content.size() < recordOffset + length)
-        return false;
-    const ByteView record = content.subspan(recordOffset, length);
-    _packet.assign(1, ordinaryPacketType);
-    _packet.insert(_packet.end(), record.begin(), record.end());
-    return true;
 }
 
 std::vector<std::string> SerialStream::notes() const
 {
     std::vector<std::string> lines;
     _frames.tell(lines, _name);
-    _badRecords.tell(lines, _name, "log record", "of a wrong length");
-    _badWrappings.tell(lines, _name, "frame", "of a subscription without content");
-    for (std::size_t kind = 0; kind < _otherKinds.size(); ++kind) {
-        if (const auto count = _otherKinds.at(kind); count > 0)
-            lines.push_back(fmt::format("{}: {} frame{} of kind 0x{:02X}", _name, count,
-                                        count == 1 ? "" : "s", kind));
-    }
+    _records.tell(lines, _name);
     return lines;
 }
 

@@ -3,9 +3,8 @@
 #include "Capture/ByteSource.h"
 #include "Capture/CaptureContainer.h"
 #include "Capture/HdlcFrames.h"
+#include "Capture/LogFrames.h"
 
-#include <array>
-#include <cstdint>
 #include <memory>
 #include <string>
 #include <vector>
@@ -29,17 +28,10 @@ class SerialStream : public CaptureContainer
     std::vector<std::string> notes() const override;
 
   private:
-    std::optional<CapturedMessage> message(const HdlcFrame& frame);
-    bool takeRecord(ByteView content);
-
     std::unique_ptr<ByteSource> _source;
     std::string _name;
     HdlcFrames _frames;
-    Bytes _packet;
-    Clock::TimePoint _time; // of the last record
-    SkippedCount _badRecords;
-    SkippedCount _badWrappings;
-    std::array<std::uint64_t, 256> _otherKinds{};
+    LogFrames _records;
 };
 
 } // namespace ventrik

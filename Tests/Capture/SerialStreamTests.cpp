@@ -57,6 +57,48 @@ TEST(FrameChecksum, IsThatOfTheKnownVector)
     EXPECT_EQ(frameChecksum(Bytes{'1', '2', '3', '4', '5', '6', '7', '8', '9'}), 0x906E);
 }
 
+TEST(HdlcFrame, IsWrittenEscapedWithItsChecksumAndItsEndMark)
+{
+    EXPECT_EQ(hdlcFrame(Bytes{'1', '2', '3', '4', '5', '6', '7', '8', '9'}),
+              (Bytes{'1', '2', '3', '4', '5', '6', '7', '8', '9', 0x6E, 0x90, 0x7E}));
+    const Bytes marks{0x7E, 1, 0x7D};
+    EXPECT_EQ(hdlcFrame(marks), frame(marks));
+}
+
+TEST(FrameAssembler, GivesTheSameFramesWhereverTheirBytesAreParted)
+{
+    const Bytes bytes = joined({frame({0x7D, 1}), {5, endMark}, frame({0x7E})});
+    FrameAssembler assembler;
+    std::vector<Bytes> contents;
+    for (const std::uint8_t byte : bytes) {
+        EXPECT_EQ(assembler.take({&byte, 1}), 1U);
+        if (const auto whole = assembler.frame())
+            contents.emplace_back(whole->content.begin(), whole->content.end());
+    }
+    EXPECT_THAT(contents, ElementsAre(Bytes{0x7D, 1}, Bytes{0x7E}));
+}
+
+TEST(FrameAssembler, TakesNothingBehindAnEndMark)
+{
+    FrameAssembler assembler;
+    const Bytes first = frame({1});
+    EXPECT_EQ(assembler.take(joined({first, frame({2})})), first.size());
+    EXPECT_EQ(assembler.frame()->content[0], 1);
+}
+
+TEST(FrameAssembler, CountsWhatWasBegunWhenTheBytesEndAndBeginsAnew)
+{
+    FrameAssembler assembler;
+    assembler.take(Bytes{1, 2});
+    assembler.end();
+    assembler.end();
+    std::vector<std::string> notes;
+    assembler.tell(notes, "x");
+    EXPECT_THAT(notes, ElementsAre("x: 1 unfinished frame at the end, the first at offset 0"));
+    assembler.take(frame({7}));
+    EXPECT_TRUE(assembler.frame());
+}
+
 TEST(SerialStream, GivesALogRecordAsAPacketOfTypeOne)
 {
     const auto reading = read(logFrame(firstRecord));
@@ -189,7 +231,7 @@ TEST(SerialStream, CountsAnUnfinishedLastFrame)
 TEST(SerialStream, TakesAFrameOfOneMebibyteAndNoneAbove)
 {
     Bytes largest = ByteRow().bytes(logContent(firstRecord));
-    largest.resize(HdlcFrames::maximumSize - 2);
+    largest.resize(FrameAssembler::maximumSize - 2);
     Bytes tooLarge = largest;
     tooLarge.push_back(0);
     const Bytes first = frame(largest);

@@ -1,6 +1,5 @@
 #include "TelephonyService/LogChannel.h"
 
-#include "Packets/LogPacket.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 
@@ -17,25 +16,6 @@ constexpr int ticksBetweenReports = 20;
 // its next turn comes.
 constexpr int unpacedBatch = 5000;
 constexpr std::chrono::milliseconds unpacedInterval{2};
-
-// The effective log code of a packet that is long enough to have one.
-std::optional<std::uint64_t> codeOf(ByteView message)
-{
-    const ByteView packet = stripPrefix(message);
-    return hasLogCode(packet) ? std::optional<std::uint64_t>(effectiveLogCode(LogPacket(packet)))
-                              : std::nullopt;
-}
-
-void collectCodes(const PlistDictionary& command, std::string_view key, std::uint64_t base,
-                  std::unordered_set<std::uint64_t>& codes)
-{
-    const PlistValue* list = command.find(key);
-    if (!list || !list->array())
-        return;
-    for (const PlistValue& code : *list->array())
-        if (code.integer())
-            codes.insert(code.integer()->bits() + base);
-}
 
 } // namespace
 
@@ -75,21 +55,19 @@ std::optional<Bytes> LogChannel::handleCommand(ByteView command)
 
 void LogChannel::startStreaming(const PlistDictionary& command)
 {
-    // The cell-monitor technology has no log codes: its start command lists none.
-    _wantsAllCodes = !command.contains("SetOrbelLogCodes") && !command.contains("SetQxExtraCodes");
-    _wantedCodes.clear();
-    collectCodes(command, "SetOrbelLogCodes", 0, _wantedCodes);
-    collectCodes(command, "SetQxExtraCodes", extraCodeBase, _wantedCodes);
-
+    _wanted = WantedCodes(command);
     _timer.reset();
+    _source.reset(); // one streaming stops before the next one starts
     _source = _content.makeSource();
     if (!_source)
         return;
+    _source->start(_wanted, [this](ByteView message) { takePushed(message); });
     _elapsed = {};
     fetchNext();
     _timer =
         _queue.repeatEvery(_source->isPaced() ? tickInterval : unpacedInterval, [this] { tick(); });
-    _log.warning("Log channel for {}: streaming {} codes", clientPortName(), _wantedCodes.size());
+    _log.warning("Log channel for {}: streaming {} codes", clientPortName(),
+                 _wanted.codes().size());
 }
 
 void LogChannel::tick()
@@ -105,10 +83,21 @@ void LogChannel::tick()
         reportDrops();
 }
 
+// While something waits, the client has just refused it, and has its next chance at the next tick.
+void LogChannel::takePushed(ByteView message)
+{
+    if (!_wanted.wants(message))
+        return;
+    const bool isFirst = _outgoing.empty();
+    enqueue(Bytes(message.begin(), message.end()));
+    if (isFirst)
+        sendQueued();
+}
+
 void LogChannel::queueDueMessages()
 {
     while (_next && _next->due <= _elapsed) {
-        if (isWanted(_next->data))
+        if (_wanted.wants(_next->data))
             enqueue(std::move(_next->data));
         fetchNext();
     }
@@ -117,7 +106,7 @@ void LogChannel::queueDueMessages()
 void LogChannel::streamUnpaced()
 {
     for (int sent = 0; sent < unpacedBatch && sendQueued() && _next; ++sent) {
-        if (isWanted(_next->data))
+        if (_wanted.wants(_next->data))
             enqueue(std::move(_next->data));
         fetchNext();
     }
@@ -146,14 +135,6 @@ bool LogChannel::sendQueued()
         _outgoing.pop_front();
     }
     return true;
-}
-
-bool LogChannel::isWanted(ByteView message) const
-{
-    if (_wantsAllCodes)
-        return true;
-    const auto code = codeOf(message);
-    return code && _wantedCodes.contains(*code);
 }
 
 void LogChannel::fetchNext()

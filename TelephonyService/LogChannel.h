@@ -9,7 +9,6 @@
 #include <functional>
 #include <memory>
 #include <string>
-#include <unordered_set>
 
 namespace ventrik
 {
@@ -50,12 +49,12 @@ class LogChannel
   private:
     void startStreaming(const PlistDictionary& command);
     void tick();
+    void takePushed(ByteView message);
     void queueDueMessages();
     void streamUnpaced();
     void enqueue(Bytes message);
     /// False when the client takes no more for now.
     bool sendQueued();
-    bool isWanted(ByteView message) const;
     void fetchNext();
     void reportDrops();
 
@@ -64,8 +63,7 @@ class LogChannel
     const LogChannelContent& _content;
     std::shared_ptr<RemotePort> _clientPort;
 
-    bool _wantsAllCodes = false;
-    std::unordered_set<std::uint64_t> _wantedCodes;
+    WantedCodes _wanted;
     std::unique_ptr<MessageSource> _source;
     std::optional<TimedMessage> _next;
     std::unique_ptr<RepeatingTimer> _timer;

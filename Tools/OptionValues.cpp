@@ -70,6 +70,11 @@ double positiveNumberValue(const std::string& text)
     return number;
 }
 
+std::optional<double> speedValue(const std::string& text)
+{
+    return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
+}
+
 std::string directoryValue(const std::string& text)
 {
     std::error_code error;

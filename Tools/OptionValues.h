@@ -4,6 +4,7 @@
 #include "Platform/Technology.h"
 
 #include <cstdint>
+#include <optional>
 #include <stdexcept>
 #include <string>
 
@@ -22,7 +23,8 @@ std::uint32_t wholeNumberValue(const std::string& text);
 std::uint32_t positiveWholeNumberValue(const std::string& text);
 /// Finite and above 0.
 double positiveNumberValue(const std::string& text);
-std::string directoryValue(const std::string& text); ///< one that is there
+std::optional<double> speedValue(const std::string& text); ///< a positive number, or none for "max"
+std::string directoryValue(const std::string& text);       ///< one that is there
 Technology technologyValue(const std::string& text);
 RecordsMode recordsValue(const std::string& text);
 int logLevelValue(const std::string& text); ///< see LogPriority

@@ -1,6 +1,8 @@
 #include "Platform/Linux/LinuxPlatform.h"
+#include "Platform/Linux/LinuxSerialPort.h"
 #include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
+#include "TelephonyService/DiagnosticPort.h"
 #include "TelephonyService/ReplaySource.h"
 #include "TelephonyService/ScenarioCapture.h"
 #include "TelephonyService/Scenarios.h"
@@ -26,27 +28,17 @@ struct ServiceOptions {
     std::optional<std::string> captureToWrite;
     std::uint32_t messageCount = 10000;
     std::optional<ReplayOptions> replay;
+    std::optional<std::string> serialDevice;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };
 
-std::optional<double> speedValue(const std::string& text)
-{
-    return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
-}
-
-Technology scenarioValue(const std::string& text)
-{
-    const Technology technology = technologyValue(text);
-    if (!makeScenario(technology, 1))
-        throw WrongValue(fmt::format("there is no scenario for '{}' yet", text));
-    return technology;
-}
-
 void addScenarioOptions(CommandLine& line, ServiceOptions& result)
 {
-    line.addOption("--technology NAME", "the scenario of that technology: " + technologyNames(),
-                   result.technology, scenarioValue);
+    line.addOption("--technology NAME",
+                   "the scenario of that technology, or what the capture or the port speaks: " +
+                       technologyNames(),
+                   result.technology, technologyValue);
     line.addOption("--seed N",
                    "another drive through the same scenario (default 1); the same number gives "
                    "the same drive",
@@ -72,61 +64,93 @@ void addReplayOptions(CommandLine& line, ReplayOptions& result)
     line.addFlag("--loop", "begins again at the capture's end", result.loop);
 }
 
-void refuseWrongTogether(const CommandLine& line)
+void addSerialOptions(CommandLine& line, ServiceOptions& result)
 {
-    if (line.has("--technology") == line.has("--replay"))
-        line.refuse("either --technology or --replay");
+    line.beginGroup("Serial port");
+    line.addOption("--serial DEVICE",
+                   "streams what a phone's diagnostic port measures, live; while it is away it is "
+                   "tried again every 5 s",
+                   result.serialDevice, textValue);
+}
+
+// A diagnostic port sends records of log codes, and the cell monitor has none.
+bool hasLogCodes(const Technology& technology)
+{
+    return technology.identifier != Technologies::cellMonitor.identifier;
+}
+
+void refuseWrongTogether(const CommandLine& line, const ServiceOptions& options)
+{
+    if (!line.has("--technology") && !line.has("--replay"))
+        line.refuse(line.has("--serial") ? "--serial goes with --technology"
+                                         : "either --technology, --replay or --serial");
+    if (line.has("--serial") && line.has("--replay"))
+        line.refuse("either --replay or --serial");
+    if (line.has("--serial") && !hasLogCodes(*options.technology))
+        line.refuse("the cell monitor's messages do not come from a diagnostic port");
     if (!line.has("--replay") && (line.has("--speed") || line.has("--loop")))
         line.refuse("--speed and --loop go with --replay");
-    if (line.has("--write") && !line.has("--technology"))
-        line.refuse("--write goes with --technology");
+    if (line.has("--write") && (line.has("--replay") || line.has("--serial")))
+        line.refuse("--write goes with a scenario");
 }
 
 ServiceOptions parseArguments(int argc, char** argv)
 {
     CommandLine line("ventrik-telephony",
                      "A telephony service for machines without a baseband: answers the log-channel "
-                     "protocol and streams a built-in scenario, or a capture, to every viewer that "
-                     "connects.");
+                     "protocol and streams a built-in scenario, a capture, or what a phone's "
+                     "diagnostic port measures, to every viewer that connects.");
     ServiceOptions result;
     ReplayOptions replay;
     line.addUsage("--technology NAME [OPTION]...");
     line.addUsage("--replay CAPTURE [OPTION]...");
+    line.addUsage("--serial DEVICE --technology NAME [OPTION]...");
     addScenarioOptions(line, result);
     addReplayOptions(line, replay);
+    addSerialOptions(line, result);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "a signal ended it");
     line.addExitStatus(EXIT_FAILURE, "it could not start");
     line.parse(argc, argv);
-    refuseWrongTogether(line);
+    refuseWrongTogether(line, result);
     if (line.has("--replay"))
         result.replay = replay;
     return result;
 }
 
-// What the service streams, or none with the reason.
-std::optional<LogChannelContent> makeContent(const ServiceOptions& options, SystemLog& log,
-                                             std::string& error)
+LogChannelContent scenarioContent(const ServiceOptions& options)
 {
-    if (options.technology) {
-        return LogChannelContent{
-            std::string(options.technology->identifier),
+    return {std::string(options.technology->identifier),
             [technology = *options.technology, seed = options.seed, records = options.records] {
                 return makeScenario(technology, seed, records);
             }};
-    }
+}
+
+// The one that was named, else the capture's; none with the reason.
+std::optional<Technology> technologyOfReplay(const ServiceOptions& options, std::string& error)
+{
     auto reader = CaptureReader::open(options.replay->capture, error);
-    if (!reader)
-        return std::nullopt;
+    if (!reader || options.technology)
+        return reader ? options.technology : std::nullopt;
     const auto type = reader->linkType();
     const auto technology = type ? reader->technology() : reader->guessTechnology();
-    if (!technology) {
-        error = type ? fmt::format("{}: link type {} names no technology", options.replay->capture,
-                                   *type)
-                     : fmt::format("{}: no record tells the technology", options.replay->capture);
+    if (!technology)
+        error = type ? fmt::format("{}: link type {} names no technology; say which with "
+                                   "--technology",
+                                   options.replay->capture, *type)
+                     : fmt::format("{}: no record tells the technology; say which with "
+                                   "--technology",
+                                   options.replay->capture);
+    return technology;
+}
+
+std::optional<LogChannelContent> replayContent(const ServiceOptions& options, SystemLog& log,
+                                               std::string& error)
+{
+    const auto technology = technologyOfReplay(options, error);
+    if (!technology)
         return std::nullopt;
-    }
     return LogChannelContent{std::string(technology->identifier),
                              [replay = *options.replay, &log]() -> std::unique_ptr<MessageSource> {
                                  std::string reason;
@@ -135,6 +159,11 @@ std::optional<LogChannelContent> makeContent(const ServiceOptions& options, Syst
                                      log.error("Cannot replay {}", reason);
                                  return source;
                              }};
+}
+
+LogChannelContent serialContent(const ServiceOptions& options, DiagnosticPort& port)
+{
+    return {std::string(options.technology->identifier), [&port] { return port.makeSource(); }};
 }
 
 int fail(std::string_view reason)
@@ -171,7 +200,14 @@ int main(int argc, char** argv)
     LinuxPlatform platform(platformOptions);
 
     std::string error;
-    auto content = makeContent(options, platform.log(), error);
+    LinuxSerialPorts serialPorts;
+    std::optional<DiagnosticPort> diagnosticPort;
+    if (options.serialDevice)
+        diagnosticPort.emplace(platform.mainQueue(), serialPorts, platform.log(),
+                               *options.serialDevice);
+    auto content = diagnosticPort   ? serialContent(options, *diagnosticPort)
+                   : options.replay ? replayContent(options, platform.log(), error)
+                                    : scenarioContent(options);
     if (!content)
         return fail(error);
     TelephonyService service(platform.mainQueue(), platform.ports(), platform.log(),
@@ -180,5 +216,7 @@ int main(int argc, char** argv)
         platform.log().flush(); // what it says there comes first
         return fail(error);
     }
+    if (diagnosticPort)
+        diagnosticPort->open();
     return QCoreApplication::exec();
 }

@@ -44,17 +44,26 @@ class LogChannelClient
     }
 
     /// Asks for every message, whatever its code.
-    void startStreaming()
+    void startStreaming() { send(PlistDictionary{{"SetState", "Streaming"}}); }
+    /// Asks for the messages of these codes.
+    void startStreaming(const PlistArray& codes)
     {
-        const Bytes command = propertyListBytes(PlistDictionary{{"SetState", "Streaming"}}).value();
-        constexpr RemotePort::Seconds time{1.0};
-        _remotePort->send(0, command, time, time, RemotePort::Reply::NotWanted);
+        send(PlistDictionary{{"SetState", "Streaming"},
+                             {"SetOrbelLogCodes", codes},
+                             {"SetQxExtraCodes", PlistArray()}});
     }
 
     const std::string& remotePortName() const { return _remotePortName; }
     const std::vector<Bytes>& messages() const { return _messages; }
 
   private:
+    void send(const PlistDictionary& command)
+    {
+        constexpr RemotePort::Seconds time{1.0};
+        _remotePort->send(0, propertyListBytes(command).value(), time, time,
+                          RemotePort::Reply::NotWanted);
+    }
+
     std::string _name;
     CapturingSystemLog _log;
     LinuxMainQueue _mainQueue;

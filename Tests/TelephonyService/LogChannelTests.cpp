@@ -60,6 +60,28 @@ class LogChannelTest : public testing::Test
         return PacketBuilder(code).u8(13, number).build();
     }
 
+    // A source that is pushed, whose start and stop the test sees.
+    struct PushedSource : MessageSource {
+        explicit PushedSource(LogChannelTest& itsTest) : test(itsTest) {}
+        ~PushedSource() override { test.receiver = {}; }
+        void start(const WantedCodes& wanted, Receiver receiver) override
+        {
+            ++test.starts;
+            test.wanted = wanted;
+            test.receiver = std::move(receiver);
+        }
+        std::optional<TimedMessage> next() override { return std::nullopt; }
+
+        LogChannelTest& test;
+    };
+    void usePushedSource()
+    {
+        content.makeSource = [this] { return std::make_unique<PushedSource>(*this); };
+    }
+
+    int starts = 0;
+    WantedCodes wanted;
+    MessageSource::Receiver receiver;
     FakePlatform fake;
     std::deque<TimedMessage> messages;
     bool isPaced = true;
@@ -243,6 +265,60 @@ TEST_F(LogChannelTest, ASourceThatCannotBeMadeStreamsNothing)
     channel->handleCommand(startCommand({7}));
     fake.mainQueue.advance(5s);
     EXPECT_TRUE(fake.ports.sends().empty());
+}
+
+TEST_F(LogChannelTest, TellsTheSourceWhichCodesAreWanted)
+{
+    usePushedSource();
+    const auto channel = makeChannel();
+    channel->handleCommand(startCommand({7, 0xB0C0}, {1}));
+    EXPECT_EQ(starts, 1);
+    EXPECT_FALSE(wanted.wantsAll());
+    EXPECT_THAT(wanted.codes(), testing::UnorderedElementsAre(7, 0xB0C0, 0xFF0001));
+}
+
+TEST_F(LogChannelTest, StopsTheSourceBeforeItStartsANewOne)
+{
+    usePushedSource();
+    const auto channel = makeChannel();
+    channel->handleCommand(startCommand({7}));
+    channel->handleCommand(startCommand({8}));
+    EXPECT_EQ(starts, 2);
+    EXPECT_TRUE(receiver);
+}
+
+TEST_F(LogChannelTest, StopsTheSourceWithTheChannel)
+{
+    usePushedSource();
+    auto channel = makeChannel();
+    channel->handleCommand(startCommand({7}));
+    channel.reset();
+    EXPECT_FALSE(receiver);
+}
+
+TEST_F(LogChannelTest, SendsWhatIsPushedAtOnceIfItIsWanted)
+{
+    usePushedSource();
+    const auto channel = makeChannel();
+    channel->handleCommand(startCommand({7}));
+    receiver(packet(8, 1));
+    receiver(packet(7, 2));
+    EXPECT_THAT(sent(), ElementsAre(2));
+}
+
+TEST_F(LogChannelTest, KeepsWhatIsPushedForASlowClientInOrder)
+{
+    usePushedSource();
+    const auto channel = makeChannel();
+    channel->handleCommand(startCommand({7}));
+    stopReading();
+    receiver(packet(7, 1));
+    receiver(packet(7, 2));
+    goOnReading();
+    receiver(packet(7, 3));
+    EXPECT_THAT(sent(), ElementsAre());
+    fake.mainQueue.advance(50ms);
+    EXPECT_THAT(sent(), ElementsAre(1, 2, 3));
 }
 
 } // namespace ventrik

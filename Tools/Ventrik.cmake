@@ -1,4 +1,4 @@
-add_executable(ventrik DemoDirectory.cpp DemoService.cpp ventrik.cpp)
+add_executable(ventrik OwnDirectory.cpp OwnService.cpp ventrik.cpp)
 target_compile_definitions(ventrik PRIVATE VENTRIK_VERSION="${PROJECT_VERSION}")
 target_link_libraries(ventrik PRIVATE ventrik-app ventrik-tools ventrik-capture)
 # Other programs may look up these two functions in the executable.

@@ -4,9 +4,9 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
 #include "Tools/CommandLine.h"
-#include "Tools/DemoDirectory.h"
-#include "Tools/DemoService.h"
 #include "Tools/OptionValues.h"
+#include "Tools/OwnDirectory.h"
+#include "Tools/OwnService.h"
 
 #include <QApplication>
 #include <QIcon>
@@ -27,7 +27,11 @@ namespace
 
 struct ViewerOptions {
     VentrikAppOptions app;
-    std::string demoTechnology;         // empty: no demo
+    std::string demoTechnology; // empty: no demo
+    std::optional<std::string> serialDevice;
+    std::optional<std::string> capture; // to be replayed
+    std::string speed = "1";            // of the replay
+    std::string technology;             // of the port or the capture
     std::optional<RecordsMode> records; // none: the preference's
     bool remembersRecords = false;
     int logLevel = LogPriority::error;
@@ -55,11 +59,33 @@ QSize sizeValue(const std::string& value)
     return {*width, *height};
 }
 
+// The service reads the capture anew for each channel.
+std::string fileValue(const std::string& text)
+{
+    if (text == "-")
+        throw WrongValue("standard input cannot be replayed");
+    return text;
+}
+
 void addOptions(CommandLine& line, ViewerOptions& result)
 {
     line.addOption("--demo TECHNOLOGY", "brings its own telephony service: " + technologyNames(),
                    result.demoTechnology,
                    [](const std::string& text) { return technologyValue(text).name; });
+    line.addOption("--serial DEVICE",
+                   "shows what a phone's diagnostic port measures, live; goes with --technology",
+                   result.serialDevice, textValue);
+    line.addOption("--replay CAPTURE", "shows a capture, with the pauses it was recorded with",
+                   result.capture, fileValue);
+    line.addOption("--speed FACTOR", "replays that much faster; max: as fast as it can be shown",
+                   result.speed, [](const std::string& text) {
+                       speedValue(text); // which refuses what is none
+                       return text;
+                   });
+    line.addOption(
+        "--technology NAME",
+        "what the port speaks, or the capture where it does not tell: " + technologyNames(),
+        result.technology, [](const std::string& text) { return technologyValue(text).name; });
     line.addFlag("--save-button", "offers Save also where it is switched off",
                  result.app.saveButton);
     line.addOption("--snapshot-directory DIR",
@@ -78,7 +104,22 @@ void addOptions(CommandLine& line, ViewerOptions& result)
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
-    line.addExitStatus(EXIT_FAILURE, "there is no display or no demo service");
+    line.addExitStatus(EXIT_FAILURE,
+                       "there is no display, or no service of its own");
+}
+
+void refuseWrongTogether(const CommandLine& line)
+{
+    if (line.has("--demo") + line.has("--serial") + line.has("--replay") > 1)
+        line.refuse("either --demo, --serial or --replay");
+    if (line.has("--serial") && !line.has("--technology"))
+        line.refuse("--serial goes with --technology");
+    if (line.has("--technology") && !line.has("--serial") && !line.has("--replay"))
+        line.refuse("--technology goes with --serial or --replay");
+    if (line.has("--speed") && !line.has("--replay"))
+        line.refuse("--speed goes with --replay");
+    if (line.has("--remember-records") && !line.has("--records"))
+        line.refuse("--remember-records goes with --records");
 }
 
 ViewerOptions parseArguments(int argc, char** argv)
@@ -90,8 +131,7 @@ ViewerOptions parseArguments(int argc, char** argv)
     result.app.snapshotDirectory = defaultDiagnosticLogDirectory();
     addOptions(line, result);
     line.parse(argc, argv);
-    if (result.remembersRecords && !result.records)
-        line.refuse("--remember-records goes with --records");
+    refuseWrongTogether(line);
     return result;
 }
 
@@ -189,15 +229,38 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     return status;
 }
 
-int runDemo(const ViewerOptions& options, const DemoDirectory& directory)
+// The service that this viewer brings along; none where it goes to the one that is there.
+std::optional<OwnServiceOptions> chooseService(const ViewerOptions& options)
+{
+    QStringList technology;
+    if (!options.technology.empty())
+        technology = {"--technology", QString::fromStdString(options.technology)};
+    if (options.serialDevice)
+        return OwnServiceOptions{
+            "serial",
+            QStringList{"--serial", QString::fromStdString(*options.serialDevice)} + technology};
+    if (options.capture)
+        return OwnServiceOptions{"replay",
+                                 QStringList{"--replay", QString::fromStdString(*options.capture),
+                                             "--speed", QString::fromStdString(options.speed)} +
+                                     technology};
+    if (options.demoTechnology.empty())
+        return std::nullopt;
+    const std::string records(nameOf(options.records.value_or(RecordsMode::Base)));
+    return OwnServiceOptions{"demo",
+                             {"--technology", QString::fromStdString(options.demoTechnology),
+                              "--records", QString::fromStdString(records)}};
+}
+
+int runWithService(const ViewerOptions& options, const OwnServiceOptions& serviceOptions,
+                   const OwnDirectory& directory)
 {
     if (directory.path().empty()) {
-        complain("no directory for the demo: " + directory.error());
+        complain("no directory for a service of its own: " + directory.error());
         return EXIT_FAILURE;
     }
-    DemoService service;
-    if (!service.start(directory, options.demoTechnology,
-                       options.records.value_or(RecordsMode::Base)))
+    OwnService service(serviceOptions);
+    if (!service.start(directory))
         return EXIT_FAILURE;
     return runViewer(options, directory.path());
 }
@@ -213,11 +276,12 @@ int main(int argc, char** argv)
         return EXIT_FAILURE;
     }
     TerminationSignals::block(); // the toolkit starts threads
-    std::optional<DemoDirectory> demoDirectory;
-    if (!options.demoTechnology.empty())
-        demoDirectory.emplace();
+    const auto service = chooseService(options);
+    std::optional<OwnDirectory> directory;
+    if (service)
+        directory.emplace();
     int toolkitArgc = 1;
     const auto application = makeApplication(toolkitArgc, argv);
     const TerminationSignals termination([] { QCoreApplication::quit(); });
-    return demoDirectory ? runDemo(options, *demoDirectory) : runViewer(options, {});
+    return service ? runWithService(options, *service, *directory) : runViewer(options, {});
 }

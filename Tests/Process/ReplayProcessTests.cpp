@@ -85,6 +85,39 @@ TEST_F(ReplayProcess, DropsTheOldestMessagesOfAStoppedViewerAndStaysSmall)
     EXPECT_TRUE(service->isRunning());
 }
 
+TEST_F(ReplayProcess, WithoutPaceEndsInTheTreeThatDecodingGives)
+{
+    for (const std::string technology : {"lte", "gsm", "utran", "c2k", "ifx"}) {
+        const std::string file = path(technology + ".pcap");
+        const auto writing = start(
+            "ventrik-telephony", {"--technology", technology, "--write", file, "--count", "1000"});
+        EXPECT_EQ(writing->waitForEnd(), 0) << writing->errors();
+        const auto decode = start("ventrik-decode", {file});
+        EXPECT_EQ(decode->waitForEnd(), 0) << decode->errors();
+        const auto service = startService({"--replay", file, "--speed", "max"});
+        const auto watch = start("ventrik-watch", {});
+        EXPECT_TRUE(waitUntil([&] { return watch->output().ends_with(decode->output()); }))
+            << decode->output() << "\n---\n"
+            << watch->output();
+    }
+}
+
+TEST_F(ReplayProcess, TakesTheTechnologyThatIsNamedWhereTheCaptureTellsNone)
+{
+    const Bytes untold = PcapBytes(1).record(captureStart, 0, cellInfoMessage(7)).bytes();
+    const std::string file = writeFile("untold.pcap", untold);
+    const auto refused = start("ventrik-telephony", {"--replay", file});
+    EXPECT_EQ(refused->waitForEnd(), 1);
+    EXPECT_THAT(linesOf(refused->errors()),
+                testing::ElementsAre("ventrik-telephony: " + file +
+                                     ": link type 1 names no technology; say which with "
+                                     "--technology"));
+    const auto service = startService({"--replay", file, "--technology", "lte"});
+    const auto watch = start("ventrik-watch", {"--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_TRUE(watch->prints("Physical Cell ID: 7\n")) << watch->output();
+}
+
 TEST_F(ReplayProcess, OfADamagedFileIsRefusedAtTheStart)
 {
     const std::string file = writeFile("no.pcap", "no capture at all, but long enough for one");

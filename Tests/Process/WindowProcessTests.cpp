@@ -289,8 +289,16 @@ TEST_F(WindowProcess, EndsOnACellMonitorMessageThatIsNoPropertyList)
 
 TEST_F(WindowProcess, RefusesWhatIsWrong)
 {
-    expectRefused("ventrik",
-                  {{"--unheard-of"}, {"more"}, {"--demo"}, {"--demo", "5g"}, {"--log-level"}});
+    expectRefused("ventrik", {{"--unheard-of"},
+                              {"more"},
+                              {"--demo"},
+                              {"--demo", "5g"},
+                              {"--log-level"},
+                              {"--demo", "lte", "--replay", "x"},
+                              {"--serial", "/dev/null"},
+                              {"--technology", "lte"},
+                              {"--speed", "2"},
+                              {"--replay", "x", "--speed", "0"}});
 }
 
 TEST_F(WindowProcess, TellsItsUsageAndVersion)

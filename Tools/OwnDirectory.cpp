@@ -1,4 +1,4 @@
-#include "Tools/DemoDirectory.h"
+#include "Tools/OwnDirectory.h"
 
 #include <cerrno>
 #include <chrono>
@@ -54,13 +54,13 @@ void closeStandardStreams()
 
 } // namespace
 
-DemoDirectory::DemoDirectory()
+OwnDirectory::OwnDirectory()
 {
     if (!make() || !startKeeper())
         fail();
 }
 
-bool DemoDirectory::make()
+bool OwnDirectory::make()
 {
     std::error_code error;
     const auto temporary = std::filesystem::temp_directory_path(error);
@@ -71,7 +71,7 @@ bool DemoDirectory::make()
     return true;
 }
 
-bool DemoDirectory::startKeeper()
+bool OwnDirectory::startKeeper()
 {
     int ends[2];
     if (pipe2(ends, O_CLOEXEC) == -1)
@@ -86,14 +86,14 @@ bool DemoDirectory::startKeeper()
     return _keeper != -1;
 }
 
-void DemoDirectory::fail()
+void OwnDirectory::fail()
 {
     _error = std::strerror(errno);
     removeAll(_path);
     _path.clear();
 }
 
-DemoDirectory::~DemoDirectory()
+OwnDirectory::~OwnDirectory()
 {
     if (_lifeline != -1)
         close(_lifeline);

@@ -1,4 +1,4 @@
-#include "Tools/DemoService.h"
+#include "Tools/OwnService.h"
 
 #include "Platform/Linux/PortDirectory.h"
 #include "Platform/Linux/StandardStreams.h"
@@ -37,8 +37,7 @@ std::string lastWords(QProcess& process)
 
 } // namespace
 
-bool DemoService::start(const DemoDirectory& directory, const std::string& technology,
-                        RecordsMode records)
+bool OwnService::start(const OwnDirectory& directory)
 {
     auto environment = QProcessEnvironment::systemEnvironment();
     environment.insert("VENTRIK_RUNTIME_DIR", QString::fromStdString(directory.path()));
@@ -57,8 +56,7 @@ bool DemoService::start(const DemoDirectory& directory, const std::string& techn
             _exit(EXIT_FAILURE);
     });
     _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
-                   {"--technology", QString::fromStdString(technology), "--records",
-                    QString::fromStdString(std::string(nameOf(records)))});
+                   _options.arguments);
     if (!waitUntilListening(directory.path()))
         return false;
     QObject::connect(&_process, &QProcess::finished, qApp, [this] {
@@ -71,7 +69,7 @@ bool DemoService::start(const DemoDirectory& directory, const std::string& techn
     return true;
 }
 
-bool DemoService::waitUntilListening(const std::string& runtimeDirectory)
+bool OwnService::waitUntilListening(const std::string& runtimeDirectory)
 {
     constexpr int longestWait = 5000; // milliseconds
     constexpr int turn = 20;
@@ -84,19 +82,20 @@ bool DemoService::waitUntilListening(const std::string& runtimeDirectory)
             return false;
         }
         if (elapsed.hasExpired(longestWait)) {
-            complain("ventrik", "the demo service does not come up");
+            complain("ventrik", fmt::format("the {} service does not come up", _options.name));
             return false;
         }
     }
     return true;
 }
 
-void DemoService::tellEnd()
+void OwnService::tellEnd()
 {
-    complain("ventrik", "the demo service ended: " + lastWords(_process));
+    complain("ventrik",
+             fmt::format("the {} service ended: {}", _options.name, lastWords(_process)));
 }
 
-DemoService::~DemoService()
+OwnService::~OwnService()
 {
     constexpr int longestWait = 2000; // milliseconds
     _process.disconnect(qApp);

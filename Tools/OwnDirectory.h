@@ -10,13 +10,13 @@ namespace ventrik
 /// A directory of mode 0700 that is gone, with all that is in it, when this object or its process
 /// ends, even where the process is killed: a small process of its own waits for that and removes
 /// it. To be made before any thread is started.
-class DemoDirectory
+class OwnDirectory
 {
   public:
-    DemoDirectory();
-    ~DemoDirectory();
-    DemoDirectory(const DemoDirectory&) = delete;
-    DemoDirectory& operator=(const DemoDirectory&) = delete;
+    OwnDirectory();
+    ~OwnDirectory();
+    OwnDirectory(const OwnDirectory&) = delete;
+    OwnDirectory& operator=(const OwnDirectory&) = delete;
 
     /// Empty when it could not be made; `error` says why then.
     const std::string& path() const { return _path; }

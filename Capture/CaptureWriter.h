@@ -1,27 +1,26 @@
 #pragma once
 
+#include "Capture/PcapOutput.h"
 #include "Files/PrivateFile.h"
 #include "Platform/Clock.h"
 #include "Platform/Technology.h"
 #include "PropertyList/PlistValue.h"
 
-#include <memory>
 #include <optional>
 #include <string>
-
-struct pcap;
-struct pcap_dumper;
+#include <utility>
 
 namespace ventrik
 {
 
 /// Writes a capture: each message of the log channel as one record of a pcap file, with microsecond
-/// times.
+/// times. The file is there when it is whole; one that is there while it grows is a
+/// `GrowingCapture`.
 class CaptureWriter
 {
   public:
     /// The most that readers of the format take in one record.
-    static constexpr std::size_t maximumMessageSize = 262144;
+    static constexpr std::size_t maximumMessageSize = PcapOutput::maximumMessageSize;
 
     /// Begins a file that takes its name, and the place of what has it, at `commit`. On failure
     /// `error` says why in one line.
@@ -36,19 +35,13 @@ class CaptureWriter
     bool commit(std::string& error);
 
   private:
-    struct Closer {
-        void operator()(pcap* handle) const;
-        void operator()(pcap_dumper* dumper) const;
-    };
-    CaptureWriter(PrivateFile file, std::unique_ptr<pcap, Closer> handle,
-                  std::unique_ptr<pcap_dumper, Closer> dumper);
-
-    void noteError();
+    CaptureWriter(PrivateFile file, PcapOutput output)
+        : _file(std::move(file)), _output(std::move(output))
+    {
+    }
 
     PrivateFile _file;
-    std::unique_ptr<pcap, Closer> _handle;
-    std::unique_ptr<pcap_dumper, Closer> _dumper;
-    int _error = 0; // errno of the first write that failed
+    PcapOutput _output;
 };
 
 } // namespace ventrik

@@ -27,6 +27,8 @@ LogChannel::LogChannel(MainQueue& queue, SystemLog& log, const LogChannelContent
 
 LogChannel::~LogChannel()
 {
+    if (_content.observer)
+        _content.observer->streamEnds(*this);
     _clientPort->setInvalidationCallback({});
     _clientPort->invalidate();
     if (_dropped > 0)
@@ -114,6 +116,8 @@ void LogChannel::streamUnpaced()
 
 void LogChannel::enqueue(Bytes message)
 {
+    if (_content.observer)
+        _content.observer->messageStreams(*this, message);
     _outgoingBytes += message.size();
     _outgoing.push_back(std::move(message));
     while (_outgoing.size() > maximumQueuedMessages ||

@@ -13,10 +13,23 @@
 namespace ventrik
 {
 
+class LogChannel;
+
+/// Sees what log channels stream.
+class StreamObserver
+{
+  public:
+    virtual ~StreamObserver() = default;
+    /// The channel has a message for its client, which may be slow and lose it.
+    virtual void messageStreams(const LogChannel& channel, ByteView message) = 0;
+    virtual void streamEnds(const LogChannel& channel) = 0;
+};
+
 /// What a log channel serves: the technology's identifier and how to make its messages.
 struct LogChannelContent {
     std::string technology;
     std::function<std::unique_ptr<MessageSource>()> makeSource;
+    StreamObserver* observer = nullptr; ///< outlives the channels; null: nobody looks
 };
 
 /// The service's end of one log channel: answers "GetTechnology", takes the start command and then

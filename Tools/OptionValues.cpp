@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <charconv>
 #include <cmath>
 #include <cstdlib>
 #include <filesystem>
@@ -27,6 +28,22 @@ constexpr LogLevel logLevels[] = {
     {"notice", LogPriority::notice}, {"warning", LogPriority::warning},
     {"error", LogPriority::error},   {"critical", LogPriority::critical},
     {"alert", LogPriority::alert},   {"emergency", LogPriority::emergency}};
+
+// Of a size in bytes, or of a time in seconds.
+struct RotationUnit {
+    std::string_view name;
+    std::uint64_t bytes;
+    std::uint64_t seconds;
+};
+constexpr RotationUnit rotationUnits[] = {{"K", std::uint64_t{1} << 10, 0},
+                                          {"M", std::uint64_t{1} << 20, 0},
+                                          {"G", std::uint64_t{1} << 30, 0},
+                                          {"s", 0, 1},
+                                          {"min", 0, 60},
+                                          {"h", 0, 3600},
+                                          {"d", 0, 86400}};
+constexpr std::uint64_t longestTime = 3'000'000'000; // in seconds; it can be counted in ns
+constexpr std::uint64_t smallestFile = std::uint64_t{64} << 10;
 
 // "a, b or c"
 std::string alternatives(std::vector<std::string> names)
@@ -73,6 +90,22 @@ double positiveNumberValue(const std::string& text)
 std::optional<double> speedValue(const std::string& text)
 {
     return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
+}
+
+Rotation rotationValue(const std::string& text)
+{
+    std::uint32_t number = 0; // far enough: 2^32 of the largest units
+    const char* end = text.data() + text.size();
+    const auto [unitStart, error] = std::from_chars(text.data(), end, number);
+    const auto* unit =
+        std::ranges::find(rotationUnits, std::string_view(unitStart, end), &RotationUnit::name);
+    if (error != std::errc() || number == 0 || unit == std::end(rotationUnits))
+        throw WrongValue(fmt::format("'{}' is no size such as 100M and no time such as 1h", text));
+    if (unit->seconds > 0)
+        return {std::nullopt, std::chrono::seconds(std::min(number * unit->seconds, longestTime))};
+    if (number * unit->bytes < smallestFile)
+        throw WrongValue(fmt::format("'{}' is less than 64K", text));
+    return {number * unit->bytes, std::nullopt};
 }
 
 std::string directoryValue(const std::string& text)

@@ -3,6 +3,7 @@
 #include "Packets/Layouts.h"
 #include "Platform/Technology.h"
 
+#include <chrono>
 #include <cstdint>
 #include <optional>
 #include <stdexcept>
@@ -16,6 +17,12 @@ struct WrongValue : std::runtime_error {
     using std::runtime_error::runtime_error;
 };
 
+/// When a new file begins: at a size in bytes, or after a time.
+struct Rotation {
+    std::optional<std::uint64_t> size;
+    std::optional<std::chrono::nanoseconds> time;
+};
+
 /// Values of options from their texts; WrongValue for what is none.
 std::string textValue(const std::string& text);
 std::uint32_t wholeNumberValue(const std::string& text);
@@ -24,6 +31,7 @@ std::uint32_t positiveWholeNumberValue(const std::string& text);
 /// Finite and above 0.
 double positiveNumberValue(const std::string& text);
 std::optional<double> speedValue(const std::string& text); ///< a positive number, or none for "max"
+Rotation rotationValue(const std::string& text);           ///< as in "100M" or "1h"
 std::string directoryValue(const std::string& text);       ///< one that is there
 Technology technologyValue(const std::string& text);
 RecordsMode recordsValue(const std::string& text);

@@ -42,7 +42,10 @@ int WatchCommand::run()
 {
     const TerminationSignals termination([] { QCoreApplication::quit(); });
     LinuxPlatform linuxPlatform(platformOptions(_options));
-    const Platform platform = linuxPlatform.platform();
+    Recording recording(programName, linuxPlatform.platform(), _options.recording);
+    if (!recording.isPossible())
+        return EXIT_FAILURE;
+    const Platform platform = recording.platform();
     _model = makeModel(platform);
     const int mostErrorLines = _options.verbose ? linesWhenVerbose : linesOtherwise;
     try {

@@ -4,6 +4,7 @@
 #include "Model/VentrikModel.h"
 #include "Platform/Platform.h"
 #include "Platform/SystemLog.h"
+#include "Tools/Recording.h"
 #include "Tools/Watch/WatchViewer.h"
 
 #include <memory>
@@ -15,6 +16,7 @@ struct WatchOptions {
     bool once = false;  ///< ends after the first tree
     bool plain = false; ///< prints trees on a terminal, too
     RecordsMode records = RecordsMode::Newer;
+    RecordingOptions recording;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };

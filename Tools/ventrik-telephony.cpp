@@ -6,9 +6,11 @@
 #include "TelephonyService/ReplaySource.h"
 #include "TelephonyService/ScenarioCapture.h"
 #include "TelephonyService/Scenarios.h"
+#include "TelephonyService/StreamRecording.h"
 #include "TelephonyService/TelephonyService.h"
 #include "Tools/CommandLine.h"
 #include "Tools/OptionValues.h"
+#include "Tools/Recording.h"
 
 #include <QCoreApplication>
 
@@ -21,6 +23,8 @@ using namespace ventrik;
 namespace
 {
 
+constexpr const char* programName = "ventrik-telephony";
+
 struct ServiceOptions {
     std::optional<Technology> technology;
     std::uint32_t seed = 1;
@@ -29,6 +33,7 @@ struct ServiceOptions {
     std::uint32_t messageCount = 10000;
     std::optional<ReplayOptions> replay;
     std::optional<std::string> serialDevice;
+    RecordingOptions recording;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };
@@ -96,7 +101,7 @@ void refuseWrongTogether(const CommandLine& line, const ServiceOptions& options)
 
 ServiceOptions parseArguments(int argc, char** argv)
 {
-    CommandLine line("ventrik-telephony",
+    CommandLine line(programName,
                      "A telephony service for machines without a baseband: answers the log-channel "
                      "protocol and streams a built-in scenario, a capture, or what a phone's "
                      "diagnostic port measures, to every viewer that connects.");
@@ -108,12 +113,14 @@ ServiceOptions parseArguments(int argc, char** argv)
     addScenarioOptions(line, result);
     addReplayOptions(line, replay);
     addSerialOptions(line, result);
+    addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "a signal ended it");
     line.addExitStatus(EXIT_FAILURE, "it could not start");
     line.parse(argc, argv);
     refuseWrongTogether(line, result);
+    refuseWrongRecording(line);
     if (line.has("--replay"))
         result.replay = replay;
     return result;
@@ -168,7 +175,7 @@ LogChannelContent serialContent(const ServiceOptions& options, DiagnosticPort& p
 
 int fail(std::string_view reason)
 {
-    complain("ventrik-telephony", reason);
+    complain(programName, reason);
     return EXIT_FAILURE;
 }
 
@@ -194,7 +201,7 @@ int main(int argc, char** argv)
     const TerminationSignals termination([] { QCoreApplication::quit(); });
 
     LinuxPlatformOptions platformOptions;
-    platformOptions.programName = "ventrik-telephony";
+    platformOptions.programName = programName;
     platformOptions.verbose = options.verbose;
     platformOptions.logThreshold = options.logLevel;
     LinuxPlatform platform(platformOptions);
@@ -210,6 +217,16 @@ int main(int argc, char** argv)
                                     : scenarioContent(options);
     if (!content)
         return fail(error);
+    std::unique_ptr<CaptureRecorder> recorder;
+    std::optional<StreamRecording> recording;
+    if (!options.recording.path.empty()) {
+        if (!canRecord(programName, options.recording))
+            return EXIT_FAILURE;
+        recorder = makeRecorder(programName, platform.mainQueue(), platform.platform().clock,
+                                platform.log(), options.recording);
+        recorder->setTechnology(technologyOfIdentifier(content->technology));
+        content->observer = &recording.emplace(*recorder);
+    }
     TelephonyService service(platform.mainQueue(), platform.ports(), platform.log(),
                              std::move(*content));
     if (!service.start(error)) {

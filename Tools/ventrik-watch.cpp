@@ -1,6 +1,7 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Tools/CommandLine.h"
 #include "Tools/OptionValues.h"
+#include "Tools/Recording.h"
 #include "Tools/WatchCommand.h"
 
 #include <QCoreApplication>
@@ -23,14 +24,17 @@ WatchOptions parseArguments(int argc, char** argv)
     line.addFlag("--plain", "prints trees on a terminal, too, one in the place of the other",
                  result.plain);
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
+    addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error; from a terminal that "
                        "shows panes, the last 1000 lines at the end",
                        result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
     line.addExitStatus(EXIT_FAILURE,
-                       "the tree could not be written, or the terminal cannot show panes");
+                       "the tree could not be written, the terminal cannot show panes, or nothing "
+                       "can be recorded there");
     line.parse(argc, argv);
+    refuseWrongRecording(line);
     return result;
 }
 

@@ -7,6 +7,7 @@
 #include "Tools/OptionValues.h"
 #include "Tools/OwnDirectory.h"
 #include "Tools/OwnService.h"
+#include "Tools/Recording.h"
 
 #include <QApplication>
 #include <QIcon>
@@ -34,6 +35,7 @@ struct ViewerOptions {
     std::string technology;             // of the port or the capture
     std::optional<RecordsMode> records; // none: the preference's
     bool remembersRecords = false;
+    RecordingOptions recording;
     int logLevel = LogPriority::error;
     bool verbose = false;
 };
@@ -101,11 +103,13 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                    recordsValue);
     line.addFlag("--remember-records", "makes that the preference, for later runs",
                  result.remembersRecords);
+    addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
     line.addExitStatus(EXIT_FAILURE,
-                       "there is no display, or no service of its own");
+                       "there is no display, no service of its own, or nothing can be recorded "
+                       "there");
 }
 
 void refuseWrongTogether(const CommandLine& line)
@@ -132,6 +136,7 @@ ViewerOptions parseArguments(int argc, char** argv)
     addOptions(line, result);
     line.parse(argc, argv);
     refuseWrongTogether(line);
+    refuseWrongRecording(line);
     return result;
 }
 
@@ -219,7 +224,10 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     setWindowIcon(platform.platform().resources);
     VentrikAppOptions appOptions = options.app;
     appOptions.records = chooseRecords(options, platform);
-    VentrikApp app(platform.platform(), appOptions);
+    Recording recording("ventrik", platform.platform(), options.recording);
+    if (!recording.isPossible())
+        return EXIT_FAILURE;
+    VentrikApp app(recording.platform(), appOptions);
     app.applicationDidFinishLaunching();
     running.emplace(Running{app, platform.log()});
     std::atexit(undoSettingAtExit);

@@ -76,7 +76,8 @@ class LinuxSerialPort : public SerialPort
     {
         const QByteArray bytes = _port.readAll();
         if (!_isLost)
-            _events.received(Bytes(bytes.begin(), bytes.end()));
+            _events.received({reinterpret_cast<const std::uint8_t*>(bytes.constData()),
+                              static_cast<std::size_t>(bytes.size())});
     }
 
     void lose(const std::string& reason)

@@ -25,6 +25,7 @@ TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
                                         {"--replay", "x.pcap", "--speed", "0"},
                                         {"--replay", "x.pcap", "--speed", "fast"},
                                         {"--technology", "lte", "--seed", "-x"},
+                                        {"--technology", "lte", "--rotate", "1h"},
                                         {"--technology", "lte", "more"},
                                         {"--technology", "lte", "--records", ""},
                                         {"--technology", "lte", "--log-level", "loud"},
@@ -33,9 +34,13 @@ TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
 
 TEST_F(ToolUsage, WatchRefusesWhatIsWrong)
 {
-    expectRefused(
-        "ventrik-watch",
-        {{"--unheard-of"}, {"more"}, {"--once=1"}, {"--records", "all"}, {"--log-level", ""}});
+    expectRefused("ventrik-watch", {{"--unheard-of"},
+                                    {"more"},
+                                    {"--once=1"},
+                                    {"--records", "all"},
+                                    {"--log-level", ""},
+                                    {"--rotate", "1h"},
+                                    {"--record", "x.pcap", "--rotate", "1"}});
 }
 
 TEST_F(ToolUsage, DecodeRefusesWhatIsWrong)

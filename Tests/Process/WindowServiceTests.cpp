@@ -101,4 +101,18 @@ TEST_F(WindowService, SaysWhyACaptureCannotBeReplayed)
                             path("missing.pcap") + ": No such file or directory"));
 }
 
+TEST_F(WindowService, IsRecorded)
+{
+    const std::string capture = writeFile(
+        "cell.pcap", PcapBytes(lteLinkType).record(captureStart, 0, cellInfoMessage(7)).bytes());
+    const auto window = startReadWindow({"--replay", capture, "--record", path("recorded.pcap")});
+    ASSERT_TRUE(waitUntil([&] { return window->says(" Ventrik – LTE | Updated "); }))
+        << window->errors();
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+    const auto decode = start("ventrik-decode", {path("recorded.pcap")});
+    EXPECT_EQ(decode->waitForEnd(), 0) << decode->errors();
+    EXPECT_TRUE(decode->prints("Physical Cell ID: 7\n")) << decode->output();
+}
+
 } // namespace ventrik

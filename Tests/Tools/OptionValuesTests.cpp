@@ -33,6 +33,31 @@ TEST(OptionValues, TakeWholeNumbersBelowTwoToThe32)
         EXPECT_THROW(wholeNumberValue(text), WrongValue) << text;
 }
 
+TEST(OptionValues, TakeASizeOrATimeForARotation)
+{
+    using namespace std::chrono_literals;
+    EXPECT_EQ(rotationValue("64K").size, 65536U);
+    EXPECT_EQ(rotationValue("100M").size, std::uint64_t{100} << 20);
+    EXPECT_EQ(rotationValue("2G").size, std::uint64_t{2} << 30);
+    EXPECT_FALSE(rotationValue("100M").time);
+    EXPECT_EQ(rotationValue("90s").time, 90s);
+    EXPECT_EQ(rotationValue("15min").time, 15min);
+    EXPECT_EQ(rotationValue("1h").time, 1h);
+    EXPECT_EQ(rotationValue("2d").time, 48h);
+    EXPECT_GT(rotationValue("4294967295d").time, 20000h);
+    EXPECT_FALSE(rotationValue("1h").size);
+    for (const char* text :
+         {"", "100", "0M", "63K", "-1h", "1m", "1.5h", "1 h", "h", "99999999999M"})
+        EXPECT_THROW(rotationValue(text), WrongValue) << text;
+}
+
+TEST(OptionValues, TakeASpeedOrNone)
+{
+    EXPECT_EQ(speedValue("2.5"), 2.5);
+    EXPECT_EQ(speedValue("max"), std::nullopt);
+    EXPECT_THROW(speedValue("fast"), WrongValue);
+}
+
 TEST(OptionValues, TakeNumbersAboveZero)
 {
     EXPECT_EQ(positiveNumberValue("0.5"), 0.5);

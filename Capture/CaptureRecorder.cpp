@@ -171,8 +171,8 @@ void CaptureRecorder::flush()
 
 void CaptureRecorder::fail(const std::string& reason)
 {
-    if (!std::exchange(_hasFailed, true))
-        _tellFailure(fmt::format("the recording ends: {}", reason));
+    _hasFailed = true;
+    _tellFailure(fmt::format("the recording ends: {}", reason));
     _file.reset();
 }
 

@@ -76,8 +76,6 @@ bool GrowingCapture::write(Clock::TimePoint time, ByteView message)
 
 bool GrowingCapture::flush()
 {
-    if (_output.error() != 0)
-        return false;
     if (!_output.flush()) {
         cutToWholeRecords();
         return false;
@@ -93,7 +91,8 @@ void GrowingCapture::addWaiting(std::size_t size)
     _waitingRecords.push_back(static_cast<std::uint32_t>(size));
 }
 
-// The disk may have taken a part of what waited, and must not take the rest later.
+// The disk may have taken a part of what waited, and must not take the rest later; nobody promises
+// that a stream forgets what it failed to write.
 void GrowingCapture::cutToWholeRecords()
 {
     __fpurge(_output.stream());

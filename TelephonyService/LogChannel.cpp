@@ -59,8 +59,7 @@ void LogChannel::startStreaming(const PlistDictionary& command)
 {
     _wanted = WantedCodes(command);
     _timer.reset();
-    _source.reset(); // one streaming stops before the next one starts
-    _source = _content.makeSource();
+    _source = _content.makeSource(); // and the last one's streaming has stopped
     if (!_source)
         return;
     _source->start(_wanted, [this](ByteView message) { takePushed(message); });

@@ -64,7 +64,7 @@ class CaptureRecorderTest : public testing::Test
         EXPECT_TRUE(reader) << error;
         while (const auto message = reader ? reader->next() : std::nullopt)
             result.push_back(message->data[0]);
-        EXPECT_EQ(reader->error(), "");
+        EXPECT_EQ(reader ? reader->error() : "", "");
         return result;
     }
     static Bytes message(std::uint8_t number, std::size_t size = 100)
@@ -304,6 +304,21 @@ TEST_F(FullRecordingTest, IsNotMendedByRoomThatComesLater)
     recorder.reset();
     EXPECT_EQ(failures.size(), 1U);
     EXPECT_THAT(messagesIn("drive.pcap"), IsEmpty());
+}
+
+TEST_F(FullRecordingTest, WritesNothingBehindWhatHasFailedAlsoWhenThereIsRoomAtItsEnd)
+{
+    std::string error;
+    auto capture = GrowingCapture::create(path("drive.pcap"), Technologies::lte, error);
+    ASSERT_TRUE(capture) << error;
+    EXPECT_TRUE(capture->write({}, message(1)));
+    EXPECT_TRUE(capture->write({}, message(2, 2000)));
+    EXPECT_FALSE(capture->flush());
+    limit.reset();
+    EXPECT_FALSE(capture->write({}, message(3)));
+    EXPECT_FALSE(capture->flush());
+    capture.reset();
+    EXPECT_THAT(messagesIn("drive.pcap"), ElementsAre(1));
 }
 
 } // namespace ventrik

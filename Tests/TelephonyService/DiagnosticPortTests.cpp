@@ -171,6 +171,22 @@ TEST_F(DiagnosticPortTest, IsTriedAgainEveryFiveSecondsWhereItIsNotThereAndSaysS
     EXPECT_EQ(log.texts(LogPriority::error).size(), 2U);
 }
 
+TEST_F(DiagnosticPortTest, SaysAgainWhyItCannotBeOpenedOnceItWasOpen)
+{
+    ports.fault = "No such file or directory";
+    port->open();
+    ports.fault.clear();
+    queue.advance(5s);
+    ASSERT_TRUE(ports.isOpen());
+    ports.fault = "No such file or directory";
+    ports.lose("Input/output error");
+    log.clear();
+    queue.advance(10s);
+    EXPECT_THAT(log.texts(LogPriority::error),
+                ElementsAre("/dev/phone cannot be opened, and is tried again every 5 s: "
+                            "No such file or directory"));
+}
+
 TEST_F(DiagnosticPortTest, SetsTheMasksAgainWhenItComesBack)
 {
     port->open();

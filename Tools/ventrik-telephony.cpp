@@ -97,6 +97,8 @@ void refuseWrongTogether(const CommandLine& line, const ServiceOptions& options)
         line.refuse("--speed and --loop go with --replay");
     if (line.has("--write") && (line.has("--replay") || line.has("--serial")))
         line.refuse("--write goes with a scenario");
+    if (line.has("--write") && line.has("--record"))
+        line.refuse("either --write or --record");
 }
 
 ServiceOptions parseArguments(int argc, char** argv)
@@ -189,44 +191,39 @@ int writeCapture(const ServiceOptions& options)
     return fail(error);
 }
 
-} // namespace
+/// What the service streams, on its way into captures.
+struct ServiceRecording {
+    ServiceRecording(const RecordingOptions& options, const PlistValue& technology,
+                     const Platform& platform)
+        : recorder(
+              makeRecorder(programName, platform.mainQueue, platform.clock, platform.log, options)),
+          observer(*recorder)
+    {
+        recorder->setTechnology(technologyOfIdentifier(technology));
+    }
 
-int main(int argc, char** argv)
+    std::unique_ptr<CaptureRecorder> recorder;
+    StreamRecording observer;
+};
+
+int serve(const ServiceOptions& options, LinuxPlatform& platform)
 {
-    prepareStandardStreams();
-    const ServiceOptions options = parseArguments(argc, argv);
-    if (options.captureToWrite)
-        return writeCapture(options);
-    QCoreApplication application(argc, argv);
-    const TerminationSignals termination([] { QCoreApplication::quit(); });
-
-    LinuxPlatformOptions platformOptions;
-    platformOptions.programName = programName;
-    platformOptions.verbose = options.verbose;
-    platformOptions.logThreshold = options.logLevel;
-    LinuxPlatform platform(platformOptions);
-
-    std::string error;
     LinuxSerialPorts serialPorts;
     std::optional<DiagnosticPort> diagnosticPort;
     if (options.serialDevice)
         diagnosticPort.emplace(platform.mainQueue(), serialPorts, platform.log(),
                                *options.serialDevice);
+    std::string error;
     auto content = diagnosticPort   ? serialContent(options, *diagnosticPort)
                    : options.replay ? replayContent(options, platform.log(), error)
                                     : scenarioContent(options);
     if (!content)
         return fail(error);
-    std::unique_ptr<CaptureRecorder> recorder;
-    std::optional<StreamRecording> recording;
-    if (!options.recording.path.empty()) {
-        if (!canRecord(programName, options.recording))
-            return EXIT_FAILURE;
-        recorder = makeRecorder(programName, platform.mainQueue(), platform.platform().clock,
-                                platform.log(), options.recording);
-        recorder->setTechnology(technologyOfIdentifier(content->technology));
-        content->observer = &recording.emplace(*recorder);
-    }
+    std::optional<ServiceRecording> recording;
+    if (!options.recording.path.empty())
+        content->observer =
+            &recording.emplace(options.recording, content->technology, platform.platform())
+                 .observer;
     TelephonyService service(platform.mainQueue(), platform.ports(), platform.log(),
                              std::move(*content));
     if (!service.start(error)) {
@@ -236,4 +233,25 @@ int main(int argc, char** argv)
     if (diagnosticPort)
         diagnosticPort->open();
     return QCoreApplication::exec();
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    prepareStandardStreams();
+    const ServiceOptions options = parseArguments(argc, argv);
+    if (options.captureToWrite)
+        return writeCapture(options);
+    if (!canRecord(programName, options.recording))
+        return EXIT_FAILURE;
+    QCoreApplication application(argc, argv);
+    const TerminationSignals termination([] { QCoreApplication::quit(); });
+
+    LinuxPlatformOptions platformOptions;
+    platformOptions.programName = programName;
+    platformOptions.verbose = options.verbose;
+    platformOptions.logThreshold = options.logLevel;
+    LinuxPlatform platform(platformOptions);
+    return serve(options, platform);
 }

@@ -69,7 +69,7 @@ std::string fileValue(const std::string& text)
     return text;
 }
 
-void addOptions(CommandLine& line, ViewerOptions& result)
+void addServiceOptions(CommandLine& line, ViewerOptions& result)
 {
     line.addOption("--demo TECHNOLOGY", "brings its own telephony service: " + technologyNames(),
                    result.demoTechnology,
@@ -88,6 +88,11 @@ void addOptions(CommandLine& line, ViewerOptions& result)
         "--technology NAME",
         "what the port speaks, or the capture where it does not tell: " + technologyNames(),
         result.technology, [](const std::string& text) { return technologyValue(text).name; });
+}
+
+void addOptions(CommandLine& line, ViewerOptions& result)
+{
+    addServiceOptions(line, result);
     line.addFlag("--save-button", "offers Save also where it is switched off",
                  result.app.saveButton);
     line.addOption("--snapshot-directory DIR",

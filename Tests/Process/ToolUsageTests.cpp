@@ -26,6 +26,7 @@ TEST_F(ToolUsage, TelephonyRefusesWhatIsWrong)
                                         {"--replay", "x.pcap", "--speed", "fast"},
                                         {"--technology", "lte", "--seed", "-x"},
                                         {"--technology", "lte", "--rotate", "1h"},
+                                        {"--technology", "lte", "--write", "x", "--record", "y"},
                                         {"--technology", "lte", "more"},
                                         {"--technology", "lte", "--records", ""},
                                         {"--technology", "lte", "--log-level", "loud"},

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Core/LogGenerator.h"
 #include "Model/DisplayTree.h"
+#include "Model/MessageObserver.h"
 #include "Platform/Platform.h"
 
 #include <functional>
@@ -64,6 +65,9 @@ class VentrikModel : public DisplayTree
     /// than before; also while nothing new has arrived.
     void setChannelCallback(std::function<void()> callback);
 
+    /// Null for none. Before the first message, and it outlives the model.
+    void observeMessages(MessageObserver* observer) { _observer = observer; }
+
     bool createPorts();
     void destroyPorts();
     void configureGenerator();
@@ -92,6 +96,7 @@ class VentrikModel : public DisplayTree
     /// Without a port the result is `PortError::invalidPort`.
     RemotePort::SendResult sendCommand(const Bytes& command, RemotePort::Seconds replyTimeout,
                                        RemotePort::Reply reply);
+    void tellObserver(const LogGenerator* generator, std::string_view technology);
     void retryLater();
     void setFault(ChannelFault fault) { _attemptFault = fault; }
     /// Tells the screens where the channel's state is not what they were told last.
@@ -114,6 +119,7 @@ class VentrikModel : public DisplayTree
     ModelNodePointer _nodes;
     std::optional<PathIndex> _nodesByPath;
 
+    MessageObserver* _observer = nullptr;
     std::function<void()> _channelCallback;
     ChannelFault _attemptFault = ChannelFault::None; // of the attempt that is being made
     ChannelFault _channelFault = ChannelFault::None;

@@ -19,9 +19,9 @@ namespace ventrik
 
 struct RowOptions {
     RowFormat format = RowFormat::JsonLines;
-    PathSelection selection;
+    PathSelection selection = {};
     /// The state at each such step in the place of the changes.
-    std::optional<std::chrono::nanoseconds> every;
+    std::optional<std::chrono::nanoseconds> every = {};
 };
 
 /// The rows of one capture: what each message changed in the display, or at each step all values as
@@ -41,6 +41,8 @@ class CaptureRows
     void finish(const PlistDictionary& state);
 
     std::string& text() { return _text; }
+    /// Counts on from what was before, of the same capture.
+    void continueFrom(const RowClosing& closing) { _closing = closing; }
     /// What the closing row counts.
     RowClosing closing() const { return _closing; }
     void close(const RowClosing& closing) { _writer.appendClosing(_text, closing); }

@@ -41,12 +41,17 @@ LinuxPlatformOptions platformOptions(const WatchOptions& options)
 int WatchCommand::run()
 {
     const TerminationSignals termination([] { QCoreApplication::quit(); });
+    if (_options.rows)
+        _output = takeStandardOutput(_options.verbose ? OthersOutput::ToStandardError
+                                                      : OthersOutput::Nowhere);
     LinuxPlatform linuxPlatform(platformOptions(_options));
     Recording recording(programName, linuxPlatform.platform(), _options.recording);
     if (!recording.isPossible())
         return EXIT_FAILURE;
     const Platform platform = recording.platform();
     _model = makeModel(platform);
+    if (_options.rows)
+        _model->observeMessages(&_rows.emplace(*_options.rows, _options.records));
     const int mostErrorLines = _options.verbose ? linesWhenVerbose : linesOtherwise;
     try {
         if (showsPanes())
@@ -63,12 +68,18 @@ int WatchCommand::run()
         linuxPlatform.log().flush(); // while that is still kept from the screen
     _viewer.reset();
     _model.reset();
+    if (_rows && status == EXIT_SUCCESS) {
+        _rows->close();
+        if (!print(_rows->takeText()))
+            return tellOutputFailure(programName, "standard output", errno);
+    }
     return status;
 }
 
 bool WatchCommand::showsPanes() const
 {
-    return !_options.once && !_options.plain && isatty(STDIN_FILENO) && isatty(STDOUT_FILENO);
+    return !_options.once && !_options.plain && !_options.rows && isatty(STDIN_FILENO) &&
+           isatty(STDOUT_FILENO);
 }
 
 std::unique_ptr<VentrikModel> WatchCommand::makeModel(const Platform& platform)
@@ -81,8 +92,19 @@ void WatchCommand::refresh()
 {
     if (_viewer)
         _viewer->refresh();
+    else if (_rows)
+        printRows();
     else
         printTree();
+}
+
+void WatchCommand::printRows()
+{
+    _model->topLevelNodes(); // ends the period, whose raw packets are kept until then
+    if (!print(_rows->takeText()))
+        QCoreApplication::exit(tellOutputFailure(programName, "standard output", errno));
+    else if (_options.once)
+        QCoreApplication::quit();
 }
 
 void WatchCommand::printTree()
@@ -97,16 +119,22 @@ void WatchCommand::printTree()
 }
 
 // On a terminal the new tree takes the place of the old one; elsewhere, and where it is the only
-// one, nothing is cleared. False, with errno, when it could not be written. A reader that takes
-// nothing is waited for, but not against the wish that the program ends.
+// one, nothing is cleared.
 bool WatchCommand::print(const VentrikModelNode& root) const
 {
     std::string text;
     if (isatty(STDOUT_FILENO) && (_options.plain || !_options.once))
         text += clearScreen;
     text += ventrik::printTree(root, *_model);
+    return print(text);
+}
+
+// False, with errno, when it could not be written. A reader that takes nothing is waited for, but
+// not against the wish that the program ends.
+bool WatchCommand::print(std::string_view text) const
+{
     std::string_view rest = text;
-    while (!writeText(STDOUT_FILENO, rest, Patience::Brief))
+    while (!writeText(_output, rest, Patience::Brief))
         if (errno != EAGAIN || TerminationSignals::haveCome())
             return errno == EAGAIN;
     return true;

@@ -4,17 +4,23 @@
 #include "Model/VentrikModel.h"
 #include "Platform/Platform.h"
 #include "Platform/SystemLog.h"
+#include "Tools/LiveRows.h"
 #include "Tools/Recording.h"
 #include "Tools/Watch/WatchViewer.h"
 
 #include <memory>
+#include <optional>
+#include <string_view>
+
+#include <unistd.h>
 
 namespace ventrik
 {
 
 struct WatchOptions {
-    bool once = false;  ///< ends after the first tree
-    bool plain = false; ///< prints trees on a terminal, too
+    bool once = false;              ///< ends after the first tree
+    bool plain = false;             ///< prints trees on a terminal, too
+    std::optional<RowOptions> rows; ///< prints rows instead
     RecordsMode records = RecordsMode::Newer;
     RecordingOptions recording;
     int logLevel = LogPriority::error;
@@ -35,9 +41,13 @@ class WatchCommand
     std::unique_ptr<VentrikModel> makeModel(const Platform& platform);
     void refresh();
     void printTree();
+    void printRows();
+    bool print(std::string_view text) const;
     bool print(const VentrikModelNode& root) const;
 
     WatchOptions _options;
+    int _output = STDOUT_FILENO;   // where the result goes
+    std::optional<LiveRows> _rows; // where they are printed
     std::unique_ptr<VentrikModel> _model;
     std::unique_ptr<WatchViewer> _viewer; // none: trees are printed
 };

@@ -5,11 +5,10 @@
 
 #include <chrono>
 #include <csignal>
+#include <cstdio>
 #include <map>
 
-#include <fcntl.h>
 #include <fmt/format.h>
-#include <unistd.h>
 
 using namespace ventrik;
 
@@ -178,15 +177,12 @@ Options parseArguments(int argc, char** argv)
     return result;
 }
 
-// Standard output is for the result alone: whatever else is written there, the farewell of the
-// class index above all, goes to standard error where that is asked for, or else nowhere.
-std::FILE* takeStandardOutput(bool verbose)
+// The farewell of the class index, above all, is none of the result.
+std::FILE* openOutput(bool verbose)
 {
-    const int descriptor = dup(STDOUT_FILENO);
-    std::FILE* output = descriptor >= 0 ? fdopen(descriptor, "w") : nullptr;
-    dup2(verbose ? STDERR_FILENO : open("/dev/null", O_WRONLY), STDOUT_FILENO);
-    std::setvbuf(stdout, nullptr, _IOLBF, BUFSIZ); // so that it comes in its place
-    return output;
+    const int descriptor =
+        takeStandardOutput(verbose ? OthersOutput::ToStandardError : OthersOutput::Nowhere);
+    return descriptor >= 0 ? fdopen(descriptor, "w") : nullptr;
 }
 
 // A second Ctrl+C ends at once. A read that waits for standard input is not taken up again. In the
@@ -213,7 +209,7 @@ int main(int argc, char** argv)
         endOnInterrupt();
         return reportUnknownRecords(options.report);
     }
-    std::FILE* output = takeStandardOutput(options.decode().verbose);
+    std::FILE* output = openOutput(options.decode().verbose);
     if (!output) {
         complain("ventrik-decode", "standard output is closed");
         return DecodeStatus::badInput;

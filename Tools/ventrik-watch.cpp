@@ -7,6 +7,8 @@
 #include <QCoreApplication>
 
 #include <cstdlib>
+#include <string>
+#include <vector>
 
 using namespace ventrik;
 
@@ -20,9 +22,14 @@ WatchOptions parseArguments(int argc, char** argv)
                      "keys. Where standard input or output is no terminal, prints the tree each "
                      "time something new has arrived.");
     WatchOptions result;
+    std::vector<std::string> selected;
     line.addFlag("--once", "prints the first tree and ends", result.once);
     line.addFlag("--plain", "prints trees on a terminal, too, one in the place of the other",
                  result.plain);
+    line.addFlag("--rows", "prints rows of values as they change, as ventrik-decode --format rows",
+                 [&] { result.rows.emplace(); });
+    line.addOption("--select PATH", "of the rows those of the values there and below",
+                   [&](const std::string& path) { selected.push_back(textValue(path)); });
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,
@@ -35,6 +42,10 @@ WatchOptions parseArguments(int argc, char** argv)
                        "can be recorded there");
     line.parse(argc, argv);
     refuseWrongRecording(line);
+    if (!selected.empty() && !result.rows)
+        line.refuse("--select goes with --rows");
+    if (result.rows)
+        result.rows->selection = PathSelection(selected);
     return result;
 }
 

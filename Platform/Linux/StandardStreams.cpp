@@ -76,6 +76,15 @@ void complain(std::string_view program, std::string_view reason, Patience patien
     writeText(STDERR_FILENO, std::string_view(line), patience);
 }
 
+int takeStandardOutput(OthersOutput others)
+{
+    const int descriptor = dup(STDOUT_FILENO);
+    dup2(others == OthersOutput::ToStandardError ? STDERR_FILENO : open("/dev/null", O_WRONLY),
+         STDOUT_FILENO);
+    std::setvbuf(stdout, nullptr, _IOLBF, BUFSIZ); // so that it comes in its place
+    return descriptor;
+}
+
 int tellOutputFailure(std::string_view program, std::string_view what, int error)
 {
     if (error == EPIPE)

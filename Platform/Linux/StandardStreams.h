@@ -32,6 +32,11 @@ inline bool writeText(int descriptor, std::string_view&& text, Patience patience
 void complain(std::string_view program, std::string_view reason,
               Patience patience = Patience::Brief);
 
+/// For programs whose standard output is their result alone: gives a descriptor of it, and has what
+/// others write there go to standard error, or nowhere. -1 where standard output is closed.
+enum class OthersOutput { ToStandardError, Nowhere };
+int takeStandardOutput(OthersOutput others);
+
 /// The exit status of a program that cannot write what it was started for, with the errno of that:
 /// 1, and the reason on standard error; or 141 in silence when whoever read it has gone.
 int tellOutputFailure(std::string_view program, std::string_view what, int error);

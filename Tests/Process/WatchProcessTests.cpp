@@ -51,6 +51,32 @@ TEST_F(WatchProcess, NamesARecordWhoseLayoutIsNotKnownBelowItsSection)
                           "    Measured RSRP"));
 }
 
+TEST_F(WatchProcess, PrintsRowsAsTheyComeAndTheEnd)
+{
+    const auto capture = PcapBytes(lteLinkType)
+                             .record(captureStart, 0, cellInfoMessage(301))
+                             .record(captureStart, 1, antennaMessage(2));
+    const auto service = startReplay("cells.pcap", capture.bytes());
+    const auto watch =
+        start("ventrik-watch", {"--rows", "--select", "/Serving Cell Info/Physical Cell ID"});
+    EXPECT_TRUE(waitUntil([&] { return watch->prints("\"text\":\"301\"}\n"); }))
+        << watch->output() << watch->errors();
+    watch->send(SIGTERM);
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    const auto lines = linesOf(watch->output());
+    EXPECT_THAT(lines.front(), StartsWith("{\"capture\":\"live\",\"record\":0,\"time\":\""));
+    EXPECT_THAT(lines.back(), StartsWith("{\"capture\":\"live\",\"status\":\"ok\""));
+    EXPECT_THAT(lines.back(), HasSubstr("\"records\":2,\"decoded\":2,"));
+}
+
+TEST_F(WatchProcess, OncePrintsTheRowsUpToTheFirstRefresh)
+{
+    const auto service = startScenario();
+    const auto watch = start("ventrik-watch", {"--rows", "--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("\"path\":\"/Serving Cell Info/Physical Cell ID\""));
+}
+
 TEST_F(WatchProcess, ReadsRecordsAsItIsTold)
 {
     const Bytes state = PacketBuilder(0xB0EE).size(32).u8(13, 2).u8(14, 3).build();

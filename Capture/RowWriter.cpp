@@ -139,7 +139,10 @@ std::string rowHeading(RowFormat format)
 }
 
 RowWriter::RowWriter(RowFormat format, std::string_view capture, std::string_view technology)
-    : _format(format), _technology(technology), _csvEnd(nothings(closingColumns) + "\n")
+    : _format(format),
+      _technology(technology),
+      _csvEnd(nothings(closingColumns) + "\n"),
+      _kindParts(kindPartCount)
 {
     if (isJson()) {
         _capture = "{\"capture\":";
@@ -203,27 +206,29 @@ std::string_view RowWriter::recordPart(const RowRecord& record)
         addName(_secondPart, "time");
         _secondPart += fmt::format(FMT_COMPILE("{}{:%FT%T}."), isJson() ? "\"" : "", second);
     }
-    _recordPart = _capture;
-    _recordPart += isJson() ? ",\"record\":" : ",";
+    // What all rows begin with stays.
+    if (_recordPart.empty()) {
+        _recordPart = _capture + (isJson() ? ",\"record\":" : ",");
+        _recordStart = _recordPart.size();
+    }
+    _recordPart.resize(_recordStart);
     appendDigits(_recordPart, record.number);
     _recordPart += _secondPart;
     // Of seven digits the last six.
     const fmt::format_int fraction(1000000U +
                                    static_cast<std::uint32_t>((micros - second).count()));
     _recordPart.append(fraction.data() + 1, fraction.size() - 1);
-    _recordPart += isJson() ? "Z\"" : "Z";
     _recordPart += kindPart(record);
     return _recordPart;
 }
 
 std::string_view RowWriter::kindPart(const RowRecord& record)
 {
-    _kindParts.resize(kindPartCount);
     KindPart& part = _kindParts[(record.kind ? hashOf(*record.kind) : 0) % kindPartCount];
     if (!part.text.empty() && part.subscription == record.subscription &&
         areAlike(part.kind, record.kind))
         return part.text;
-    part = {record.subscription, record.kind, {}};
+    part = {record.subscription, record.kind, isJson() ? "Z\"" : "Z"};
     addNumber(part.text, "subscription", record.subscription);
     addTextOrNull(part.text, "technology", _technology);
     if (record.kind)

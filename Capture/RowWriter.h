@@ -77,7 +77,7 @@ class RowWriter
     void appendClosing(std::string& rows, const RowClosing& closing) const;
 
   private:
-    /// The columns that tell the kind of a record.
+    /// The columns that tell the kind of a record, behind the end of the time.
     struct KindPart {
         std::optional<std::uint32_t> subscription;
         std::optional<RecordKind> kind;
@@ -98,11 +98,12 @@ class RowWriter
     RowFormat _format;
     std::string _capture; // the column of that name
     std::string _technology;
+    std::string _csvEnd; // of a row
     std::string _recordPart;
+    std::size_t _recordStart = 0;     // of its number in that part
     std::vector<KindPart> _kindParts; // each where its kind leads
     std::chrono::sys_seconds _second{};
     std::string _secondPart; // of that second; empty while there is none
-    std::string _csvEnd;     // of a row
 };
 
 } // namespace ventrik

@@ -153,10 +153,8 @@ void DisplayChanges::compareWith(DisplayGroup& group, Container& container)
 
 template <typename Container>
 void DisplayChanges::compareValues(DisplayGroup& group, const Container& container,
-                                   std::vector<std::size_t>& entries)
+                                   const std::vector<std::size_t>& entries)
 {
-    std::ranges::sort(entries);
-    entries.erase(std::unique(entries.begin(), entries.end()), entries.end());
     for (const std::size_t entry : entries)
         if (entry < group.entries.size())
             compareValue(group.entries[entry], valueAt(container, entry), false);

@@ -97,7 +97,7 @@ class DisplayChanges
     void compareWith(DisplayGroup& group, Container& container);
     template <typename Container>
     void compareValues(DisplayGroup& group, const Container& container,
-                       std::vector<std::size_t>& entries);
+                       const std::vector<std::size_t>& entries);
     void compareAll(DisplayGroup& group, const PlistArray& array);
     void compareAll(DisplayGroup& group, const PlistDictionary& dictionary);
     void findDoubles(DisplayGroup& group) const;

@@ -128,9 +128,9 @@ void CaptureRows::writeRow(std::string_view recordPart, const DisplayChange& cha
     const KnownPlace& known = knownPlace(*change.place, state);
     if (!known.isSelected)
         return;
-    _text += recordPart;
-    _text += known.part;
-    _text += valuePart(_changes.cellAt(*change.place, state), change.place->text);
+    const std::string_view value =
+        valuePart(_changes.cellAt(*change.place, state), change.place->text);
+    _text.append(recordPart).append(known.part).append(value);
     ++_closing.rows;
 }
 

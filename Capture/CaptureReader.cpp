@@ -22,7 +22,7 @@ namespace
 // Log codes are numbered by the part of the baseband that writes them: their upper four bits.
 const Technology* technologyOfRecord(ByteView message)
 {
-    const LogPacket packet(message.size() < transportPrefixSize ? message : stripPrefix(message));
+    const LogPacket packet(stripPrefix(message));
     const std::uint32_t code = effectiveLogCode(packet);
     if (packet.size() < logPacketHeaderSize || !recordOf(code))
         return nullptr;

@@ -15,11 +15,6 @@ bool isRecord(const LogPacket& packet)
            (type == ordinaryPacketType || type == extraCodePacketType);
 }
 
-LogPacket packetOf(ByteView message)
-{
-    return LogPacket(message.size() < transportPrefixSize ? message : stripPrefix(message));
-}
-
 } // namespace
 
 void RecordCensus::take(ByteView message)
@@ -35,7 +30,7 @@ void RecordCensus::take(ByteView message)
         return;
     }
     if (counted == _kinds.end()) {
-        const ByteView payload = packetOf(message).payload();
+        const ByteView payload = LogPacket(stripPrefix(message)).payload();
         counted = _kinds.insert({*kind, {0, Bytes(payload.begin(), payload.end())}}).first;
     }
     ++counted->second.count;
@@ -43,7 +38,7 @@ void RecordCensus::take(ByteView message)
 
 std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode)
 {
-    const LogPacket packet = packetOf(message);
+    const LogPacket packet(stripPrefix(message));
     if (!isRecord(packet))
         return std::nullopt;
     const std::uint32_t code = effectiveLogCode(packet);

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "Packets/WantedCodes.h"
 #include "PropertyList/PlistValue.h"
-#include "TelephonyService/WantedCodes.h"
 
 #include <chrono>
 #include <functional>

@@ -1,7 +1,5 @@
 #include "Tools/CaptureRows.h"
 
-#include "Packets/LogPacket.h"
-
 #include <functional>
 #include <utility>
 
@@ -17,16 +15,6 @@ constexpr std::size_t maximumKnownPlaces = 65536;
 constexpr unsigned knownValueBits = 13;
 constexpr unsigned knownValueShift = 64 - knownValueBits;
 
-void addCodes(const PlistDictionary& command, std::string_view key, std::uint64_t base,
-              std::unordered_set<std::uint64_t>& codes)
-{
-    const PlistValue* list = command.find(key);
-    if (!list || !list->array())
-        return;
-    for (const PlistValue& code : *list->array())
-        codes.insert(code.integer()->bits() + base);
-}
-
 } // namespace
 
 CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
@@ -34,15 +22,11 @@ CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
                          RecordsMode records)
     : _options(options),
       _records(records),
-      _generator(generator),
       _changes(generator),
-      _writer(options.format, capture, technology.name)
+      _writer(options.format, capture, technology.name),
+      _wanted(generator.getStartCommand())
 {
     _values.resize(std::size_t{1} << knownValueBits);
-    const PlistDictionary command = generator.getStartCommand();
-    _areRecords = command.contains("SetOrbelLogCodes");
-    addCodes(command, "SetOrbelLogCodes", 0, _wanted);
-    addCodes(command, "SetQxExtraCodes", extraCodeBase, _wanted);
 }
 
 void CaptureRows::runStepsBefore(Clock::TimePoint time, const PlistDictionary& state)
@@ -83,10 +67,7 @@ void CaptureRows::finish(const PlistDictionary& state)
 void CaptureRows::count(const CapturedMessage& message)
 {
     _closing.bytes += message.data.size();
-    const ByteView packet =
-        message.data.size() < transportPrefixSize ? message.data : stripPrefix(message.data);
-    if (!_areRecords || (packet.size() >= logPacketHeaderSize &&
-                         _wanted.contains(effectiveLogCode(LogPacket(packet)))))
+    if (_wanted.wants(message.data))
         ++_closing.decoded;
 }
 
@@ -97,7 +78,7 @@ void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictio
         return;
     const RowRecord none{_closing.records, message.time, message.subscription, {}};
     RowRecord record = none;
-    if (_areRecords)
+    if (!_wanted.wantsAll())
         record.kind = recordKindOf(message.data, _records);
     if (!std::exchange(_hasDisplay, true)) {
         // It also shows what no record told.

@@ -4,6 +4,7 @@
 #include "Capture/RowWriter.h"
 #include "LogGenerator/Core/LogGenerator.h"
 #include "Model/DisplayChanges.h"
+#include "Packets/WantedCodes.h"
 #include "Platform/Technology.h"
 #include "Tools/PathSelection.h"
 
@@ -11,7 +12,6 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <unordered_set>
 #include <vector>
 
 namespace ventrik
@@ -77,14 +77,12 @@ class CaptureRows
 
     RowOptions _options;
     RecordsMode _records;
-    const LogGenerator& _generator;
     DisplayChanges _changes;
     RowWriter _writer;
     std::string _text;
     RowClosing _closing;
-    bool _areRecords;                          // of log codes; else property lists
-    std::unordered_set<std::uint64_t> _wanted; // log codes
-    std::vector<KnownPlace> _places;           // by number, as far as they are kept
+    WantedCodes _wanted; ///< what the decoders ask for; all where messages are property lists
+    std::vector<KnownPlace> _places; // by number, as far as they are kept
     KnownPlace _otherPlace;
     std::vector<KnownValue> _values; // each where its field and its number lead
     bool _hasDisplay = false;        // there were changes already

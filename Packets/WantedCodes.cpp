@@ -1,4 +1,4 @@
-#include "TelephonyService/WantedCodes.h"
+#include "Packets/WantedCodes.h"
 
 #include "Packets/LogPacket.h"
 

@@ -63,10 +63,10 @@ DiagnosticPort::~DiagnosticPort()
 {
     if (!_port)
         return;
-    if (!_connection->masks.empty()) {
+    if (!_connection->masks.empty())
         _port->write(LogMasks::disablingCommand());
-        _port->flush(farewellTime);
-    }
+    // The last channel may have left just now: what was written then is still on its way.
+    _port->flush(farewellTime);
     reportCounts();
 }
 

@@ -138,6 +138,20 @@ TEST_F(DiagnosticPortTest, DisablesAllAtItsEndAndWaitsForThat)
     EXPECT_FALSE(ports.isOpen());
 }
 
+TEST_F(DiagnosticPortTest, WaitsAtItsEndForWhatTheLastChannelsLeavingWrote)
+{
+    port->open();
+    {
+        const Channel channel(*port, {0xB193});
+        queue.run();
+    }
+    queue.run();
+    ASSERT_EQ(ports.flushes, 0);
+    port.reset();
+    EXPECT_EQ(ports.flushes, 1);
+    EXPECT_EQ(ports.written.back(), LogMasks::disablingCommand());
+}
+
 TEST_F(DiagnosticPortTest, GivesEachRecordToAllChannels)
 {
     port->open();

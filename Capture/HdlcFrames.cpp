@@ -147,4 +147,11 @@ void FrameAssembler::tell(std::vector<std::string>& notes, std::string_view name
     _unfinished.tell(notes, name, "unfinished frame", "at the end");
 }
 
+void FrameAssembler::addTo(PlistDictionary& report) const
+{
+    report.set("Bad Checksums", _badChecksums.text());
+    _tooShort.addTo(report, "Junk Between Frames");
+    _tooLarge.addTo(report, "Frames Above 1 MiB");
+}
+
 } // namespace ventrik

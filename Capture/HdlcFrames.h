@@ -42,6 +42,8 @@ class FrameAssembler
     void end();
     /// What was skipped so far, a line for each kind, behind the capture's name.
     void tell(std::vector<std::string>& notes, std::string_view name) const;
+    /// The same as rows of a display; bad checksums also where there are none.
+    void addTo(PlistDictionary& report) const;
 
   private:
     void beginFrame();

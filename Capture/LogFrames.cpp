@@ -44,6 +44,7 @@ std::optional<CapturedMessage> LogFrames::record(const HdlcFrame& frame)
         _badRecords.add(frame.offset);
         return std::nullopt;
     }
+    ++_recordCount;
     _time = timeOfTimestamp(LogPacket(_packet).littleEndianWord(timestampOffset)).value_or(_time);
     return CapturedMessage{_time, _packet, subscription};
 }
@@ -68,6 +69,17 @@ void LogFrames::tell(std::vector<std::string>& notes, std::string_view name) con
         if (const auto count = _otherKinds.at(kind); count > 0)
             notes.push_back(fmt::format("{}: {} frame{} of kind 0x{:02X}", name, count,
                                         count == 1 ? "" : "s", kind));
+    }
+}
+
+void LogFrames::addTo(PlistDictionary& report) const
+{
+    report.set("Log Records", fmt::format("{}", _recordCount));
+    _badRecords.addTo(report, "Log Records of a Wrong Length");
+    _badWrappings.addTo(report, "Subscriptions Without Content");
+    for (std::size_t kind = 0; kind < _otherKinds.size(); ++kind) {
+        if (const auto count = _otherKinds.at(kind); count > 0)
+            report.set(fmt::format("Frames of Kind 0x{:02X}", kind), fmt::format("{}", count));
     }
 }
 

@@ -23,12 +23,15 @@ class LogFrames
     std::optional<CapturedMessage> record(const HdlcFrame& frame);
     /// What was skipped so far, a line for each kind, behind the capture's name.
     void tell(std::vector<std::string>& notes, std::string_view name) const;
+    /// The frames by kind, as rows of a display.
+    void addTo(PlistDictionary& report) const;
 
   private:
     bool takeRecord(ByteView content);
 
     Bytes _packet;
     Clock::TimePoint _time; // of the last record
+    std::uint64_t _recordCount = 0;
     SkippedCount _badRecords;
     SkippedCount _badWrappings;
     std::array<std::uint64_t, 256> _otherKinds{};

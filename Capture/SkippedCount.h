@@ -1,5 +1,7 @@
 #pragma once
 
+#include "PropertyList/PlistValue.h"
+
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -21,6 +23,10 @@ class SkippedCount
     /// Adds "NAME: N NOUNs REST, the first at offset M", unless nothing was skipped.
     void tell(std::vector<std::string>& notes, std::string_view name, std::string_view noun,
               std::string_view rest) const;
+    /// "N, the first at offset M", or "0".
+    std::string text() const;
+    /// Adds that under the name, unless nothing was skipped.
+    void addTo(PlistDictionary& report, std::string_view name) const;
 
   private:
     std::uint64_t _count = 0;

@@ -21,6 +21,10 @@ inline constexpr std::string_view errorDomainKey = "ErrorDomain";
 inline constexpr std::string_view errorCodeKey = "ErrorCode";
 inline constexpr std::string_view remotePortKey = "RemotePort";
 
+/// A log channel's command of our own service: the answer holds, under the same key, a dictionary
+/// of what became of the messages, to be shown as it is. Other services do not know it.
+inline constexpr std::string_view reportCommand = "GetReport";
+
 /// The domain of the errors that the client finds itself.
 inline constexpr std::int32_t clientErrorDomain = 1;
 namespace ClientError

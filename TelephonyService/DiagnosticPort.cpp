@@ -33,6 +33,7 @@ class DiagnosticPort::Source : public MessageSource
         _port.add(*this);
     }
     std::optional<TimedMessage> next() override { return std::nullopt; }
+    PlistDictionary report() const override { return _port.report(); }
 
     void addTo(LogMasks& masks) const
     {
@@ -135,6 +136,7 @@ void DiagnosticPort::updateMasks()
 
 void DiagnosticPort::take(ByteView bytes)
 {
+    _connection->byteCount += bytes.size();
     while (!bytes.empty()) {
         bytes = bytes.subspan(_connection->frames.take(bytes));
         if (const auto frame = _connection->frames.frame())
@@ -166,14 +168,18 @@ bool DiagnosticPort::takeAnswer(ByteView content)
         return false;
     if (const auto status = LogPacket(content).u32(statusOffset); status != 0)
         refuse(fmt::format("status {}", status));
+    else
+        _connection->hasSetMasks = true;
     return true;
 }
 
 // A port that refuses one mask refuses the others as well.
 void DiagnosticPort::refuse(std::string_view reason)
 {
-    if (!std::exchange(_connection->hasRefused, true))
-        _log.error("{} refuses to send logs: {}", _device, reason);
+    if (!_connection->refusal.empty())
+        return;
+    _connection->refusal = reason;
+    _log.error("{} refuses to send logs: {}", _device, reason);
 }
 
 void DiagnosticPort::expectAnswer()
@@ -186,6 +192,7 @@ void DiagnosticPort::lose(const std::string& reason)
 {
     _log.error("{} has gone, and is tried again every {} s: {}", _device, retryDelay.count(),
                reason);
+    _lastFault = fmt::format("has gone: {}", reason);
     _connection->frames.end();
     reportCounts();
     _connection.reset();
@@ -206,6 +213,27 @@ void DiagnosticPort::reportCounts()
     _connection->records.tell(lines, _device);
     for (const std::string& line : lines)
         _log.error("{}", line);
+}
+
+PlistDictionary DiagnosticPort::report() const
+{
+    PlistDictionary report{{"Device", _device}, {"State", _port ? "open" : _lastFault}};
+    if (!_connection)
+        return report;
+    report.set("Log Masks", maskState());
+    report.set("Bytes Received", fmt::format("{}", _connection->byteCount));
+    _connection->records.addTo(report);
+    _connection->frames.addTo(report);
+    return report;
+}
+
+std::string DiagnosticPort::maskState() const
+{
+    if (!_connection->refusal.empty())
+        return fmt::format("refused: {}", _connection->refusal);
+    if (_connection->masks.empty())
+        return "not asked for";
+    return _connection->hasSetMasks ? "set" : "asked for, not answered yet";
 }
 
 MainQueue::Task DiagnosticPort::guarded(void (DiagnosticPort::*operation)())

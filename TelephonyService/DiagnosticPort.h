@@ -48,8 +48,10 @@ class DiagnosticPort
         FrameAssembler frames;
         LogFrames records;
         LogMasks masks; ///< that it was asked for
+        std::uint64_t byteCount = 0;
         bool hasAnswered = false;
-        bool hasRefused = false;
+        bool hasSetMasks = false; ///< it has said so
+        std::string refusal = {}; ///< what it has answered instead; empty: it has not
     };
 
     void add(Source& source);
@@ -63,6 +65,8 @@ class DiagnosticPort
     void lose(const std::string& reason);
     void retryLater();
     void reportCounts();
+    PlistDictionary report() const;
+    std::string maskState() const;
     void expectAnswer();
     /// A task that does nothing once this is gone.
     MainQueue::Task guarded(void (DiagnosticPort::*operation)());

@@ -1,5 +1,6 @@
 #include "TelephonyService/LogChannel.h"
 
+#include "Platform/TelephonyProtocol.h"
 #include "PropertyList/PropertyListReader.h"
 #include "PropertyList/PropertyListWriter.h"
 
@@ -47,12 +48,23 @@ std::optional<Bytes> LogChannel::handleCommand(ByteView command)
     }
     if (dictionary->contains("GetTechnology"))
         return propertyListBytes(PlistDictionary{{"GetTechnology", _content.technology}});
+    if (dictionary->contains(TelephonyProtocol::reportCommand))
+        return propertyListBytes(PlistDictionary{{TelephonyProtocol::reportCommand, report()}});
     const PlistValue* state = dictionary->find("SetState");
     if (state && *state == "Streaming")
         startStreaming(*dictionary);
     else
         _log.error("Log channel for {}: an unknown command", clientPortName());
     return std::nullopt;
+}
+
+PlistDictionary LogChannel::report() const
+{
+    PlistDictionary report = _source ? _source->report() : PlistDictionary();
+    report.set("Messages Sent", fmt::format("{}", _sent));
+    report.set("Messages Not Asked For", fmt::format("{}", _unwanted));
+    report.set("Messages Dropped by the Service", fmt::format("{}", _dropped));
+    return report;
 }
 
 void LogChannel::startStreaming(const PlistDictionary& command)
@@ -87,7 +99,7 @@ void LogChannel::tick()
 // While something waits, the client has just refused it, and has its next chance at the next tick.
 void LogChannel::takePushed(ByteView message)
 {
-    if (!_wanted.wants(message))
+    if (!isWanted(message))
         return;
     const bool isFirst = _outgoing.empty();
     enqueue(Bytes(message.begin(), message.end()));
@@ -98,7 +110,7 @@ void LogChannel::takePushed(ByteView message)
 void LogChannel::queueDueMessages()
 {
     while (_next && _next->due <= _elapsed) {
-        if (_wanted.wants(_next->data))
+        if (isWanted(_next->data))
             enqueue(std::move(_next->data));
         fetchNext();
     }
@@ -107,10 +119,17 @@ void LogChannel::queueDueMessages()
 void LogChannel::streamUnpaced()
 {
     for (int sent = 0; sent < unpacedBatch && sendQueued() && _next; ++sent) {
-        if (_wanted.wants(_next->data))
+        if (isWanted(_next->data))
             enqueue(std::move(_next->data));
         fetchNext();
     }
+}
+
+bool LogChannel::isWanted(ByteView message)
+{
+    const bool isWanted = _wanted.wants(message);
+    _unwanted += isWanted ? 0 : 1;
+    return isWanted;
 }
 
 void LogChannel::enqueue(Bytes message)
@@ -134,6 +153,7 @@ bool LogChannel::sendQueued()
                                               RemotePort::Reply::NotWanted);
         if (result.error != PortError::success)
             return false;
+        ++_sent;
         _outgoingBytes -= _outgoing.front().size();
         _outgoing.pop_front();
     }

@@ -33,7 +33,8 @@ struct LogChannelContent {
 };
 
 /// The service's end of one log channel: answers "GetTechnology", takes the start command and then
-/// streams the messages whose codes were asked for to the client's local port.
+/// streams the messages whose codes were asked for to the client's local port. "GetReport" asks it
+/// for what became of the messages.
 ///
 /// It never waits for a client: what a slow one does not take in time is kept up to a bound; above
 /// that the oldest messages are dropped, counted, and the count is logged.
@@ -60,11 +61,13 @@ class LogChannel
     std::size_t droppedCount() const { return _dropped; }
 
   private:
+    PlistDictionary report() const;
     void startStreaming(const PlistDictionary& command);
     void tick();
     void takePushed(ByteView message);
     void queueDueMessages();
     void streamUnpaced();
+    bool isWanted(ByteView message);
     void enqueue(Bytes message);
     /// False when the client takes no more for now.
     bool sendQueued();
@@ -84,6 +87,8 @@ class LogChannel
 
     std::deque<Bytes> _outgoing;
     std::size_t _outgoingBytes = 0;
+    std::size_t _sent = 0;
+    std::size_t _unwanted = 0;
     std::size_t _dropped = 0;
     std::size_t _droppedReported = 0;
     int _ticksSinceReport = 0;

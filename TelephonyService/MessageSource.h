@@ -38,6 +38,8 @@ class MessageSource
     /// Messages come at their due times, and a receiver that does not keep up loses the oldest. A
     /// source without pace gives as much as the receiver takes, and nothing is lost.
     virtual bool isPaced() const { return true; }
+    /// What is to be told of where the messages come from, as rows of a display.
+    virtual PlistDictionary report() const { return {}; }
 };
 
 } // namespace ventrik

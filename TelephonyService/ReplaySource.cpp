@@ -31,6 +31,19 @@ std::unique_ptr<ReplaySource> ReplaySource::open(const ReplayOptions& options, s
     return std::unique_ptr<ReplaySource>(new ReplaySource(options, std::move(*reader)));
 }
 
+PlistDictionary ReplaySource::report() const
+{
+    PlistDictionary report{{"Capture", _options.capture}};
+    PlistArray notes;
+    for (const std::string& note : _reader.notes())
+        notes.append(note);
+    if (!notes.empty())
+        report.set("Skipped", notes);
+    if (const std::string error = _reader.error(); !error.empty())
+        report.set("Damage", error);
+    return report;
+}
+
 std::optional<TimedMessage> ReplaySource::next()
 {
     auto message = _reader.next();

@@ -25,6 +25,7 @@ class ReplaySource : public MessageSource
 
     std::optional<TimedMessage> next() override;
     bool isPaced() const override { return _options.speed.has_value(); }
+    PlistDictionary report() const override;
 
   private:
     ReplaySource(ReplayOptions options, CaptureReader reader)

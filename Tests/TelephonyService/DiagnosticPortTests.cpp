@@ -293,6 +293,52 @@ TEST_F(DiagnosticPortTest, AnswersWithAnyFrame)
     EXPECT_THAT(log.texts(LogPriority::error), IsEmpty());
 }
 
+TEST_F(DiagnosticPortTest, ReportsThatItIsNotThereAndWhy)
+{
+    ports.fault = "No such file or directory";
+    port->open();
+    EXPECT_EQ(port->makeSource()->report(),
+              (PlistDictionary{{"Device", "/dev/phone"}, {"State", "No such file or directory"}}));
+}
+
+TEST_F(DiagnosticPortTest, ReportsWhetherItsMasksAreSet)
+{
+    const auto masks = [this] { return *port->makeSource()->report().find("Log Masks"); };
+    port->open();
+    EXPECT_EQ(masks(), "not asked for");
+    const Channel channel(*port, {0xB193});
+    queue.run();
+    EXPECT_EQ(masks(), "asked for, not answered yet");
+    ports.send(frame({0x73, 0, 0, 0, 3, 0, 0, 0, 0, 0, 0, 0}));
+    EXPECT_EQ(masks(), "set");
+    ports.send(frame({0x13, 0x73}));
+    EXPECT_EQ(masks(), "refused: it answers 0x13");
+}
+
+TEST_F(DiagnosticPortTest, ReportsItsFramesByKindAndThoseWithABadChecksum)
+{
+    Bytes bad = logFrame(record);
+    bad[6] ^= 1;
+    const Bytes other = frame({0x4B, 1});
+    port->open();
+    ports.send(joined({logFrame(record), bad, other, logFrame(record)}));
+    const PlistDictionary report = port->makeSource()->report();
+    EXPECT_EQ(*report.find("State"), "open");
+    EXPECT_EQ(*report.find("Log Records"), "2");
+    EXPECT_EQ(*report.find("Bad Checksums"),
+              fmt::format("1, the first at offset {}", logFrame(record).size()));
+    EXPECT_EQ(*report.find("Frames of Kind 0x4B"), "1");
+    EXPECT_EQ(*report.find("Bytes Received"),
+              fmt::format("{}", 2 * logFrame(record).size() + bad.size() + other.size()));
+}
+
+TEST_F(DiagnosticPortTest, ReportsThatItHasGone)
+{
+    port->open();
+    ports.lose("Input/output error");
+    EXPECT_EQ(*port->makeSource()->report().find("State"), "has gone: Input/output error");
+}
+
 TEST_F(DiagnosticPortTest, KeepsNoFrameWithoutEnd)
 {
     port->open();

@@ -101,6 +101,23 @@ TEST_F(LogChannelTest, AnswersGetTechnology)
               PlistValue(PlistDictionary{{"GetTechnology", "some technology"}}));
 }
 
+TEST_F(LogChannelTest, ReportsWhatBecameOfTheMessages)
+{
+    for (std::uint8_t i = 0; i < 3; ++i)
+        add(0ms, packet(7, i));
+    add(0ms, packet(8, 9));
+    const auto channel = makeChannel();
+    channel->handleCommand(startCommand({7}));
+    fake.mainQueue.advance(1s);
+    const auto reply = channel->handleCommand(xml(PlistDictionary{{"GetReport", "GetReport"}}));
+    ASSERT_TRUE(reply);
+    EXPECT_EQ(*readPropertyList(*reply).value,
+              PlistValue(PlistDictionary{
+                  {"GetReport", PlistDictionary{{"Messages Sent", "3"},
+                                                {"Messages Not Asked For", "1"},
+                                                {"Messages Dropped by the Service", "0"}}}}));
+}
+
 TEST_F(LogChannelTest, StreamsNothingBeforeTheStartCommand)
 {
     add(0ms, packet(7, 1));

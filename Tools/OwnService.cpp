@@ -23,17 +23,7 @@ namespace ventrik
 namespace
 {
 
-// The service's last words, or how it ended where it had none.
-std::string lastWords(QProcess& process)
-{
-    const QStringList lines =
-        QString::fromUtf8(process.readAllStandardError()).split('\n', Qt::SkipEmptyParts);
-    if (!lines.isEmpty())
-        return lines.last().toStdString();
-    if (process.error() == QProcess::FailedToStart || process.exitStatus() == QProcess::CrashExit)
-        return process.errorString().toStdString();
-    return fmt::format("exit status {}", process.exitCode());
-}
+constexpr std::size_t longestComplaint = 4096;
 
 } // namespace
 
@@ -55,10 +45,13 @@ bool OwnService::start(const OwnDirectory& directory)
         if (getppid() != parent)
             _exit(EXIT_FAILURE);
     });
+    QObject::connect(&_process, &QProcess::readyReadStandardError, qApp,
+                     [this] { takeComplaints(); });
     _process.start(QCoreApplication::applicationDirPath() + "/ventrik-telephony",
                    _options.arguments);
     if (!waitUntilListening(directory.path()))
         return false;
+    _serves = true;
     QObject::connect(&_process, &QProcess::finished, qApp, [this] {
         // Who is told to end may have been told together with the service.
         if (TerminationSignals::haveCome())
@@ -89,10 +82,32 @@ bool OwnService::waitUntilListening(const std::string& runtimeDirectory)
     return true;
 }
 
+// While it does not serve, its last words are told as the reason.
+void OwnService::takeComplaints()
+{
+    const std::string text = _process.readAllStandardError().toStdString();
+    if (_serves)
+        writeText(STDERR_FILENO, text, Patience::Brief);
+    _complaints += text;
+    if (_complaints.size() > longestComplaint)
+        _complaints.erase(0, _complaints.size() - longestComplaint);
+}
+
+// Or how it ended, where it had none.
+std::string OwnService::lastWords() const
+{
+    const QStringList lines = QString::fromStdString(_complaints).split('\n', Qt::SkipEmptyParts);
+    if (!lines.isEmpty())
+        return lines.last().toStdString();
+    if (_process.error() == QProcess::FailedToStart || _process.exitStatus() == QProcess::CrashExit)
+        return _process.errorString().toStdString();
+    return fmt::format("exit status {}", _process.exitCode());
+}
+
 void OwnService::tellEnd()
 {
-    complain("ventrik",
-             fmt::format("the {} service ended: {}", _options.name, lastWords(_process)));
+    takeComplaints();
+    complain("ventrik", fmt::format("the {} service ended: {}", _options.name, lastWords()));
 }
 
 OwnService::~OwnService()
@@ -106,6 +121,7 @@ OwnService::~OwnService()
         _process.kill();
         _process.waitForFinished(longestWait);
     }
+    takeComplaints();
 }
 
 } // namespace ventrik

@@ -18,7 +18,8 @@ struct OwnServiceOptions {
 };
 
 /// A telephony service of our own, in a runtime directory that nobody else uses. It ends with this
-/// process, however that ends; when it ends by itself, so does the event loop, with failure.
+/// process, however that ends; when it ends by itself, so does the event loop, with failure. What
+/// it complains about while it serves is said on our standard error, too.
 class OwnService
 {
   public:
@@ -31,10 +32,14 @@ class OwnService
 
   private:
     bool waitUntilListening(const std::string& runtimeDirectory);
+    void takeComplaints();
+    std::string lastWords() const;
     void tellEnd();
 
     OwnServiceOptions _options;
     QProcess _process;
+    bool _serves = false;
+    std::string _complaints; // of which the last line may be unfinished
 };
 
 } // namespace ventrik

@@ -252,6 +252,8 @@ int main(int argc, char** argv)
     platformOptions.programName = programName;
     platformOptions.verbose = options.verbose;
     platformOptions.logThreshold = options.logLevel;
+    // Who waits for a phone wants to know what is wrong with it.
+    platformOptions.showsErrors = options.serialDevice.has_value();
     LinuxPlatform platform(platformOptions);
     return serve(options, platform);
 }

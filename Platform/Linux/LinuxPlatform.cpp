@@ -3,10 +3,20 @@
 namespace ventrik
 {
 
+namespace
+{
+
+LinuxSystemLog::Copy copyOf(const LinuxPlatformOptions& options)
+{
+    if (options.verbose)
+        return LinuxSystemLog::Copy::Everything;
+    return options.showsErrors ? LinuxSystemLog::Copy::Errors : LinuxSystemLog::Copy::None;
+}
+
+} // namespace
+
 LinuxPlatform::LinuxPlatform(const LinuxPlatformOptions& options)
-    : _log(options.programName,
-           options.verbose ? LinuxSystemLog::Copy::StandardError : LinuxSystemLog::Copy::None,
-           options.logThreshold),
+    : _log(options.programName, copyOf(options), options.logThreshold),
       _ports(options.runtimeDirectory.empty() ? LinuxMessagePorts::defaultDirectory()
                                               : PortDirectory(options.runtimeDirectory),
              _log),

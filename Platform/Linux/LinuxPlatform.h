@@ -20,6 +20,7 @@ struct LinuxPlatformOptions {
     std::string runtimeDirectory;                 ///< empty: the default one
     std::vector<std::string> resourceDirectories; ///< empty: the default ones
     bool verbose = false;                         ///< copies the system log to standard error
+    bool showsErrors = false;                     ///< copies its errors there
     int logThreshold = LogPriority::error;        ///< the least urgent level in the system log
     std::string programName = "ventrik";
     std::optional<std::string> version;

@@ -20,12 +20,21 @@ std::string lossNotice(std::size_t lost)
     return fmt::format("{} lines of the log did not fit and were lost", lost);
 }
 
+// The least urgent level that is copied.
+int thresholdOf(LinuxSystemLog::Copy copy)
+{
+    constexpr int nothing = LogPriority::emergency - 1;
+    if (copy == LinuxSystemLog::Copy::None)
+        return nothing;
+    return copy == LinuxSystemLog::Copy::Errors ? LogPriority::error : LogPriority::debug;
+}
+
 } // namespace
 
 LinuxSystemLog::LinuxSystemLog(const std::string& programName, Copy copy, int threshold)
-    : SystemLog(copy == Copy::StandardError ? LogPriority::debug : threshold),
+    : SystemLog(std::max(threshold, thresholdOf(copy))),
       _programName(std::make_shared<const std::string>(programName)),
-      _copy(copy),
+      _copyThreshold(thresholdOf(copy)),
       _threshold(threshold),
       _systemLog(systemLog()),
       _standardError(standardError())
@@ -87,7 +96,7 @@ void LinuxSystemLog::write(int priority, std::string_view text)
 {
     if ((priority & 7) <= _threshold)
         _systemLog.add({priority, std::string(text)});
-    if (_copy == Copy::StandardError)
+    if ((priority & 7) <= _copyThreshold)
         _standardError.add({priority, line(*_programName, getpid(), priority, text) + '\n'});
 }
 

@@ -10,13 +10,13 @@
 namespace ventrik
 {
 
-/// The system log by syslog(3), up to a threshold; optionally every entry goes to standard error
-/// too, as one line. Neither makes the program wait: a place that takes no lines loses them. One
-/// process has one of it, because syslog(3) keeps the program's name by reference.
+/// The system log by syslog(3), up to a threshold; optionally its errors or all entries go to
+/// standard error too, as one line. Neither makes the program wait: a place that takes no lines
+/// loses them. One process has one of it, because syslog(3) keeps the program's name by reference.
 class LinuxSystemLog : public SystemLog
 {
   public:
-    enum class Copy { None, StandardError };
+    enum class Copy { None, Errors, Everything };
 
     explicit LinuxSystemLog(const std::string& programName, Copy copy = Copy::None,
                             int threshold = LogPriority::error);
@@ -42,7 +42,7 @@ class LinuxSystemLog : public SystemLog
     LogWriter::Place standardError() const;
 
     std::shared_ptr<const std::string> _programName; // also a stuck writer's
-    Copy _copy;
+    int _copyThreshold;
     int _threshold;
     LogWriter _systemLog;
     LogWriter _standardError;

@@ -41,7 +41,7 @@ TEST(LinuxSystemLog, ShowsNothingThatATerminalWouldObey)
 
 TEST(LinuxSystemLog, CopiesEveryLineToStandardErrorWhateverItsThreshold)
 {
-    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::StandardError, LogPriority::emergency);
+    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::Everything, LogPriority::emergency);
     ::testing::internal::CaptureStderr();
     log.warning("shown {}", 1);
     log.log(LogPriority::debug, "shown too");
@@ -49,6 +49,18 @@ TEST(LinuxSystemLog, CopiesEveryLineToStandardErrorWhateverItsThreshold)
     EXPECT_EQ(::testing::internal::GetCapturedStderr(),
               fmt::format("ventrik-test[{0}]: <4> shown 1\nventrik-test[{0}]: <7> shown too\n",
                           getpid()));
+}
+
+TEST(LinuxSystemLog, CopiesItsErrorsAloneWhereThatIsAskedFor)
+{
+    LinuxSystemLog log("ventrik-test", LinuxSystemLog::Copy::Errors, LogPriority::emergency);
+    EXPECT_FALSE(log.isEnabled(LogPriority::warning));
+    ::testing::internal::CaptureStderr();
+    log.warning("not shown");
+    log.error("shown");
+    EXPECT_TRUE(log.flush());
+    EXPECT_EQ(::testing::internal::GetCapturedStderr(),
+              fmt::format("ventrik-test[{}]: <3> shown\n", getpid()));
 }
 
 TEST(LinuxSystemLog, WithoutACopyFormatsNothingBelowItsThreshold)

@@ -20,6 +20,7 @@ constexpr std::int32_t messageId = 0;
 constexpr RemotePort::Seconds sendTimeout{1.0};
 constexpr RemotePort::Seconds receiveTimeout{1.0};
 constexpr RemotePort::Seconds noReceiveTimeout{0.0};
+constexpr RemotePort::Seconds reportTimeout{0.1}; // nothing depends on it, and the screens wait
 constexpr auto refreshInterval = 2s;
 constexpr auto retryDelay = 5s;
 
@@ -160,6 +161,7 @@ bool VentrikModel::createRemotePort()
         return false;
     }
     _recvPort->expectStreamOf(_sendPort->process());
+    _answersReports = true;
     _platform.log.error(" ***** Created ports (send={}, recv={})", fmt::ptr(_sendPort.get()),
                         fmt::ptr(_recvPort.get()));
     return true;
@@ -168,6 +170,7 @@ bool VentrikModel::createRemotePort()
 void VentrikModel::localPortInvalidated()
 {
     _platform.log.error(" ***** INVALIDATED {} *****", fmt::ptr(_recvPort.get()));
+    _lastTrouble = {_platform.clock.now(), "the channel was lost"};
     restartMonitor();
 }
 
@@ -255,6 +258,7 @@ void VentrikModel::startMonitor()
     _platform.log.error("Starting the display update timer");
     _displayUpdateTimer = _platform.mainQueue.repeatEvery(refreshInterval, [this] { refresh(); });
     setFault(ChannelFault::None);
+    ++_timesOpened;
     publishChannelState();
 }
 
@@ -281,9 +285,25 @@ bool VentrikModel::sendStartCommand()
     return result.error == PortError::success;
 }
 
+std::optional<PlistDictionary> VentrikModel::askServiceReport()
+{
+    using TelephonyProtocol::reportCommand;
+    if (!_sendPort || !_answersReports)
+        return std::nullopt;
+    const auto command = propertyListBytes(PlistDictionary{{reportCommand, reportCommand}});
+    const auto result = _sendPort->send(messageId, *command, reportTimeout, reportTimeout,
+                                        RemotePort::Reply::Wanted);
+    const auto answer = result.reply ? readPropertyList(*result.reply) : PropertyListReading();
+    const PlistDictionary* dictionary = answer ? answer.value->dictionary() : nullptr;
+    const PlistValue* report = dictionary ? dictionary->find(reportCommand) : nullptr;
+    _answersReports = report && report->dictionary();
+    return _answersReports ? std::optional(*report->dictionary()) : std::nullopt;
+}
+
 void VentrikModel::retryLater()
 {
     destroyPorts();
+    _lastTrouble = {_platform.clock.now(), std::string(channelFaultText(_attemptFault))};
     publishChannelState();
     _platform.mainQueue.after(retryDelay, guarded(&VentrikModel::startMonitor));
 }

@@ -56,6 +56,18 @@ class VentrikModel : public DisplayTree
     std::optional<Clock::TimePoint> connectedSince() const { return _connectedSince; }
     /// When the last log message came; none before the first.
     std::optional<Clock::TimePoint> lastMessageTime() const { return _lastMessageTime; }
+    /// How often the channel was opened.
+    std::size_t timesOpened() const { return _timesOpened; }
+    /// What went wrong with the channel last, also when it stands again.
+    struct Trouble {
+        Clock::TimePoint time;
+        std::string text; ///< in a few words
+    };
+    const std::optional<Trouble>& lastTrouble() const { return _lastTrouble; }
+    /// What the service tells of the channel, as rows of a display; none where it tells nothing.
+    /// Waits a tenth of a second at most, and a service that has not answered is not asked again
+    /// before the channel is opened anew. Other services than ours do not know the question.
+    std::optional<PlistDictionary> askServiceReport();
     /// The technology in a word or two, as people call it; empty before it is known.
     std::string_view technologyName() const { return _technologyName; }
     /// One line that says why there is no display: which template cannot be used, and why. Empty
@@ -64,6 +76,9 @@ class VentrikModel : public DisplayTree
     /// Called on the main queue after the channel was opened or lost, or failed for another reason
     /// than before; also while nothing new has arrived.
     void setChannelCallback(std::function<void()> callback);
+
+    /// Null while there is none.
+    const LogGenerator* generator() const { return _logGenerator.get(); }
 
     /// Null for none. Before the first message, and it outlives the model.
     void observeMessages(MessageObserver* observer) { _observer = observer; }
@@ -126,6 +141,9 @@ class VentrikModel : public DisplayTree
     bool _wasConnected = false;
     std::optional<Clock::TimePoint> _connectedSince;
     std::optional<Clock::TimePoint> _lastMessageTime;
+    std::size_t _timesOpened = 0;
+    std::optional<Trouble> _lastTrouble;
+    bool _answersReports = true; // as far as is known
 
     std::shared_ptr<bool> _alive = std::make_shared<bool>(true);
 };

@@ -15,6 +15,13 @@ bool isRecord(const LogPacket& packet)
            (type == ordinaryPacketType || type == extraCodePacketType);
 }
 
+ChosenLayout chooseLayoutOf(const Record& record, const LogPacket& packet, RecordsMode mode)
+{
+    return chooseLayout(
+        record, mode == RecordsMode::Base ? std::span<const Layout>() : layoutsOf(record.logCode),
+        packet);
+}
+
 } // namespace
 
 void RecordCensus::take(ByteView message)
@@ -29,11 +36,24 @@ void RecordCensus::take(ByteView message)
         ++_otherCount;
         return;
     }
-    if (counted == _kinds.end()) {
-        const ByteView payload = LogPacket(stripPrefix(message)).payload();
-        counted = _kinds.insert({*kind, {0, Bytes(payload.begin(), payload.end())}}).first;
+    if (counted == _kinds.end())
+        ++add(*kind, LogPacket(stripPrefix(message))).count;
+    else
+        ++counted->second.count;
+}
+
+RecordCensus::Counted& RecordCensus::add(const Kind& kind, const LogPacket& packet)
+{
+    Counted& counted = _kinds[kind];
+    if (const Record* record = recordOf(kind.logCode))
+        counted.isTooShort =
+            packet.size() < chooseLayoutOf(*record, packet, _mode).record->minimumSize;
+    const ByteView payload = packet.payload();
+    if (_payloads == Payloads::Kept && _payloadBytes + payload.size() <= maximumPayloads) {
+        counted.firstPayload.assign(payload.begin(), payload.end());
+        _payloadBytes += payload.size();
     }
-    ++counted->second.count;
+    return counted;
 }
 
 std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode)
@@ -46,8 +66,7 @@ std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode)
     const Record* base = recordOf(code);
     if (!base)
         return kind;
-    const auto layouts = mode == RecordsMode::Base ? std::span<const Layout>() : layoutsOf(code);
-    const ChosenLayout chosen = chooseLayout(*base, layouts, packet);
+    const ChosenLayout chosen = chooseLayoutOf(*base, packet, mode);
     kind.version = versionOf(*chosen.record, packet);
     if (!base->isExtension || mode == RecordsMode::Extended)
         kind.layout = chosen.kind;

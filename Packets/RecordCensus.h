@@ -29,15 +29,21 @@ std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode);
 class RecordCensus
 {
   public:
-    /// What the layouts are judged by.
-    explicit RecordCensus(RecordsMode mode) : _mode(mode) {}
+    enum class Payloads { Dropped, Kept };
+
+    /// The mode says what the layouts are judged by. Each kind's first payload is kept on demand.
+    explicit RecordCensus(RecordsMode mode, Payloads payloads = Payloads::Dropped)
+        : _mode(mode), _payloads(payloads)
+    {
+    }
 
     void take(ByteView message);
 
     using Kind = RecordKind;
     struct Counted {
         std::size_t count = 0;
-        Bytes firstPayload;
+        bool isTooShort = false; ///< for what the record holds at least
+        Bytes firstPayload;      ///< empty where it is not kept
     };
     /// In the order of code, version and size.
     const std::map<Kind, Counted>& kinds() const { return _kinds; }
@@ -47,9 +53,14 @@ class RecordCensus
     std::size_t brokenCount() const { return _brokenCount; }
 
     static constexpr std::size_t maximumKinds = 10000;
+    static constexpr std::size_t maximumPayloads = std::size_t{16} << 20; ///< bytes, of all kinds
 
   private:
+    Counted& add(const Kind& kind, const LogPacket& packet);
+
     RecordsMode _mode;
+    Payloads _payloads;
+    std::size_t _payloadBytes = 0;
     std::map<Kind, Counted> _kinds;
     std::size_t _otherCount = 0;
     std::size_t _brokenCount = 0;

@@ -167,6 +167,8 @@ class Decoding
     {
         if (_options.statistics)
             _census.take(message.data);
+        _bytes += message.data.size();
+        _lastTime = message.time;
         if (_capture && message.data.size() > CaptureFile::maximumMessageSize)
             ++_oversizedCount;
         else if (_capture)
@@ -186,8 +188,13 @@ class Decoding
         if (_extensionCount > 0)
             complain(fmt::format("{}: {} records that only --records extended decodes",
                                  _options.capture, _extensionCount));
-        if (_options.statistics)
-            show(recordTable(_census));
+        if (_options.statistics) {
+            show(fmt::format("{}: {} messages of {} bytes", _options.capture, _packets, _bytes));
+            if (_lastTime)
+                show(fmt::format(", the last at {}", dateText(*_lastTime)));
+            show("\n" + recordTable(_census) +
+                 codeTable(CodeReport::of(_census, &_decoder.generator())));
+        }
     }
 
     void appendDisplay()
@@ -331,6 +338,8 @@ class Decoding
     RecordCensus _census;
     std::size_t _extensionCount = 0; // of records that the present mode leaves aside
     std::size_t _packets = 0;
+    std::size_t _bytes = 0; // of them
+    std::optional<Clock::TimePoint> _lastTime;
     std::string _text;
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
@@ -455,7 +464,7 @@ bool countRecords(const std::string& capture, RecordCensus& census)
 
 int reportUnknownRecords(const UnknownReportOptions& options)
 {
-    RecordCensus census(RecordsMode::Extended);
+    RecordCensus census(RecordsMode::Extended, RecordCensus::Payloads::Kept);
     bool isWhole = true;
     for (const std::string& capture : options.captures)
         isWhole = !interrupted && countRecords(capture, census) && isWhole;

@@ -45,6 +45,7 @@ class OfflineDecoder
     /// The display as it stands; null while the generator has none.
     const PlistValue* display() const { return _state.find(StateKey::display); }
     const PlistDictionary& state() const { return _state; }
+    const LogGenerator& generator() const { return _generator; }
     /// How the records of all sections were read, the last one of each code.
     std::vector<ReadLayout> layouts() const { return _generator.layouts(); }
     std::string displayFault() const { return _generator.displayFault(); }

@@ -4,8 +4,10 @@
 
 #include <algorithm>
 #include <array>
+#include <vector>
 
 #include <fmt/format.h>
+#include <fmt/ranges.h>
 
 namespace ventrik
 {
@@ -48,6 +50,11 @@ std::string times(std::size_t count)
     return fmt::format("{} record{}", count, count == 1 ? "" : "s");
 }
 
+std::string listText(const std::vector<std::string>& items)
+{
+    return items.empty() ? "none" : fmt::format("{}", fmt::join(items, ", "));
+}
+
 } // namespace
 
 std::string recordTable(const RecordCensus& census)
@@ -69,6 +76,30 @@ std::string recordTable(const RecordCensus& census)
     return text;
 }
 
+std::string codeTable(const CodeReport& report)
+{
+    std::string text = fmt::format("{:<8} {:>10} {:>10}  {:<12}  {}\n", "code", "records",
+                                   "too short", "versions", "sections");
+    const auto out = std::back_inserter(text);
+    std::vector<std::string> undecoded;
+    for (const CodeReport::Code& code : report.came) {
+        if (!code.isAskedFor) {
+            undecoded.push_back(fmt::format("{} ({})", codeText(code.logCode), code.records));
+            continue;
+        }
+        fmt::format_to(
+            out, "{:<8} {:>10} {:>10}  {:<12}  {}\n", codeText(code.logCode), code.records,
+            code.tooShort, code.versions.empty() ? "-" : versionsText(code),
+            code.sections.empty() ? "-" : fmt::format("{}", fmt::join(code.sections, ", ")));
+    }
+    std::vector<std::string> missing;
+    for (const std::uint32_t code : report.missing)
+        missing.push_back(codeText(code));
+    fmt::format_to(out, "asked for, never came: {}\n", listText(missing));
+    fmt::format_to(out, "came, nobody decodes: {}\n", listText(undecoded));
+    return text;
+}
+
 std::string unknownRecordReport(const RecordCensus& census, bool withBytes)
 {
     std::string text = "Records that cannot be read, by log code, version and size.\n";
@@ -84,7 +115,7 @@ std::string unknownRecordReport(const RecordCensus& census, bool withBytes)
             continue;
         fmt::format_to(out, "0x{:04X} version {} size {}: {}, first payload of {} bytes\n",
                        kind.logCode, versionText(kind), kind.size, times(counted.count),
-                       counted.firstPayload.size());
+                       kind.size - logPacketHeaderSize);
         if (withBytes && holdsNoIdentities(kind.logCode))
             fmt::format_to(out, "  {}\n", hexadecimal(counted.firstPayload));
     }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Model/CodeReport.h"
 #include "Packets/RecordCensus.h"
 
 #include <string>
@@ -11,6 +12,10 @@ namespace ventrik
 
 /// A line for each code, version, size and layout.
 std::string recordTable(const RecordCensus& census);
+
+/// A line for each log code that came, with its sections; then the codes that were asked for and
+/// never came, and those that nobody decodes.
+std::string codeTable(const CodeReport& report);
 
 /// The records that nobody can read, as a text that can be sent to us: a line for each code,
 /// version and size. No bytes of payloads are in it but, where that is asked for, the first payload

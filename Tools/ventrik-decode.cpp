@@ -86,10 +86,11 @@ void addOptions(CommandLine& line, DecodeOptions& result)
                    [&](const std::string& directory) {
                        result.resourceDirectories = {directoryValue(directory)};
                    });
-    line.addFlag("--statistics",
-                 "ends with a table of the records by code, version, size and layout, on standard "
-                 "error",
-                 result.statistics);
+    line.addFlag(
+        "--statistics",
+        "ends with tables on standard error: the records by code, version, size and layout, "
+        "by code and section, and the codes that never came or that nobody decodes",
+        result.statistics);
 }
 
 void addRowOptions(CommandLine& line, Options& result)

@@ -56,6 +56,12 @@ class LogGenerator
     virtual std::string_view sectionAt(const PlistDictionary& state,
                                        std::span<const std::string_view> path) const;
 
+    /// The names of the sections that are given the records of an effective log code, in order.
+    virtual std::vector<std::string_view> sectionsOfCode(std::uint32_t /*logCode*/) const
+    {
+        return {};
+    }
+
     /// How the records were read, the last one of each log code, that the section shows which
     /// stands at that path or holds it; empty outside of sections.
     virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,

@@ -161,6 +161,15 @@ std::string_view OrbelLogGenerator2::sectionAt(const PlistDictionary&,
     return {};
 }
 
+std::vector<std::string_view> OrbelLogGenerator2::sectionsOfCode(std::uint32_t logCode) const
+{
+    std::vector<std::string_view> names;
+    if (const auto* sections = cIndex ? cIndex->getSubscribers(logCode) : nullptr)
+        for (const Base* section : *sections)
+            names.push_back(section->getSectionName());
+    return names;
+}
+
 std::vector<ReadLayout> OrbelLogGenerator2::layoutsAt(const PlistDictionary&,
                                                       std::span<const std::string_view> path) const
 {

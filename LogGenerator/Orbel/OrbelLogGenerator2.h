@@ -32,6 +32,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     std::string_view sectionAt(const PlistDictionary& state,
                                std::span<const std::string_view> path) const override;
 
+    std::vector<std::string_view> sectionsOfCode(std::uint32_t logCode) const override;
     std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                       std::span<const std::string_view> path) const override;
     std::vector<ReadLayout> layouts() const override;

@@ -1,6 +1,6 @@
 #include "LogGenerator/Core/StateKeys.h"
 #include "Model/DisplayChanges.h"
-#include "Tests/Support/FakePlatform.h"
+#include "Tests/Support/IdleGenerator.h"
 
 #include <map>
 
@@ -18,20 +18,9 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 
 /// Knows what its test says of values and sections, by the keys with ">" between them.
-class KnowingGenerator : public LogGenerator
+class KnowingGenerator : public IdleGenerator
 {
   public:
-    explicit KnowingGenerator(FakePlatform& fake)
-        : LogGenerator({fake.log, fake.resources, fake.clock})
-    {
-    }
-    void updateState(PlistDictionary&, ByteView) override {}
-    std::optional<PlistValue> generateLogUsingState(PlistDictionary&) override { return {}; }
-    PlistDictionary getStartCommand() const override { return {}; }
-    PlistValue getSaveContentsFromState(const PlistDictionary&) const override
-    {
-        return PlistArray();
-    }
     std::optional<CellPlace> cellPlaceAt(const PlistDictionary&,
                                          std::span<const std::string_view> path) const override
     {
@@ -90,8 +79,7 @@ class DisplayChangesTest : public testing::Test
         return *taken.front().place;
     }
 
-    FakePlatform fake;
-    KnowingGenerator generator{fake};
+    KnowingGenerator generator;
     PlistDictionary state;
     DisplayChanges changes{generator};
 };

@@ -1,5 +1,6 @@
 #include "Packets/LTERecords.h"
 #include "Tests/Model/ModelFixture.h"
+#include "Tests/Support/IdleGenerator.h"
 
 #include <map>
 
@@ -32,22 +33,13 @@ struct Knowledge {
 };
 
 /// Knows what its test says.
-class FakeGenerator : public LogGenerator
+class FakeGenerator : public IdleGenerator
 {
   public:
-    FakeGenerator(const GeneratorServices& services, const Knowledge& knowledge)
-        : LogGenerator(services), _knowledge(knowledge)
-    {
-    }
-    void updateState(PlistDictionary&, ByteView) override {}
+    explicit FakeGenerator(const Knowledge& knowledge) : _knowledge(knowledge) {}
     std::optional<PlistValue> generateLogUsingState(PlistDictionary&) override
     {
         return _knowledge.display;
-    }
-    PlistDictionary getStartCommand() const override { return {}; }
-    PlistValue getSaveContentsFromState(const PlistDictionary&) const override
-    {
-        return PlistArray();
     }
     std::optional<ValueOrigin> originOf(const PlistDictionary&,
                                         std::span<const std::string_view> path) const override
@@ -84,8 +76,8 @@ class NodeNotesTest : public ModelFixture
 
     static constexpr Field level{"Level", u16(0), rsrp(0.25, -180)};
     Knowledge known;
-    VentrikModel noted{fake.platform(), {}, [this](const PlistValue&, const auto& services) {
-                           return std::make_unique<FakeGenerator>(services, known);
+    VentrikModel noted{fake.platform(), {}, [this](const PlistValue&, const auto&) {
+                           return std::make_unique<FakeGenerator>(known);
                        }};
 };
 

@@ -62,12 +62,39 @@ TEST(RecordCensus, ACodeThatNobodyKnowsHasNoVersion)
     EXPECT_EQ(census.kinds().begin()->first, (Kind{0x1234, std::nullopt, 20, std::nullopt}));
 }
 
-TEST(RecordCensus, KeepsTheFirstPayloadOfAKind)
+TEST(RecordCensus, KeepsTheFirstPayloadOfAKindWhereThatIsAskedFor)
 {
-    RecordCensus census(RecordsMode::Newer);
+    RecordCensus dropping(RecordsMode::Newer);
+    dropping.take(PacketBuilder(0x1234).size(15).u8(13, 5).build());
+    EXPECT_TRUE(dropping.kinds().begin()->second.firstPayload.empty());
+    RecordCensus census(RecordsMode::Newer, RecordCensus::Payloads::Kept);
     census.take(PacketBuilder(0x1234).size(15).u8(13, 5).build());
     census.take(PacketBuilder(0x1234).size(15).u8(13, 6).build());
     EXPECT_EQ(census.kinds().begin()->second.firstPayload, (Bytes{5, 0}));
+}
+
+TEST(RecordCensus, PayloadsBeyondALimitAreNotKept)
+{
+    constexpr std::size_t size = std::size_t{1} << 20;
+    RecordCensus census(RecordsMode::Newer, RecordCensus::Payloads::Kept);
+    std::size_t kept = 0;
+    for (std::uint32_t code = 0x2000; code < 0x2020; ++code)
+        census.take(PacketBuilder(code).size(size).build());
+    for (const auto& [kind, counted] : census.kinds())
+        kept += counted.firstPayload.size();
+    EXPECT_EQ(kept, 16 * (size - 13));
+}
+
+// A cell info of the base layout has 38 bytes.
+TEST(RecordCensus, TellsWhichKindsAreTooShortForTheirRecord)
+{
+    RecordCensus census(RecordsMode::Newer);
+    census.take(cellInfo(2, 37));
+    census.take(cellInfo(2, 38));
+    census.take(PacketBuilder(0x1234).size(13).build());
+    EXPECT_TRUE(census.kinds().at(Kind{0xB0C2, 2, 37, LayoutKind::NotKnown}).isTooShort);
+    EXPECT_FALSE(census.kinds().at(Kind{0xB0C2, 2, 38, LayoutKind::Base}).isTooShort);
+    EXPECT_FALSE(census.kinds().begin()->second.isTooShort);
 }
 
 TEST(RecordCensus, ATransportPrefixIsNoPartOfARecord)

@@ -1,5 +1,5 @@
 #include "LogGenerator/Core/StateKeys.h"
-#include "Tests/Support/FakePlatform.h"
+#include "Tests/Support/IdleGenerator.h"
 #include "Tools/CaptureRows.h"
 
 #include <fmt/format.h>
@@ -16,22 +16,12 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 
 /// Its test writes the display; it asks for the codes 0x1000 and, of the others, 5.
-class IdleGenerator : public LogGenerator
+class AskingGenerator : public IdleGenerator
 {
   public:
-    explicit IdleGenerator(FakePlatform& fake)
-        : LogGenerator({fake.log, fake.resources, fake.clock})
-    {
-    }
-    void updateState(PlistDictionary&, ByteView) override {}
-    std::optional<PlistValue> generateLogUsingState(PlistDictionary&) override { return {}; }
     PlistDictionary getStartCommand() const override
     {
         return {{"SetOrbelLogCodes", PlistArray{0x1000}}, {"SetQxExtraCodes", PlistArray{5}}};
-    }
-    PlistValue getSaveContentsFromState(const PlistDictionary&) const override
-    {
-        return PlistArray();
     }
 };
 
@@ -85,8 +75,7 @@ class CaptureRowsTest : public testing::Test
                            fields[14]);
     }
 
-    FakePlatform fake;
-    IdleGenerator generator{fake};
+    AskingGenerator generator;
     RowOptions options{.format = RowFormat::Csv};
     PlistDictionary group{{"x", "0"}};
     PlistArray list;

@@ -1,4 +1,5 @@
 #include "Tests/Support/FakePlatform.h"
+#include "Tests/Support/IdleGenerator.h"
 #include "Tools/OfflineDecoder.h"
 
 #include <gmock/gmock.h>
@@ -14,13 +15,10 @@ using namespace std::chrono_literals;
 using testing::ElementsAre;
 
 // Notes when a display is generated, in milliseconds of capture time, and how many messages it saw.
-class NotingGenerator : public LogGenerator
+class NotingGenerator : public IdleGenerator
 {
   public:
-    NotingGenerator(const GeneratorServices& services, const Clock& clock)
-        : LogGenerator(services), _clock(clock)
-    {
-    }
+    explicit NotingGenerator(const Clock& clock) : _clock(clock) {}
     void updateState(PlistDictionary& state, ByteView) override
     {
         ++_messages;
@@ -32,7 +30,6 @@ class NotingGenerator : public LogGenerator
         notes.push_back(fmt::format("{}:{}", time.time_since_epoch().count(), _messages));
         return std::nullopt;
     }
-    PlistDictionary getStartCommand() const override { return {}; }
     PlistValue getSaveContentsFromState(const PlistDictionary&) const override
     {
         return PlistArray();
@@ -52,7 +49,7 @@ class OfflineDecoderTest : public testing::Test
 
     FakePlatform fake;
     CaptureClock clock{fake.clock};
-    NotingGenerator generator{{fake.log, fake.resources, clock}, clock};
+    NotingGenerator generator{clock};
     OfflineDecoder decoder{generator, clock};
 };
 

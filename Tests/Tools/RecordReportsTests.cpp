@@ -31,7 +31,7 @@ PacketBuilder unknownIdentity()
 
 RecordCensus unknownRecords()
 {
-    RecordCensus census(RecordsMode::Extended);
+    RecordCensus census(RecordsMode::Extended, RecordCensus::Payloads::Kept);
     for (int i = 0; i < 2; ++i)
         census.take(unknownMeasurement().build());
     census.take(unknownIdentity().build());
@@ -66,7 +66,7 @@ TEST(RecordReports, OnlyPayloadsOfMeasurementsAreInAReportWithBytes)
 TEST(RecordReports, MeasurementsAreThoseOfTheList)
 {
     const auto isShown = [](std::uint32_t code) {
-        RecordCensus census(RecordsMode::Extended);
+        RecordCensus census(RecordsMode::Extended, RecordCensus::Payloads::Kept);
         census.take(PacketBuilder(code).bytes(13, Bytes(9, 0xCA)).build());
         return unknownRecordReport(census, true).find("caca") != std::string::npos;
     };
@@ -78,7 +78,7 @@ TEST(RecordReports, MeasurementsAreThoseOfTheList)
 
 TEST(RecordReports, RecordsThatCanBeReadAreInNoReport)
 {
-    RecordCensus census(RecordsMode::Extended);
+    RecordCensus census(RecordsMode::Extended, RecordCensus::Payloads::Kept);
     census.take(PacketBuilder(0xB0C2).size(38).u8(13, 2).build());
     EXPECT_EQ(unknownRecordReport(census, true),
               "Records that cannot be read, by log code, version and size.\n"
@@ -102,6 +102,30 @@ TEST(RecordReports, TheTableHasALineForEachKind)
     EXPECT_THAT(table, HasSubstr("0xB0C2         3      42 newer              1  LTE serving"));
     EXPECT_THAT(table, HasSubstr("0xB17F         7      46 not known          1  LTE serving"));
     EXPECT_THAT(table, HasSubstr("0x1234         -      20 -                  1  not decoded"));
+}
+
+TEST(RecordReports, TheTableOfCodesTellsSectionsAndWhatIsMissingAndWhatNobodyDecodes)
+{
+    CodeReport report;
+    report.came = {{.logCode = 0xB0C2,
+                    .records = 12,
+                    .tooShort = 3,
+                    .versions = {2, 3},
+                    .sections = {"Serving Cell Info", "Other"},
+                    .isAskedFor = true},
+                   {.logCode = 0x1234, .records = 4}};
+    report.missing = {0xB0C1, 0xFF0000};
+    EXPECT_EQ(codeTable(report),
+              "code        records  too short  versions      sections\n"
+              "0xB0C2           12          3  2, 3          Serving Cell Info, Other\n"
+              "asked for, never came: 0xB0C1, 0xFF0000\n"
+              "came, nobody decodes: 0x1234 (4)\n");
+}
+
+TEST(RecordReports, TheTableOfCodesSaysThatNoneIsMissing)
+{
+    EXPECT_THAT(codeTable({}), HasSubstr("asked for, never came: none\n"
+                                         "came, nobody decodes: none\n"));
 }
 
 } // namespace ventrik

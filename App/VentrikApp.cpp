@@ -5,6 +5,7 @@
 
 #include <QGuiApplication>
 #include <QScreen>
+#include <QShortcut>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -23,6 +24,7 @@ constexpr std::string_view homeScreenDomain = "org.ventrik.HomeScreen";
 constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
 
 constexpr auto noteInterval = 1s;
+constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
 
 constexpr const char* firstStatus = "Connecting";
@@ -37,7 +39,7 @@ bool exists(const std::string& path)
 } // namespace
 
 VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
-    : _platform(platform), _options(std::move(options))
+    : _platform(platform), _options(std::move(options)), _channelCounts(_options.records)
 {
 }
 
@@ -55,12 +57,20 @@ void VentrikApp::applicationDidFinishLaunching()
     _model = std::make_shared<VentrikModel>(
         _platform, [this] { updateViewControllerFromModel(); },
         LogGenerator::generatorsReading(_options.records));
+    _model->observeMessages(&_channelCounts);
     _model->setChannelCallback([this] { channelChanged(); });
+    _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, _platform.clock);
     setUpdateMessage(connectingStatus);
     createDateFormatter();
     createNavigationStack();
     showWindow();
     _noteTimer = _platform.mainQueue.repeatEvery(noteInterval, [this] { updateTopNotes(); });
+    _channelTimer =
+        _platform.mainQueue.repeatEvery(channelInterval, [this] { updateChannelPane(); });
+    if (_options.channelPane) {
+        _tree->show();
+        reloadScreens();
+    }
     startModelLater();
 }
 
@@ -106,6 +116,9 @@ void VentrikApp::showWindow()
     // What needs more room than there is gives way, not the window.
     layout->setSizeConstraint(QLayout::SetNoConstraint);
     layout->addWidget(_navController);
+    auto* channelKey = new QShortcut(QKeySequence(Qt::Key_F8), _window.get());
+    QObject::connect(channelKey, &QShortcut::activated, _window.get(),
+                     [this] { toggleChannelPane(); });
     _window->show();
     _window->activateWindow();
 }
@@ -123,6 +136,7 @@ void VentrikApp::applicationWillTerminate()
 {
     _setGSMRSSI(false);
     _noteTimer.reset();
+    _channelTimer.reset();
     _savedMessage.reset();
     setUpdateMessage(std::nullopt);
     _dateFormatter.reset();
@@ -130,6 +144,7 @@ void VentrikApp::applicationWillTerminate()
     if (_window)
         _window->hide();
     setWindow(nullptr);
+    _tree.reset();
     _model.reset();
 }
 
@@ -194,6 +209,7 @@ void VentrikApp::updateViewControllerFromModel()
     if (!_navController)
         return;
     _hasRefreshed = true;
+    _tree->takeDisplay();
     reloadScreens();
     if (_model->isConnected()) {
         _lastUpdate = _platform.clock.now();
@@ -221,24 +237,58 @@ void VentrikApp::updateTopNotes()
         _navController->topScreen().updateNotes();
 }
 
+void VentrikApp::toggleChannelPane()
+{
+    if (!_navController || _saveViewController)
+        return;
+    const bool leaves = showsChannelPane();
+    if (leaves && !_options.channelPane)
+        _tree->hide();
+    else
+        _tree->show();
+    _navController->popTo(*_navController->screens().front(), false);
+    reloadScreens();
+    if (!leaves) {
+        auto pane = VentrikPaneController::initWithNode(
+            *this, _tree->nodeAtPath(ChannelPane::rowPath), ChannelPane::rowPath);
+        _navController->push(std::move(pane), true);
+        updateStatusForViewController(_navController->topScreen());
+    }
+}
+
+bool VentrikApp::showsChannelPane() const
+{
+    const auto* pane = dynamic_cast<VentrikPaneController*>(&_navController->topScreen());
+    return pane && _tree->holds(pane->path());
+}
+
+// Also while nothing comes; then above all.
+void VentrikApp::updateChannelPane()
+{
+    if (!_navController || !showsChannelPane())
+        return;
+    _tree->update();
+    reloadScreens();
+}
+
 ModelNodePointer VentrikApp::topLevelNodes()
 {
-    return _model ? _model->topLevelNodes() : nullptr;
+    return _tree ? _tree->topLevelNodes() : nullptr;
 }
 
 ModelNodePointer VentrikApp::nodeAtPath(const std::string& path)
 {
-    return _model ? _model->nodeAtPath(path) : nullptr;
+    return _tree ? _tree->nodeAtPath(path) : nullptr;
 }
 
 std::string_view VentrikApp::doubtAt(const std::string& path) const
 {
-    return _model ? _model->doubtAt(path) : std::string_view();
+    return _tree ? _tree->doubtAt(path) : std::string_view();
 }
 
 std::vector<std::string> VentrikApp::layoutWarningsAt(const std::string& path) const
 {
-    return _model ? _model->layoutWarningsAt(path) : std::vector<std::string>();
+    return _tree ? _tree->layoutWarningsAt(path) : std::vector<std::string>();
 }
 
 StatusNote VentrikApp::statusNote() const

@@ -4,7 +4,7 @@
 #include "App/Toolkit/NavigationStack.h"
 #include "App/VentrikPaneController.h"
 #include "App/VentrikSaveViewController.h"
-#include "Model/VentrikModel.h"
+#include "Model/ChannelPane.h"
 #include "Platform/Platform.h"
 
 #include <QPointer>
@@ -27,6 +27,7 @@ struct VentrikAppOptions {
     bool animation = true;
     bool tintsChanges = true;                 ///< tints values that have changed for a moment
     RecordsMode records = RecordsMode::Newer; ///< by which layouts records are read
+    bool channelPane = false;                 ///< the root ends with a row for the channel
     std::optional<QSize> windowSize;          ///< none: as large as the main screen
 };
 
@@ -47,6 +48,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void applicationWillTerminate();
     /// Writes whether the home screen shows the signal level as a number.
     void _setGSMRSSI(bool value);
+
+    /// Opens the channel's pane; where that shows, goes back to the root.
+    void toggleChannelPane();
 
     void showSaveView() override;
     void closeSaveView() override;
@@ -96,6 +100,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void startModelLater();
     void channelChanged();
     void updateTopNotes();
+    bool showsChannelPane() const;
+    void updateChannelPane();
     void updateWindowTitle();
     void reloadScreens();
 
@@ -105,7 +111,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::unique_ptr<QWidget> _window;
     QPointer<NavigationStack> _navController;
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
+    ChannelCounts _channelCounts;
     std::shared_ptr<VentrikModel> _model;
+    std::unique_ptr<ChannelPane> _tree; // the model's, with a row for the channel
     bool _allowSaveButton = false;
     std::unique_ptr<DateFormatter> _dateFormatter;
     std::optional<std::string> _updateMessage;
@@ -113,6 +121,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::optional<Clock::TimePoint> _lastUpdate;
     std::shared_ptr<const std::string> _savedMessage; // while it is shown
     std::unique_ptr<RepeatingTimer> _noteTimer;
+    std::unique_ptr<RepeatingTimer> _channelTimer;
 };
 
 } // namespace ventrik

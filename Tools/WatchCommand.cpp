@@ -52,13 +52,19 @@ int WatchCommand::run()
     _model = makeModel(platform);
     if (_options.rows)
         _model->observeMessages(&_rows.emplace(*_options.rows, _options.records));
+    else
+        _model->observeMessages(&_channelCounts);
+    _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, platform.clock);
+    if (_options.channelPane)
+        _tree->show();
     const int mostErrorLines = _options.verbose ? linesWhenVerbose : linesOtherwise;
     try {
         if (showsPanes())
-            _viewer = std::make_unique<WatchViewer>(platform, *_model, mostErrorLines,
+            _viewer = std::make_unique<WatchViewer>(platform, *_model, *_tree, mostErrorLines,
                                                     [] { QCoreApplication::quit(); });
     } catch (const std::runtime_error& error) {
         complain(programName, fmt::format("{}; --plain prints the tree instead", error.what()));
+        _tree.reset();
         _model.reset(); // before its platform
         return EXIT_FAILURE;
     }
@@ -67,6 +73,7 @@ int WatchCommand::run()
     if (_viewer)
         linuxPlatform.log().flush(); // while that is still kept from the screen
     _viewer.reset();
+    _tree.reset();
     _model.reset();
     if (_rows && status == EXIT_SUCCESS) {
         _rows->close();
@@ -109,7 +116,9 @@ void WatchCommand::printRows()
 
 void WatchCommand::printTree()
 {
-    const ModelNodePointer root = _model->topLevelNodes();
+    _tree->takeDisplay();
+    _tree->update();
+    const ModelNodePointer root = _tree->topLevelNodes();
     if (!root)
         return;
     if (!print(*root))
@@ -125,7 +134,7 @@ bool WatchCommand::print(const VentrikModelNode& root) const
     std::string text;
     if (isatty(STDOUT_FILENO) && (_options.plain || !_options.once))
         text += clearScreen;
-    text += ventrik::printTree(root, *_model);
+    text += ventrik::printTree(root, *_tree);
     return print(text);
 }
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Core/LogGenerator.h"
-#include "Model/VentrikModel.h"
+#include "Model/ChannelPane.h"
 #include "Platform/Platform.h"
 #include "Platform/SystemLog.h"
 #include "Tools/LiveRows.h"
@@ -19,6 +19,7 @@ namespace ventrik
 
 struct WatchOptions {
     bool once = false;              ///< ends after the first tree
+    bool channelPane = false;       ///< the root ends with a row for the channel
     bool plain = false;             ///< prints trees on a terminal, too
     std::optional<RowOptions> rows; ///< prints rows instead
     RecordsMode records = RecordsMode::Newer;
@@ -31,7 +32,10 @@ struct WatchOptions {
 class WatchCommand
 {
   public:
-    explicit WatchCommand(const WatchOptions& options) : _options(options) {}
+    explicit WatchCommand(const WatchOptions& options)
+        : _options(options), _channelCounts(options.records)
+    {
+    }
 
     /// Runs the main loop to the end; gives the exit status. The application object exists.
     int run();
@@ -48,7 +52,9 @@ class WatchCommand
     WatchOptions _options;
     int _output = STDOUT_FILENO;   // where the result goes
     std::optional<LiveRows> _rows; // where they are printed
+    ChannelCounts _channelCounts;
     std::unique_ptr<VentrikModel> _model;
+    std::unique_ptr<ChannelPane> _tree;   // the model's, with a row for the channel
     std::unique_ptr<WatchViewer> _viewer; // none: trees are printed
 };
 

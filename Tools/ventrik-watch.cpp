@@ -30,6 +30,10 @@ WatchOptions parseArguments(int argc, char** argv)
                  [&] { result.rows.emplace(); });
     line.addOption("--select PATH", "of the rows those of the values there and below",
                    [&](const std::string& path) { selected.push_back(textValue(path)); });
+    line.addFlag("--channel-pane",
+                 "the root ends with a row for the channel: what came, and what did not; c shows "
+                 "it, too",
+                 result.channelPane);
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,
@@ -44,6 +48,8 @@ WatchOptions parseArguments(int argc, char** argv)
     refuseWrongRecording(line);
     if (!selected.empty() && !result.rows)
         line.refuse("--select goes with --rows");
+    if (result.channelPane && result.rows)
+        line.refuse("--channel-pane does not go with --rows");
     if (result.rows)
         result.rows->selection = PathSelection(selected);
     return result;

@@ -104,6 +104,10 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                  [&app = result.app] { app.animation = false; });
     line.addFlag("--plain", "no animation, and values that have changed are not tinted",
                  [&app = result.app] { app.animation = app.tintsChanges = false; });
+    line.addFlag("--channel-pane",
+                 "the root ends with a row for the channel: what came, and what did not; F8 shows "
+                 "it, too",
+                 result.app.channelPane);
     line.addOption("--records LAYOUTS", recordsNames() + ", or the preference", result.records,
                    recordsValue);
     line.addFlag("--remember-records", "makes that the preference, for later runs",

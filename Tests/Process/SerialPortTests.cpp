@@ -123,6 +123,22 @@ TEST_F(SerialPortProcess, SaysThatThePhoneRefuses)
     EXPECT_TRUE(service->isRunning());
 }
 
+TEST_F(SerialPortProcess, TellsViewersOfThePhone)
+{
+    EmulatedPhone phone(device);
+    const auto service = startSerial();
+    const auto viewer = start("ventrik-watch", {"--once", "--channel-pane"});
+    ASSERT_TRUE(isAsked(phone));
+    Bytes bad = logFrame(record);
+    bad[6] ^= 1;
+    const Bytes cellInfo = logRecord(0xB0C2, stampIn2025(), Bytes(25));
+    EXPECT_TRUE(phone.send(joined({answer, bad, frame({0x4B, 1}), logFrame(cellInfo)})));
+    ASSERT_EQ(viewer->waitForEnd(), 0) << viewer->errors();
+    for (const char* row : {"Log Masks: set\n", "Log Records: 1\n", "Frames of Kind 0x4B: 1\n",
+                            "Bad Checksums: 1, the first at offset ", "Messages: 1\n"})
+        EXPECT_THAT(viewer->output(), HasSubstr(row));
+}
+
 TEST_F(SerialPortProcess, SaysThatThePhoneIsSilent)
 {
     EmulatedPhone phone(device);

@@ -106,6 +106,21 @@ TEST_F(WatchTerminal, DrillsDownAndBack)
     EXPECT_TRUE(waitUntil([&] { return sockets().size() == 1; }));
 }
 
+TEST_F(WatchTerminal, ShowsTheChannelOnAKeyAlsoWithoutAService)
+{
+    Terminal shown = terminal();
+    shown.run(viewer());
+    ASSERT_TRUE(shown.shows("waiting for the service"));
+    shown.press({"c"});
+    EXPECT_TRUE(shown.shows(" Ventrik › Channel\n"));
+    EXPECT_TRUE(shown.shows("no service"));
+    const auto service = startScenario();
+    EXPECT_TRUE(shown.shows("open since "));
+    shown.press({"c"});
+    EXPECT_TRUE(shown.shows(" Serving Cell Info "));
+    EXPECT_TRUE(shown.hides("Channel"));
+}
+
 TEST_F(WatchTerminal, FindsRowsOfTheWholeTree)
 {
     const auto service = startScenario();

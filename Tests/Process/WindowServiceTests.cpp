@@ -62,6 +62,17 @@ TEST_F(WindowService, ShowsAPhoneAtASerialPortAndDisablesItsLogsAtTheEnd)
     EXPECT_EQ(phone.commands().back(), (Bytes{0x73, 0, 0, 0, 0, 0, 0, 0}));
 }
 
+TEST_F(WindowService, TellsWhatItsPhoneRefuses)
+{
+    EmulatedPhone phone(path("phone"));
+    const auto window = start("ventrik", {"--serial", path("phone"), "--technology", "lte"});
+    ASSERT_TRUE(waitUntil([&] { return !phone.commands().empty(); })) << window->errors();
+    EXPECT_TRUE(phone.send(frame(Bytes{0x13, 0x73})));
+    EXPECT_TRUE(waitUntil([&] {
+        return window->says("/phone refuses to send logs: it answers 0x13\n");
+    })) << window->errors();
+}
+
 TEST_F(WindowService, ShowsAReplayAsDecodingDoes)
 {
     const std::string capture = path("drive.pcap");

@@ -340,6 +340,28 @@ TEST_F(Panes, NothingFoundIsSaid)
     EXPECT_EQ(panes.remark(), "nothing found: quarz");
 }
 
+TEST_F(Panes, AskForTheChannelByAKeyButNotInASearch)
+{
+    const KeyPress c{Key::Character, 'c'};
+    EXPECT_EQ(panes.handle(c), Outcome::TogglesChannel);
+    type(U"/");
+    EXPECT_EQ(panes.handle(c), Outcome::Stays);
+    EXPECT_EQ(panes.sought(), "c");
+}
+
+TEST_F(Panes, GoToTheLastRowOfTheRootFromAnywhere)
+{
+    panes.handle({Key::Enter});
+    tree.show(PlistDictionary{{"Serving Cell", PlistDictionary()}, {"Last", PlistDictionary()}});
+    panes.reload();
+    panes.goToLastOfRoot();
+    EXPECT_EQ(path(), "/Last");
+    EXPECT_EQ(panes.panes().size(), 2U);
+    panes.goToRoot();
+    EXPECT_EQ(path(), "/");
+    EXPECT_EQ(row(), "Last");
+}
+
 TEST_F(Panes, WhatIsFoundFollowsTheTree)
 {
     type(U"/pci");

@@ -28,6 +28,7 @@ constexpr std::string_view keys[][2] = {
     {"Left Bksp Esc", "back"},
     {"/", "find in all rows"},
     {"n N", "next, previous"},
+    {"c", "the channel: why nothing appears"},
     {"q", "quit"},
 };
 

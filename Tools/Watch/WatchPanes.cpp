@@ -130,6 +130,8 @@ WatchPanes::Outcome WatchPanes::handle(KeyPress press)
     _remark.clear();
     if (_mode != Mode::Finding && press.key == Key::Character && press.character == 'q')
         return Outcome::Quits;
+    if (_mode == Mode::Rows && press.key == Key::Character && press.character == 'c')
+        return Outcome::TogglesChannel;
     if (_mode == Mode::Finding)
         handleInFinding(press);
     else if (_mode == Mode::Rows)
@@ -236,6 +238,17 @@ void WatchPanes::goBack()
 {
     if (_panes.size() > 1)
         _panes.pop_back();
+}
+
+void WatchPanes::goToRoot()
+{
+    _panes.resize(1);
+}
+
+void WatchPanes::goToLastOfRoot()
+{
+    goToRoot();
+    openPaneOf(pane().rowCount() - 1);
 }
 
 void WatchPanes::reload()

@@ -64,7 +64,7 @@ class WatchPanes
 {
   public:
     enum class Mode { Rows, Finding, WholeText, Keys };
-    enum class Outcome { Stays, Quits };
+    enum class Outcome { Stays, TogglesChannel, Quits };
 
     /// The tree outlives the panes.
     explicit WatchPanes(DisplayTree& tree);
@@ -73,6 +73,9 @@ class WatchPanes
     /// Brings all panes up to date with the tree as it is now. A pane whose node has gone goes,
     /// with those behind it; marks follow their rows by name.
     void reload();
+    void goToRoot();
+    /// From the root to the last of its rows.
+    void goToLastOfRoot();
 
     Mode mode() const { return _mode; }
     /// From the root to the one that shows; never empty.

@@ -14,15 +14,18 @@ namespace
 using namespace std::chrono_literals;
 
 constexpr auto tick = 1s;
+constexpr int secondsBetweenUpdates = 2; // of the channel's rows
 
 } // namespace
 
-WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, int mostErrorLines,
-                         std::function<void()> end)
+WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, ChannelPane& tree,
+                         int mostErrorLines, std::function<void()> end)
     : _platform(platform),
       _model(model),
+      _tree(tree),
+      _keepsChannel(tree.isShown()),
       _end(std::move(end)),
-      _panes(model),
+      _panes(tree),
       _screen(mostErrorLines, [this] { draw(); }),
       _signals({.resized =
                     [this] {
@@ -41,6 +44,7 @@ WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, int most
     _model.setChannelCallback([this] { draw(); });
     _ticks = _platform.mainQueue.repeatEvery(tick, [this] {
         _screen.errors().trim();
+        updateChannel();
         draw();
     });
     draw();
@@ -53,6 +57,7 @@ WatchViewer::~WatchViewer()
 
 void WatchViewer::refresh()
 {
+    _tree.takeDisplay();
     _panes.reload();
     if (_model.isConnected())
         _lastUpdate = _platform.clock.now();
@@ -62,12 +67,38 @@ void WatchViewer::refresh()
 void WatchViewer::readKeys()
 {
     bool quits = _screen.hasEnded();
-    for (const KeyPress press : _screen.readKeys())
-        quits = quits || _panes.handle(press) == WatchPanes::Outcome::Quits;
+    for (const KeyPress press : _screen.readKeys()) {
+        const auto outcome = _panes.handle(press);
+        quits = quits || outcome == WatchPanes::Outcome::Quits;
+        if (outcome == WatchPanes::Outcome::TogglesChannel)
+            toggleChannel();
+    }
     if (!quits)
         return draw();
     _input.setEnabled(false);
     _end();
+}
+
+void WatchViewer::toggleChannel()
+{
+    const bool leaves = _tree.holds(_panes.pane().path);
+    if (leaves && !_keepsChannel)
+        _tree.hide();
+    else
+        _tree.show();
+    _panes.goToRoot();
+    _panes.reload();
+    if (!leaves)
+        _panes.goToLastOfRoot();
+}
+
+// Also while nothing comes; then above all.
+void WatchViewer::updateChannel()
+{
+    if (++_seconds % secondsBetweenUpdates != 0 || !_tree.holds(_panes.pane().path))
+        return;
+    _tree.update();
+    _panes.reload();
 }
 
 void WatchViewer::draw()

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Model/ChannelPane.h"
 #include "Model/VentrikModel.h"
 #include "Platform/Platform.h"
 #include "Tools/Watch/CursesScreen.h"
@@ -21,11 +22,11 @@ namespace ventrik
 class WatchViewer
 {
   public:
-    /// The model and what the platform refers to outlive this. `end` is called once, when the user
-    /// quits or the terminal has gone; then come so many lines of standard error at most. Throws
-    /// std::runtime_error where the terminal cannot show it.
-    WatchViewer(const Platform& platform, VentrikModel& model, int mostErrorLines,
-                std::function<void()> end);
+    /// The model, its tree and what the platform refers to outlive this. `end` is called once, when
+    /// the user quits or the terminal has gone; then come so many lines of standard error at most.
+    /// Throws std::runtime_error where the terminal cannot show it.
+    WatchViewer(const Platform& platform, VentrikModel& model, ChannelPane& tree,
+                int mostErrorLines, std::function<void()> end);
     ~WatchViewer();
     WatchViewer(const WatchViewer&) = delete;
     WatchViewer& operator=(const WatchViewer&) = delete;
@@ -35,11 +36,16 @@ class WatchViewer
 
   private:
     void readKeys();
+    void toggleChannel();
+    void updateChannel();
     void draw();
     WatchStatus status() const;
 
     Platform _platform;
     VentrikModel& _model;
+    ChannelPane& _tree;
+    const bool _keepsChannel; // its row was there from the start
+    int _seconds = 0;
     std::function<void()> _end;
     std::optional<Clock::TimePoint> _lastUpdate;
     bool _wasConnected = false;

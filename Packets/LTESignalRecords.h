@@ -137,20 +137,21 @@ enum class MeasuredAntennas : std::uint8_t {
     OfCellMask,   ///< bit k of the cell's mask
 };
 
-inline constexpr std::uint16_t none = 0xFFFF;
+// In the place of an offset or a size: the version has no such thing.
+inline constexpr std::uint16_t absent = 0xFFFF;
 
 /// What a version of the subpacket tells.
 struct SignalVersion {
     std::uint8_t version;
     Place earfcn; ///< of the subpacket
     std::uint16_t headerSize;
-    std::uint16_t
-        stride; ///< of the cells; 0: what the header leaves, in equal parts; none: there is one
+    /// Of the cells; 0: what the header leaves, in equal parts; absent: there is one.
+    std::uint16_t stride;
     std::uint16_t identity; ///< of the cell
-    std::uint16_t frame;    ///< of the cell, or none
+    std::uint16_t frame;    ///< of the cell, or absent
     std::uint16_t levels;   ///< of the cell
     const SignalOrder* order;
-    std::uint16_t noise; ///< of the cell, or none
+    std::uint16_t noise; ///< of the cell, or absent
     MeasuredAntennas measured;
     std::uint8_t servingBit; ///< of the identity's word; 0: the one cell is the serving cell
 };
@@ -161,26 +162,26 @@ inline constexpr Place headerMask = u16(10);
 inline constexpr Place cellMask = u32(0);
 using enum MeasuredAntennas;
 inline constexpr std::array<SignalVersion, 12> signalVersions{{
-    {4, narrowEARFCN, 2, none, 0, none, 10, &orderA, 58, All, 0},
-    {7, wideEARFCN, 4, none, 0, none, 12, &orderA, 60, All, 0},
-    {18, wideEARFCN, 4, none, 0, 4, 16, &orderA, 64, All, 0},
+    {4, narrowEARFCN, 2, absent, 0, absent, 10, &orderA, 58, All, 0},
+    {7, wideEARFCN, 4, absent, 0, absent, 12, &orderA, 60, All, 0},
+    {18, wideEARFCN, 4, absent, 0, 4, 16, &orderA, 64, All, 0},
     {19, wideEARFCN, 8, 88, 0, 4, 16, &orderA, 64, All, 12},
     {22, wideEARFCN, 8, 120, 0, 4, 16, &orderB, 76, All, 12},
     {35, wideEARFCN, 8, 128, 0, 4, 16, &orderC, 80, WithRSRP, 12},
     {36, wideEARFCN, 8, 128, 0, 4, 16, &orderC, 80, OfHeaderMask, 12},
     {40, wideEARFCN, 8, 132, 0, 4, 16, &orderD, 84, OfHeaderMask, 12},
     {48, wideEARFCN, 12, 140, 0, 4, 16, &orderD, 92, OfHeaderMask, 12},
-    {56, wideEARFCN, 8, 0, 8, none, 24, &orderD, none, OfCellMask, 15},
-    {59, wideEARFCN, 8, 0, 8, none, 24, &orderD, none, OfCellMask, 15},
-    {60, wideEARFCN, 8, 0, 8, 12, 24, &orderD, none, OfCellMask, 15},
+    {56, wideEARFCN, 8, 0, 8, absent, 24, &orderD, absent, OfCellMask, 15},
+    {59, wideEARFCN, 8, 0, 8, absent, 24, &orderD, absent, OfCellMask, 15},
+    {60, wideEARFCN, 8, 0, 8, 12, 24, &orderD, absent, OfCellMask, 15},
 }};
 
 /// The fields of a version's cells, as places in the cell.
 struct SignalFields {
     std::array<Field, 8> ofCell{}; ///< identity, frame, levels of all antennas
     std::size_t ofCellCount = 0;
-    std::array<std::array<Field, 4>, 4>
-        ofAntennas{}; ///< RSRP, RSRQ, RSSI and, where it stands, SNR
+    /// RSRP, RSRQ, RSSI and, where it stands, SNR.
+    std::array<std::array<Field, 4>, 4> ofAntennas{};
     std::size_t ofAntennaCount = 0;
     std::array<Field, 4> ofHeader{}; ///< the frequency first
     Field carrier{};
@@ -202,7 +203,6 @@ inline constexpr std::array<std::array<std::string_view, 4>, 4> antennaKeys{{
     {"RSRP Rx 2", "RSRQ Rx 2", "RSSI Rx 2", "SNR Rx 2"},
     {"RSRP Rx 3", "RSRQ Rx 3", "RSSI Rx 3", "SNR Rx 3"},
 }};
-inline constexpr std::array<std::string_view, 1> falseLabel{"False"};
 
 constexpr Place levelPlace(const SignalVersion& version, LevelPlace level, std::uint8_t width)
 {
@@ -225,7 +225,7 @@ constexpr SignalFields signalFields(const SignalVersion& version)
     const auto add = [&](const Field& field) { fields.ofCell[fields.ofCellCount++] = field; };
     const SignalOrder& order = *version.order;
     add({"Physical Cell ID", bits(version.identity, 0, 9), physicalCellIdentity});
-    if (version.frame != none) {
+    if (version.frame != absent) {
         add({"System Frame Number", bits(version.frame, 0, 10)});
         add({"Subframe Number", bits(version.frame, 10, 4)});
     }
@@ -237,7 +237,7 @@ constexpr SignalFields signalFields(const SignalVersion& version)
     add({"RSRQ", levelPlace(version, order.best.rsrq, 10), rsrqLevel});
     add({"RSSI", levelPlace(version, order.best.rssi, 11), rssiLevel});
 
-    const bool hasNoise = version.noise != none;
+    const bool hasNoise = version.noise != absent;
     fields.ofAntennaCount = hasNoise ? 4 : 3;
     for (std::size_t i = 0; i < order.antennaCount; ++i) {
         const AntennaLevels& levels = order.antennas[i];
@@ -258,7 +258,7 @@ constexpr SignalFields signalFields(const SignalVersion& version)
     fields.carrier = {"Carrier Index",
                       bits(static_cast<std::uint16_t>(version.identity + 1), 1, 3)};
     fields.serving = {"Serving", bits(version.identity, version.servingBit, 1),
-                      labels(falseLabel, "True")};
+                      labels(LTERecords::falseLabel, "True")};
     fields.needed = version.levels + 4 * std::size_t{order.words};
     if (hasNoise)
         fields.needed = noisePlace(version, order.antennaCount - std::size_t{1}).offset + 4U;

@@ -24,17 +24,17 @@ std::size_t endOf(const RecordElements& elements)
 
 // ---- LTE
 
-bool isOfRelease(const LogPacket& packet, std::uint8_t release)
+bool isOfRelease1(const LogPacket& packet)
 {
-    constexpr std::size_t offset = 14;
-    return packet.u8(offset) == release;
+    constexpr std::size_t releaseOffset = 14;
+    return packet.u8(releaseOffset) == 1;
 }
 
 // Release 1 brings one more word at the end.
 bool endsAsItsReleaseSays(const Record& record, const LogPacket& packet)
 {
     constexpr std::size_t word = 4;
-    return packet.size() == record.minimumSize + (isOfRelease(packet, 1) ? word : 0);
+    return packet.size() == record.minimumSize + (isOfRelease1(packet) ? word : 0);
 }
 
 bool hasWholeElements(const Record& record, const LogPacket& packet)
@@ -47,12 +47,12 @@ bool hasWholeElements(const Record& record, const LogPacket& packet)
 
 bool hasWholeShortElements(const Record& record, const LogPacket& packet)
 {
-    return !isOfRelease(packet, 1) && hasWholeElements(record, packet);
+    return !isOfRelease1(packet) && hasWholeElements(record, packet);
 }
 
 bool hasWholeLongElements(const Record& record, const LogPacket& packet)
 {
-    return isOfRelease(packet, 1) && hasWholeElements(record, packet);
+    return isOfRelease1(packet) && hasWholeElements(record, packet);
 }
 
 // Zeros stand beside the carrier's number, and both lists lie in the packet. More may follow.

@@ -56,7 +56,7 @@ RecordElements cellsOf(const SignalVersion& version, const SignalFields& fields,
                        const LogPacket& subpacket)
 {
     const std::size_t offset = Subpackets::headSize + version.headerSize;
-    if (version.stride == none)
+    if (version.stride == absent)
         return {offset, fields.needed, 1, fields.needed};
     const auto count = static_cast<std::size_t>(numberAt(subpacket, signalCellCount));
     if (version.stride > 0)

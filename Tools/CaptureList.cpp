@@ -49,11 +49,25 @@ CaptureList::CaptureList(std::vector<std::string> captures, std::vector<std::str
 std::optional<std::string> CaptureList::next()
 {
     for (;;) {
+        const bool isNamed = _pending.empty();
+        if (isNamed)
+            tellEmptyDirectory();
         auto name = nextName();
-        if (!name || !isDirectory(*name))
+        if (!name || !isDirectory(*name)) {
+            _directory.reset();
             return name;
+        }
+        if (isNamed)
+            _directory = *name;
         enter(*name);
     }
+}
+
+void CaptureList::tellEmptyDirectory()
+{
+    if (_directory)
+        _errors.push_back(fmt::format("{}: there are no captures in it", *_directory));
+    _directory.reset();
 }
 
 std::optional<std::string> CaptureList::nextName()
@@ -108,8 +122,10 @@ void CaptureList::enter(const std::string& directory)
         if (!isHidden(entry->path()) && !isLinkedDirectory)
             names.push_back(entry->path().native());
     }
-    if (error)
+    if (error) {
         _errors.push_back(fmt::format("{}: {}", directory, error.message()));
+        _directory.reset(); // nobody knows what is in it
+    }
     std::ranges::sort(names, std::ranges::greater());
     _pending.insert(_pending.end(), names.begin(), names.end());
 }

@@ -23,7 +23,7 @@ class CaptureList
     std::optional<std::string> next();
     /// Whether it is one file that was named, and not a directory or a list.
     bool isSingle() const { return _isSingle; }
-    /// A line for each list or directory that cannot be read.
+    /// A line for each list or directory that cannot be read, and for each empty directory.
     std::vector<std::string> takeErrors();
 
   private:
@@ -34,11 +34,13 @@ class CaptureList
     std::optional<std::string> nextLine();
     bool openNextList();
     void enter(const std::string& directory);
+    void tellEmptyDirectory();
 
     std::vector<std::string> _captures; // the next one is the last
     std::vector<std::string> _lists;    // likewise
     std::unique_ptr<std::FILE, Closer> _list;
-    std::vector<std::string> _pending; // of directories that were entered; likewise
+    std::vector<std::string> _pending;     // of directories that were entered; likewise
+    std::optional<std::string> _directory; // that was named, while no file was found below
     std::vector<std::string> _errors;
     bool _isSingle;
 };

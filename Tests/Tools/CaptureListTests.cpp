@@ -87,6 +87,17 @@ TEST_F(CaptureListTest, TellsWhatItCannotRead)
     EXPECT_THAT(list.takeErrors(), IsEmpty());
 }
 
+TEST_F(CaptureListTest, TellsWhichDirectoryHasNoFileBelow)
+{
+    std::filesystem::create_directories(path("empty/below"));
+    write("full/empty/.hidden");
+    write("full/file");
+    CaptureList list({path("empty"), path("full"), path("empty")}, {});
+    EXPECT_THAT(all(list), ElementsAre(path("full/file")));
+    const std::string line = path("empty") + ": there are no captures in it";
+    EXPECT_THAT(list.takeErrors(), ElementsAre(line, line));
+}
+
 TEST_F(CaptureListTest, KnowsWhetherItIsOneFile)
 {
     write("d/file");

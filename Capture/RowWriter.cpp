@@ -1,6 +1,7 @@
 #include "Capture/RowWriter.h"
 
 #include "PropertyList/Json.h"
+#include "PropertyList/TerminalText.h"
 
 #include <algorithm>
 #include <array>
@@ -56,7 +57,7 @@ constexpr std::array<Column, 7> closingColumns{{
     {"bytes", "whole number", "of the records"},
 }};
 
-void appendCsvText(std::string& row, std::string_view text)
+void appendQuotedWhereNeeded(std::string& row, std::string_view text)
 {
     const bool isPlain = !text.empty() && text.find_first_of(",\"\r\n") == text.npos;
     if (isPlain) {
@@ -72,11 +73,68 @@ void appendCsvText(std::string& row, std::string_view text)
     row += '"';
 }
 
+bool isPlainAscii(std::string_view text)
+{
+    return std::ranges::all_of(text,
+                               [](char character) { return character >= ' ' && character <= '~'; });
+}
+
+// What a terminal would obey, and programs stumble over; lines and columns stay.
+std::string withoutControls(std::string_view text)
+{
+    constexpr std::string_view kept = "\t\r\n";
+    std::string harmless;
+    for (;;) {
+        const std::size_t end = std::min(text.find_first_of(kept), text.size());
+        appendTerminalText(harmless, text.substr(0, end));
+        if (end == text.size())
+            return harmless;
+        harmless += text[end];
+        text.remove_prefix(end + 1);
+    }
+}
+
+// JSON has escapes, a table has none.
+void appendCsvText(std::string& row, std::string_view text)
+{
+    if (!isPlainAscii(text)) {
+        const std::string harmless = withoutControls(text);
+        return appendQuotedWhereNeeded(row, harmless);
+    }
+    appendQuotedWhereNeeded(row, text);
+}
+
 template <std::integral Number>
 void appendDigits(std::string& row, Number number)
 {
     const fmt::format_int digits(number);
     row.append(digits.data(), digits.size());
+}
+
+// A number of four decimals at most, as most are; false for others. A decimal of 15 digits at most
+// that is read as the number is also the shortest one that is.
+bool appendFewDecimals(std::string& row, double number)
+{
+    constexpr double most = 1e10;
+    constexpr double scale = 10000;
+    constexpr std::size_t decimals = 4;
+    if (std::abs(number) >= most)
+        return false;
+    const double scaled = std::nearbyint(number * scale);
+    if (scaled / scale != number)
+        return false;
+    if (scaled < 0)
+        row += '-';
+    const auto whole = static_cast<std::uint64_t>(std::abs(scaled));
+    const auto ofScale = static_cast<std::uint64_t>(scale);
+    appendDigits(row, whole / ofScale);
+    // Of five digits the last four, without the zeros at their end.
+    const fmt::format_int digits(ofScale + whole % ofScale);
+    std::string_view fraction(digits.data() + 1, decimals);
+    fraction = fraction.substr(0, fraction.find_last_not_of('0') + 1);
+    if (!fraction.empty())
+        (row += '.') += fraction;
+    return true;
 }
 
 // So many digits as tell the number from all others.
@@ -86,7 +144,7 @@ void appendDigits(std::string& row, double number)
     const bool isWhole = std::abs(number) < largestWhole && std::trunc(number) == number;
     if (isWhole)
         appendDigits(row, static_cast<std::int64_t>(number));
-    else
+    else if (!appendFewDecimals(row, number))
         fmt::format_to(std::back_inserter(row), FMT_COMPILE("{}"), number);
 }
 
@@ -152,14 +210,10 @@ RowWriter::RowWriter(RowFormat format, std::string_view capture, std::string_vie
     }
 }
 
+// The name comes with all that stands before a JSON value; CSV needs the comma.
 void RowWriter::addName(std::string& row, std::string_view column) const
 {
-    row += ',';
-    if (!isJson())
-        return;
-    row += '"';
-    row += column;
-    row += "\":";
+    row += isJson() ? column : column.substr(0, 1);
 }
 
 void RowWriter::addText(std::string& row, std::string_view column, std::string_view text) const
@@ -200,72 +254,81 @@ std::string_view RowWriter::recordPart(const RowRecord& record)
 {
     const auto micros = std::chrono::floor<std::chrono::microseconds>(record.time);
     const auto second = std::chrono::floor<std::chrono::seconds>(micros);
-    if (_secondPart.empty() || second != _second) {
-        _second = second;
-        _secondPart.clear();
-        addName(_secondPart, "time");
-        _secondPart += fmt::format(FMT_COMPILE("{}{:%FT%T}."), isJson() ? "\"" : "", second);
-    }
-    // What all rows begin with stays.
-    if (_recordPart.empty()) {
-        _recordPart = _capture + (isJson() ? ",\"record\":" : ",");
-        _recordStart = _recordPart.size();
-    }
-    _recordPart.resize(_recordStart);
-    appendDigits(_recordPart, record.number);
-    _recordPart += _secondPart;
+    const KindPart& kind = kindPart(record);
+    const fmt::format_int number(record.number);
     // Of seven digits the last six.
     const fmt::format_int fraction(1000000U +
                                    static_cast<std::uint32_t>((micros - second).count()));
-    _recordPart.append(fraction.data() + 1, fraction.size() - 1);
-    _recordPart += kindPart(record);
+    if (_secondPart.empty() || second != _second) {
+        _second = second;
+        _secondPart.clear();
+        addName(_secondPart, R"(,"time":)");
+        _secondPart += fmt::format(FMT_COMPILE("{}{:%FT%T}."), isJson() ? "\"" : "", second);
+        _kind = 0;
+    }
+    if (_recordPart.empty()) {
+        _recordPart = _capture + (isJson() ? ",\"record\":" : ",");
+        _numberStart = _recordPart.size();
+    }
+    // Else all stands where it stood in the record before.
+    if (kind.serial != _kind || number.size() != _numberSize) {
+        _kind = kind.serial;
+        _numberSize = number.size();
+        _fractionStart = _numberStart + _numberSize + _secondPart.size();
+        _recordPart.resize(_numberStart + _numberSize);
+        _recordPart += _secondPart;
+        _recordPart.resize(_fractionStart + fraction.size() - 1);
+        _recordPart += kind.text;
+    }
+    std::copy_n(number.data(), number.size(), _recordPart.data() + _numberStart);
+    std::copy_n(fraction.data() + 1, fraction.size() - 1, _recordPart.data() + _fractionStart);
     return _recordPart;
 }
 
-std::string_view RowWriter::kindPart(const RowRecord& record)
+const RowWriter::KindPart& RowWriter::kindPart(const RowRecord& record)
 {
     KindPart& part = _kindParts[(record.kind ? hashOf(*record.kind) : 0) % kindPartCount];
     if (!part.text.empty() && part.subscription == record.subscription &&
         areAlike(part.kind, record.kind))
-        return part.text;
-    part = {record.subscription, record.kind, isJson() ? "Z\"" : "Z"};
-    addNumber(part.text, "subscription", record.subscription);
-    addTextOrNull(part.text, "technology", _technology);
+        return part;
+    part = {record.subscription, record.kind, isJson() ? "Z\"" : "Z", ++_lastKind};
+    addNumber(part.text, R"(,"subscription":)", record.subscription);
+    addTextOrNull(part.text, R"(,"technology":)", _technology);
     if (record.kind)
-        addText(part.text, "code", fmt::format(FMT_COMPILE("0x{:04X}"), record.kind->logCode));
+        addText(part.text, R"(,"code":)",
+                fmt::format(FMT_COMPILE("0x{:04X}"), record.kind->logCode));
     else
-        addNull(part.text, "code");
-    addNumber(part.text, "version", record.kind ? record.kind->version : std::nullopt);
-    addTextOrNull(part.text, "layout",
+        addNull(part.text, R"(,"code":)");
+    addNumber(part.text, R"(,"version":)", record.kind ? record.kind->version : std::nullopt);
+    addTextOrNull(part.text, R"(,"layout":)",
                   record.kind && record.kind->layout ? nameOf(*record.kind->layout)
                                                      : std::string_view());
-    return part.text;
+    return part;
 }
 
 std::string RowWriter::placePart(const RowPlace& place) const
 {
     std::string row;
-    addText(row, "section", place.section);
-    addText(row, "path", place.path);
-    addNumber(row, "index", place.index);
-    addText(row, "name", place.name);
+    addText(row, R"(,"section":)", place.section);
+    addText(row, R"(,"path":)", place.path);
+    addNumber(row, R"(,"index":)", place.index);
+    addText(row, R"(,"name":)", place.name);
     return row;
 }
 
-std::string RowWriter::valuePart(const RowValue& value) const
+void RowWriter::addValue(std::string& row, const RowValue& value) const
 {
-    std::string row;
-    row.reserve(64 + 2 * value.text.value_or("").size());
+    constexpr std::size_t most = 96; // as a rule
+    row.reserve(most);
     // JSON has no number that is not finite.
     const bool isNumber = value.number && std::isfinite(*value.number);
-    addNumber(row, "number", isNumber ? value.number : std::nullopt);
-    addTextOrNull(row, "unit", isNumber ? value.unit : std::string_view());
+    addNumber(row, R"(,"number":)", isNumber ? value.number : std::nullopt);
+    addTextOrNull(row, R"(,"unit":)", isNumber ? value.unit : std::string_view());
     if (value.text)
-        addText(row, "text", *value.text);
+        addText(row, R"(,"text":)", *value.text);
     else
-        addNull(row, "text");
-    row += isJson() ? "}\n" : _csvEnd;
-    return row;
+        addNull(row, R"(,"text":)");
+    row += isJson() ? std::string_view("}\n") : _csvEnd;
 }
 
 void RowWriter::appendClosing(std::string& rows, const RowClosing& closing) const
@@ -273,13 +336,13 @@ void RowWriter::appendClosing(std::string& rows, const RowClosing& closing) cons
     rows += _capture;
     if (!isJson())
         rows += nothings(valueColumns).substr(1);
-    addText(rows, "status", closing.status);
-    addNumber(rows, "offset", closing.offset);
-    addTextOrNull(rows, "reason", closing.reason);
-    addNumber(rows, "records", std::optional(closing.records));
-    addNumber(rows, "decoded", std::optional(closing.decoded));
-    addNumber(rows, "rows", std::optional(closing.rows));
-    addNumber(rows, "bytes", std::optional(closing.bytes));
+    addText(rows, R"(,"status":)", closing.status);
+    addNumber(rows, R"(,"offset":)", closing.offset);
+    addTextOrNull(rows, R"(,"reason":)", closing.reason);
+    addNumber(rows, R"(,"records":)", std::optional(closing.records));
+    addNumber(rows, R"(,"decoded":)", std::optional(closing.decoded));
+    addNumber(rows, R"(,"rows":)", std::optional(closing.rows));
+    addNumber(rows, R"(,"bytes":)", std::optional(closing.bytes));
     rows += isJson() ? "}\n" : "\n";
 }
 

@@ -71,8 +71,8 @@ class RowWriter
     std::string_view recordPart(const RowRecord& record);
     /// Those of a value's place.
     std::string placePart(const RowPlace& place) const;
-    /// The others, and the line's end.
-    std::string valuePart(const RowValue& value) const;
+    /// Adds the others, and the line's end.
+    void addValue(std::string& row, const RowValue& value) const;
 
     void appendClosing(std::string& rows, const RowClosing& closing) const;
 
@@ -81,12 +81,13 @@ class RowWriter
     struct KindPart {
         std::optional<std::uint32_t> subscription;
         std::optional<RecordKind> kind;
-        std::string text; ///< empty: nothing yet
+        std::string text;       ///< empty: nothing yet
+        std::size_t serial = 0; ///< another text has another one
     };
 
     bool isJson() const { return _format == RowFormat::JsonLines; }
-    std::string_view kindPart(const RowRecord& record);
-    /// A name, in JSON, and a text; `text` gets what separates it from the column before.
+    const KindPart& kindPart(const RowRecord& record);
+    /// A column's name, in JSON, and a text. Names come as `,"name":`.
     void addText(std::string& row, std::string_view column, std::string_view text) const;
     void addNull(std::string& row, std::string_view column) const;
     void addTextOrNull(std::string& row, std::string_view column, std::string_view text) const;
@@ -98,12 +99,16 @@ class RowWriter
     RowFormat _format;
     std::string _capture; // the column of that name
     std::string _technology;
-    std::string _csvEnd; // of a row
-    std::string _recordPart;
-    std::size_t _recordStart = 0;     // of its number in that part
+    std::string _csvEnd;              // of a row
     std::vector<KindPart> _kindParts; // each where its kind leads
+    std::string _recordPart;          // of the last record; empty while there is none
     std::chrono::sys_seconds _second{};
-    std::string _secondPart; // of that second; empty while there is none
+    std::string _secondPart;      // of that second; empty while there is none
+    std::size_t _kind = 0;        // its part's serial
+    std::size_t _lastKind = 0;    // that was given
+    std::size_t _numberStart = 0; // of what changes in that part
+    std::size_t _numberSize = 0;
+    std::size_t _fractionStart = 0;
 };
 
 } // namespace ventrik

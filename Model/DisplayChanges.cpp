@@ -51,6 +51,15 @@ std::string_view nameOf(const DisplayPlace& place)
     return place.isSorted ? labelOfSortedKey(place.key) : place.key;
 }
 
+// Most values keep their length.
+void keepText(std::string& kept, std::string_view text)
+{
+    if (kept.size() == text.size())
+        std::copy_n(text.data(), text.size(), kept.data());
+    else
+        kept = text;
+}
+
 std::string pathOf(const DisplayPlace& place)
 {
     const DisplayPlace* holder = place.holder->place;
@@ -141,10 +150,9 @@ void DisplayChanges::compareWith(DisplayGroup& group, Container& container)
 {
     std::vector<std::size_t> entries = std::exchange(_entries, {});
     const bool isNew = std::exchange(group.isNew, false);
-    const bool areOnlyValues = !isNew && container.watch().haveOnlyValuesChanged(entries);
+    const bool areOnlyValues = !isNew && container.watch().takeOnlyValuesChanged(entries);
     container.watch().add(_log, group.token);
-    // In an order of their own those that are sorted have more to look at.
-    if (areOnlyValues && !group.isSorted)
+    if (areOnlyValues && !group.hasDoubles)
         compareValues(group, container, entries);
     else
         compareAll(group, container);
@@ -155,9 +163,13 @@ template <typename Container>
 void DisplayChanges::compareValues(DisplayGroup& group, const Container& container,
                                    const std::vector<std::size_t>& entries)
 {
-    for (const std::size_t entry : entries)
+    for (const std::size_t place : entries) {
+        if (group.isSorted && place == group.markerPlace)
+            continue;
+        const std::size_t entry = place - (group.isSorted && place > group.markerPlace ? 1 : 0);
         if (entry < group.entries.size())
-            compareValue(group.entries[entry], valueAt(container, entry), false);
+            compareValue(group.entries[entry], valueAt(container, place), false);
+    }
 }
 
 void DisplayChanges::compareAll(DisplayGroup& group, const PlistArray& array)
@@ -188,6 +200,7 @@ void DisplayChanges::compareAll(DisplayGroup& group, const PlistDictionary& dict
         });
     if (!hasSameKeys)
         areNew = takeOverKeys(group, dictionary);
+    group.markerPlace = dictionary.placeOf(sortedMarker).value_or(0);
     std::size_t i = 0;
     for (const auto& [key, value] : dictionary)
         if (key != sortedMarker) {
@@ -276,7 +289,7 @@ void DisplayChanges::compareValue(DisplayGroup::Entry& entry, const PlistValue& 
         add(DisplayChange::Kind::Gone, *entry.place);
         release(*std::exchange(entry.group, nullptr));
     }
-    entry.place->text = text;
+    keepText(entry.place->text, text);
     add(DisplayChange::Kind::Shown, *entry.place);
 }
 

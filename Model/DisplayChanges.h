@@ -66,7 +66,8 @@ struct DisplayGroup {
     bool isNew = false; ///< another container than before
     bool isList = false;
     bool isSorted = false;
-    bool hasDoubles = false; ///< several keys have one label
+    bool hasDoubles = false;     ///< several keys have one label
+    std::size_t markerPlace = 0; ///< in a sorted container, of what says so and is no entry
     bool isUsed = false;
 };
 

@@ -57,13 +57,14 @@ class ContainerWatch
             std::erase(_watching->tokens, token);
     }
 
-    /// Whether nothing but values changed, and the places of those, some of them more than once.
-    /// Of what stands at several places that is not known.
-    bool haveOnlyValuesChanged(std::vector<std::size_t>& entries) const
+    /// Whether nothing but values changed, and the places of those, some of them more than once;
+    /// they are told but once. Of what stands at several places that is not known.
+    bool takeOnlyValuesChanged(std::vector<std::size_t>& entries)
     {
+        entries.clear();
         if (!_watching || _watching->haveAllChanged || _watching->tokens.size() != 1)
             return false;
-        entries.assign(_watching->entries.begin(), _watching->entries.end());
+        entries.swap(_watching->entries);
         return true;
     }
 

@@ -1,5 +1,6 @@
 #include "Tools/CaptureRows.h"
 
+#include <algorithm>
 #include <functional>
 #include <utility>
 
@@ -12,6 +13,7 @@ namespace
 // A display of more places than that is none that a person looks at; what it costs is its service's
 // affair, what it takes is not.
 constexpr std::size_t maximumKnownPlaces = 65536;
+constexpr std::size_t firstRoom = 4096;
 constexpr unsigned knownValueBits = 13;
 constexpr unsigned knownValueShift = 64 - knownValueBits;
 
@@ -22,6 +24,7 @@ CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
                          RecordsMode records)
     : _options(options),
       _records(records),
+      _generator(generator),
       _changes(generator),
       _writer(options.format, capture, technology.name),
       _wanted(generator.getStartCommand())
@@ -50,7 +53,9 @@ void CaptureRows::runStepsBefore(Clock::TimePoint time, const PlistDictionary& s
 
 void CaptureRows::take(const CapturedMessage& message, const PlistDictionary& state)
 {
-    count(message);
+    _closing.bytes += message.data.size();
+    if (_generator.lastRead() || _wanted.wants(message.data))
+        ++_closing.decoded;
     if (_options.every)
         _isUpdated = true;
     else
@@ -64,11 +69,32 @@ void CaptureRows::finish(const PlistDictionary& state)
         writeState(*_nextStep, state);
 }
 
-void CaptureRows::count(const CapturedMessage& message)
+void CaptureRows::close(const RowClosing& closing)
 {
-    _closing.bytes += message.data.size();
-    if (_wanted.wants(message.data))
-        ++_closing.decoded;
+    std::string row;
+    _writer.appendClosing(row, closing);
+    append(row, {}, {});
+}
+
+void CaptureRows::append(std::string_view recordPart, std::string_view placePart,
+                         std::string_view valuePart)
+{
+    const std::size_t size = _used + recordPart.size() + placePart.size() + valuePart.size();
+    if (size > _text.size())
+        _text.resize(std::max(2 * size, firstRoom));
+    char* end = _text.data() + _used;
+    end = std::copy_n(recordPart.data(), recordPart.size(), end);
+    end = std::copy_n(placePart.data(), placePart.size(), end);
+    std::copy_n(valuePart.data(), valuePart.size(), end);
+    _used = size;
+}
+
+// The generator knows it as a rule.
+std::optional<RecordKind> CaptureRows::kindOf(const CapturedMessage& message) const
+{
+    if (const ReadLayout* read = _generator.lastRead())
+        return RecordKind{read->logCode, read->version, read->size, read->kind};
+    return _wanted.wantsAll() ? std::nullopt : recordKindOf(message.data, _records);
 }
 
 void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictionary& state)
@@ -78,8 +104,7 @@ void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictio
         return;
     const RowRecord none{_closing.records, message.time, message.subscription, {}};
     RowRecord record = none;
-    if (!_wanted.wantsAll())
-        record.kind = recordKindOf(message.data, _records);
+    record.kind = kindOf(message);
     if (!std::exchange(_hasDisplay, true)) {
         // It also shows what no record told.
         for (const DisplayChange& change : changes)
@@ -111,7 +136,7 @@ void CaptureRows::writeRow(std::string_view recordPart, const DisplayChange& cha
         return;
     const std::string_view value =
         valuePart(_changes.cellAt(*change.place, state), change.place->text);
-    _text.append(recordPart).append(known.part).append(value);
+    append(recordPart, known.part, value);
     ++_closing.rows;
 }
 
@@ -131,8 +156,9 @@ std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& cell, st
     known.raw = number;
     known.workedOut = cell ? cell->workedOut : std::nullopt;
     known.text = text;
-    known.part = cell ? _writer.valuePart({cell->number(), field->shown.unit, text})
-                      : _writer.valuePart({plainNumber(text), {}, text});
+    known.part.clear();
+    _writer.addValue(known.part, cell ? RowValue{cell->number(), field->shown.unit, text}
+                                      : RowValue{plainNumber(text), {}, text});
     return known.part;
 }
 
@@ -148,9 +174,9 @@ void CaptureRows::writeHolder(std::string_view recordPart, const DisplayChange& 
     const std::string path = isGone ? description.path : description.path + "/";
     const std::string part =
         _writer.placePart({description.section, path, description.index, description.name});
-    _text += recordPart;
-    _text += part;
-    _text += _writer.valuePart(isGone ? RowValue{} : RowValue{.text = std::string_view()});
+    std::string value;
+    _writer.addValue(value, isGone ? RowValue{} : RowValue{.text = std::string_view()});
+    append(recordPart, part, value);
     ++_closing.rows;
 }
 

@@ -40,12 +40,14 @@ class CaptureRows
     /// After the last one: the rows that are left.
     void finish(const PlistDictionary& state);
 
-    std::string& text() { return _text; }
+    std::string_view text() const { return std::string_view(_text).substr(0, _used); }
+    /// The text was taken away.
+    void clearText() { _used = 0; }
     /// Counts on from what was before, of the same capture.
     void continueFrom(const RowClosing& closing) { _closing = closing; }
     /// What the closing row counts.
     RowClosing closing() const { return _closing; }
-    void close(const RowClosing& closing) { _writer.appendClosing(_text, closing); }
+    void close(const RowClosing& closing);
 
   private:
     /// What the rows of a place begin with, as long as it is the same place.
@@ -64,7 +66,9 @@ class CaptureRows
         std::string part;
     };
 
-    void count(const CapturedMessage& message);
+    std::optional<RecordKind> kindOf(const CapturedMessage& message) const;
+    void append(std::string_view recordPart, std::string_view placePart,
+                std::string_view valuePart);
     void writeChanges(const CapturedMessage& message, const PlistDictionary& state);
     void writeState(Clock::TimePoint time, const PlistDictionary& state);
     void writeRow(std::string_view recordPart, const DisplayChange& change,
@@ -77,9 +81,11 @@ class CaptureRows
 
     RowOptions _options;
     RecordsMode _records;
+    const LogGenerator& _generator;
     DisplayChanges _changes;
     RowWriter _writer;
-    std::string _text;
+    std::string _text; // with room behind what is used, so that rows need not make some
+    std::size_t _used = 0;
     RowClosing _closing;
     WantedCodes _wanted; ///< what the decoders ask for; all where messages are property lists
     std::vector<KnownPlace> _places; // by number, as far as they are kept

@@ -72,6 +72,13 @@ class Progress
     bool _shown = false;
 };
 
+// Rows tell all that changes by themselves. The log tells of the history, too.
+bool wantsHistory(const DecodeOptions& options)
+{
+    return options.format != DecodeFormat::Rows || options.snapshotFile || options.systemLogFile ||
+           options.verbose;
+}
+
 class Decoding
 {
   public:
@@ -82,7 +89,9 @@ class Decoding
           _clock(clock),
           _technology(technology),
           _output(output),
-          _decoder(generator, clock),
+          _decoder(generator, clock,
+                   wantsHistory(options) ? OfflineDecoder::History::Kept
+                                         : OfflineDecoder::History::NotWanted),
           _census(options.records)
     {
         if (options.format == DecodeFormat::Rows)
@@ -207,9 +216,14 @@ class Decoding
 
     void write()
     {
-        if (std::fwrite(_text.data(), 1, _text.size(), _output) != _text.size())
-            noteOutputError();
+        write(_text);
         _text.clear();
+    }
+
+    void write(std::string_view text)
+    {
+        if (std::fwrite(text.data(), 1, text.size(), _output) != text.size())
+            noteOutputError();
     }
 
     // The first failure is the one to tell.
@@ -247,8 +261,8 @@ class Decoding
 
     void flushRows()
     {
-        std::swap(_text, _rows->text());
-        write();
+        write(_rows->text());
+        _rows->clearText();
     }
 
     void closeRows()
@@ -398,7 +412,8 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
     const LinuxClock systemClock;
     CaptureClock clock(systemClock);
     const auto generator = LogGenerator::generatorFromTechnology(
-        technology->identifier, {log, resources, clock, AssertionPolicy::Throw, options.records});
+        technology->identifier, {log, resources, clock, AssertionPolicy::Throw, options.records,
+                                 wantsHistory(options) ? RawPackets::Kept : RawPackets::Dropped});
     if (!generator)
         return refuse(options,
                       fmt::format("{}: there is no decoder for the technology {}", options.capture,

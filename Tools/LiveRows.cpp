@@ -39,8 +39,10 @@ void LiveRows::messageTaken(Clock::TimePoint time, ByteView message, const Plist
 
 std::string LiveRows::takeText()
 {
-    if (_rows)
-        _text += std::exchange(_rows->text(), {});
+    if (_rows) {
+        _text += _rows->text();
+        _rows->clearText();
+    }
     return std::exchange(_text, {});
 }
 

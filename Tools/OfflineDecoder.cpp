@@ -14,18 +14,24 @@ constexpr std::chrono::nanoseconds tickInterval = std::chrono::seconds(2);
 
 void OfflineDecoder::take(const CapturedMessage& message)
 {
-    if (!_nextTick) {
-        _nextTick = message.time + tickInterval;
-    } else if (message.time < _lastTime - tickInterval) {
-        generate();
-        _nextTick = message.time + tickInterval;
-    } else {
-        runTicksBefore(message.time);
-    }
-    _lastTime = message.time;
+    if (_history == History::Kept)
+        runTicksUntil(message.time);
     _clock.set(message.time);
     _generator.updateState(_state, message.data);
     _updated = true;
+}
+
+void OfflineDecoder::runTicksUntil(Clock::TimePoint time)
+{
+    if (!_nextTick) {
+        _nextTick = time + tickInterval;
+    } else if (time < _lastTime - tickInterval) {
+        generate();
+        _nextTick = time + tickInterval;
+    } else {
+        runTicksBefore(time);
+    }
+    _lastTime = time;
 }
 
 void OfflineDecoder::runTicksBefore(Clock::TimePoint time)

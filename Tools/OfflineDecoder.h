@@ -29,12 +29,15 @@ class CaptureClock : public Clock
 /// Runs captured messages through a generator as the viewer would have at that time: a display is
 /// generated at every tick of 2 seconds from the first message on, when something arrived since the
 /// last one. A message at a tick's time still belongs to it. Where times run back by more than a
-/// tick, one passes there and then, and ticks are counted from the message on.
+/// tick, one passes there and then, and ticks are counted from the message on. Where nobody wants
+/// the history, which is all that the ticks make, a display is generated at the end alone.
 class OfflineDecoder
 {
   public:
-    OfflineDecoder(LogGenerator& generator, CaptureClock& clock)
-        : _generator(generator), _clock(clock)
+    enum class History { Kept, NotWanted };
+
+    OfflineDecoder(LogGenerator& generator, CaptureClock& clock, History history = History::Kept)
+        : _generator(generator), _clock(clock), _history(history)
     {
     }
 
@@ -52,11 +55,13 @@ class OfflineDecoder
     PlistValue saveContents() const { return _generator.getSaveContentsFromState(_state); }
 
   private:
+    void runTicksUntil(Clock::TimePoint time);
     void runTicksBefore(Clock::TimePoint time);
     void generate();
 
     LogGenerator& _generator;
     CaptureClock& _clock;
+    History _history;
     PlistDictionary _state;
     Clock::TimePoint _lastTime; // of the last message
     std::optional<Clock::TimePoint> _nextTick;

@@ -4,6 +4,8 @@
 
 #include <algorithm>
 #include <bit>
+#include <charconv>
+#include <cmath>
 #include <utility>
 
 #include <fmt/compile.h>
@@ -16,6 +18,8 @@ namespace
 {
 
 constexpr Shown pilotLevel{.digits = Digits::SignedTwoDecimals, .unit = "dB"};
+// Levels are worked out from several fields.
+constexpr Field pilotLevelField{"level", {}, pilotLevel};
 
 std::string textOf(const ShownPilot& pilot)
 {
@@ -26,6 +30,18 @@ std::string textOf(const ShownPilot& pilot)
 std::string keyOf(const ShownPilot& pilot)
 {
     return fmt::format(FMT_COMPILE("{};{}"), pilot.index, pilot.pnOffset);
+}
+
+bool isKeyOf(const ShownPilot& pilot, std::string_view key)
+{
+    std::size_t index = 0;
+    std::uint16_t pnOffset = 0;
+    const char* const end = key.data() + key.size();
+    const auto separator = std::from_chars(key.data(), end, index);
+    if (separator.ptr == end || index != pilot.index)
+        return false;
+    return std::from_chars(separator.ptr + 1, end, pnOffset).ec == std::errc() &&
+           pnOffset == pilot.pnOffset;
 }
 
 // Brings the group from the pilots that it shows to others.
@@ -169,6 +185,31 @@ std::optional<std::size_t> C2KLabels::slotAt(const PlistDictionary& group,
             if (target.group.isSameContainer(group) && target.label == label)
                 return slot;
     return std::nullopt;
+}
+
+std::optional<std::size_t> C2KLabels::pilotSlotAt(const PlistDictionary& group) const
+{
+    for (std::size_t slot = 0; slot < _labels.size(); ++slot)
+        if (_labels[slot].isGroup && _labels[slot].group.isSameContainer(group))
+            return slot;
+    return std::nullopt;
+}
+
+std::optional<ShownCell> C2KLabels::cellOfPilot(std::size_t slot, std::string_view key,
+                                                std::size_t& place) const
+{
+    if (slot >= _labels.size() || !_labels[slot].isGroup)
+        return std::nullopt;
+    const std::vector<ShownPilot>& pilots = _labels[slot].pilots;
+    if (place >= pilots.size() || !isKeyOf(pilots[place], key))
+        place = static_cast<std::size_t>(
+            std::ranges::find_if(pilots, [key](const auto& pilot) { return isKeyOf(pilot, key); }) -
+            pilots.begin());
+    if (place >= pilots.size())
+        return std::nullopt;
+    // No finer than it shows: it is a sum of logarithms.
+    const double level = std::round(pilots[place].level * 100) / 100;
+    return ShownCell{&pilotLevelField, std::bit_cast<std::int64_t>(level), level};
 }
 
 C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, const Field& field)

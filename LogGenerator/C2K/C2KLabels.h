@@ -55,6 +55,11 @@ class C2KLabels
     std::optional<std::size_t> slotAt(const PlistDictionary& group, std::string_view label) const;
     /// None where no field shows.
     std::optional<ShownCell> cellOf(std::size_t slot) const;
+    /// Which slot shows its pilots in a group; none so far where none does.
+    std::optional<std::size_t> pilotSlotAt(const PlistDictionary& group) const;
+    /// The level of the pilot under that key of the group. The place is where to look first.
+    std::optional<ShownCell> cellOfPilot(std::size_t slot, std::string_view key,
+                                         std::size_t& place) const;
 
   private:
     struct Target {

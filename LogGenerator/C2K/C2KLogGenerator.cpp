@@ -90,6 +90,7 @@ void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup
                                     PlistDictionary& state)
 {
     _labels.useLookup(lookup);
+    _lastRead.reset();
     if (data.size() < logPacketHeaderSize)
         return;
     const LogPacket packet(stripPrefix(data));
@@ -101,8 +102,11 @@ void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup
                           [](const Decoder& known) { return known.record->logCode; });
     if (decoder == decoders.end())
         return;
-    if (hasItsSize(packet, *decoder, log()))
+    if (hasItsSize(packet, *decoder, log())) {
+        _lastRead = {decoder->record->logCode, versionOf(*decoder->record, packet), packet.size(),
+                     LayoutKind::Base};
         decoder->decode(packet, C2KOutput(_labels, state, log(), decoder->record));
+    }
     keepPacket(packet.bytes());
 }
 
@@ -125,13 +129,19 @@ std::optional<CellPlace> C2KLogGenerator::cellPlaceAt(const PlistDictionary& sta
                                                       std::span<const std::string_view> path) const
 {
     const PlistDictionary* group = groupOf(state, path);
-    const auto slot = group ? _labels.slotAt(*group, path.back()) : std::nullopt;
-    return slot ? std::optional(CellPlace{.key = path.back(), .slot = *slot}) : std::nullopt;
+    if (!group)
+        return std::nullopt;
+    if (const auto slot = _labels.slotAt(*group, path.back()))
+        return CellPlace{.key = path.back(), .slot = *slot};
+    if (const auto slot = _labels.pilotSlotAt(*group))
+        return CellPlace{.row = 0, .key = path.back(), .slot = *slot};
+    return std::nullopt;
 }
 
 std::optional<ShownCell> C2KLogGenerator::cellAt(CellPlace& place) const
 {
-    return _labels.cellOf(place.slot);
+    return place.row ? _labels.cellOfPilot(place.slot, place.key, *place.row)
+                     : _labels.cellOf(place.slot);
 }
 
 std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& state)

@@ -26,6 +26,7 @@ class C2KLogGenerator : public OrbelLogGenerator
     std::optional<CellPlace> cellPlaceAt(const PlistDictionary& state,
                                          std::span<const std::string_view> path) const override;
     std::optional<ShownCell> cellAt(CellPlace& place) const override;
+    const ReadLayout* lastRead() const override { return _lastRead ? &*_lastRead : nullptr; }
 
     /// Fills the display with the template's groups and empty values, and the lookup with an array
     /// of entries for each lookup key: the label, and the group of the display that holds it.
@@ -45,6 +46,7 @@ class C2KLogGenerator : public OrbelLogGenerator
     void useDisplay(const PlistDictionary& state);
 
     C2KLabels _labels;
+    std::optional<ReadLayout> _lastRead;
     // The display that was made of our template; and where it and its lookup are in the state.
     WeakContainer _display;
     std::size_t _displayPlace = 0;

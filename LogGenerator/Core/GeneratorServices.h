@@ -14,6 +14,12 @@ enum class AssertionPolicy {
     Throw,      ///< an `AssertionFailure`
 };
 
+/// What becomes of the raw packets of a display period.
+enum class RawPackets {
+    Kept, ///< for the history, whose snapshot holds them
+    Dropped,
+};
+
 /// What a generator needs of the platform; all of it outlives the generator.
 struct GeneratorServices {
     SystemLog& log;
@@ -21,6 +27,7 @@ struct GeneratorServices {
     const Clock& clock;
     AssertionPolicy assertions = AssertionPolicy::EndProcess;
     RecordsMode records = RecordsMode::Newer;
+    RawPackets rawPackets = RawPackets::Kept;
 };
 
 } // namespace ventrik

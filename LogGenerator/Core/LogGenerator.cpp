@@ -49,7 +49,7 @@ std::optional<ValueOrigin> LogGenerator::originOf(const PlistDictionary&,
 std::optional<CellPlace> LogGenerator::cellPlaceAt(const PlistDictionary&,
                                                    std::span<const std::string_view>) const
 {
-    return std::nullopt;
+    return CellPlace{};
 }
 
 std::optional<ShownCell> LogGenerator::cellAt(CellPlace&) const

@@ -46,7 +46,8 @@ class LogGenerator
     virtual std::optional<ValueOrigin> originOf(const PlistDictionary& state,
                                                 std::span<const std::string_view> path) const;
 
-    /// Where to look for what the value at such a path shows; none where it is no field's, so far.
+    /// Where to look for what the value at such a path shows; none where that is not known yet, and
+    /// a place of no section where it will never be a field's.
     virtual std::optional<CellPlace> cellPlaceAt(const PlistDictionary& state,
                                                  std::span<const std::string_view> path) const;
     /// What shows there; none where no field does.
@@ -66,6 +67,9 @@ class LogGenerator
     /// stands at that path or holds it; empty outside of sections.
     virtual std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                               std::span<const std::string_view> path) const;
+
+    /// How the record of the last message was read, until the next one; null where none was.
+    virtual const ReadLayout* lastRead() const { return nullptr; }
 
     /// The same of all sections.
     virtual std::vector<ReadLayout> layouts() const { return {}; }
@@ -100,6 +104,7 @@ class LogGenerator
     const Clock& clock() const { return _services.clock; }
     AssertionPolicy assertions() const { return _services.assertions; }
     RecordsMode records() const { return _services.records; }
+    RawPackets rawPackets() const { return _services.rawPackets; }
 
   private:
     GeneratorServices _services;

@@ -42,7 +42,7 @@ struct CellPlace {
     const void* section = nullptr; ///< the generator's own affair, as is the slot
     std::string_view list = {};    ///< of the section's dictionary; empty where the section is one
     std::optional<std::size_t> row = {};
-    std::string_view key; ///< lives as long as this
+    std::string_view key = {}; ///< lives as long as this
     std::size_t slot = 0;
 };
 

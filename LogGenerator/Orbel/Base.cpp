@@ -84,6 +84,7 @@ void Base::updateSectionRef(const PlistValue& container)
 void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
 {
     _log.log(_table.tracePriority, "{}", _table.trace.empty() ? _table.name : _table.trace);
+    _lastRead = nullptr;
     const auto known = std::ranges::find(
         _records, logCode, [](const KnownRecord& record) { return record.shown.record->logCode; });
     if (known == _records.end()) {
@@ -98,6 +99,7 @@ void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     known->last = {logCode, versionOf(*chosen.record, packet), packet.size(), chosen.kind};
     if (base.isExtension && chosen.kind == LayoutKind::NotKnown)
         return; // it has no base layout to fall back on
+    _lastRead = &*known->last;
     _current = chosen.record;
     const auto newer = std::ranges::find(known->newer, chosen.record, &ShownRecord::record);
     decode(newer == known->newer.end() ? known->shown : *newer, packet);

@@ -79,6 +79,8 @@ class Base
 
     /// How the records were read that the section shows, the last one of each code.
     std::vector<ReadLayout> layouts() const;
+    /// The same of the last packet; null where it was not read.
+    const ReadLayout* lastRead() const { return _lastRead; }
 
   protected:
     /// Decodes a packet of the record, which is long enough: shows what the table says. The record
@@ -132,6 +134,7 @@ class Base
     const SectionTable& _table;
     std::vector<KnownRecord> _records;
     const Record* _current = nullptr; // which is being decoded
+    const ReadLayout* _lastRead = nullptr;
     ShownFields _fields;
     RowList _rows;
     std::list<KeyedRows> _keyedRows;

@@ -75,13 +75,15 @@ std::optional<ShownCell> FieldMemory::cellOf(std::size_t slot) const
     return ShownCell{known.field, known.raw, workedOut};
 }
 
-std::optional<ShownCell> FieldMemory::cellOf(std::string_view key, std::size_t& slot) const
+std::optional<ShownCell> FieldMemory::cellOf(std::string_view& key, std::size_t& slot) const
 {
-    if (slot >= _slots.size() || _slots[slot].key != key) {
+    const bool isKnown = slot < _slots.size() && _slots[slot].key.data() == key.data();
+    if (!isKnown) {
         const auto known = knownSlotOf(key);
         if (!known)
             return std::nullopt;
         slot = *known;
+        key = _slots[slot].key;
     }
     return cellOf(slot);
 }

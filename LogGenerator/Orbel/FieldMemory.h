@@ -39,8 +39,8 @@ class FieldMemory
 
     /// None for a key that no field shows.
     std::optional<ShownCell> cellOf(std::size_t slot) const;
-    /// The slot is where to look first.
-    std::optional<ShownCell> cellOf(std::string_view key, std::size_t& slot) const;
+    /// The slot is where to look first. The key becomes that of the field.
+    std::optional<ShownCell> cellOf(std::string_view& key, std::size_t& slot) const;
 
   private:
     std::optional<std::size_t> knownSlotOf(std::string_view key) const;

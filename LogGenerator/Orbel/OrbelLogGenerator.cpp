@@ -21,7 +21,8 @@ constexpr int dlfPriority = 16;
 void OrbelLogGenerator::init()
 {
     LogGenerator::init();
-    _binData.emplace();
+    if (rawPackets() == RawPackets::Kept)
+        _binData.emplace();
 }
 
 void OrbelLogGenerator::keepPacket(ByteView packet)

@@ -44,7 +44,7 @@ class OrbelLogGenerator : public LogGenerator
     std::optional<PlistValue> readTemplate(const std::string& name);
     std::optional<PlistValue> readWholeTemplate(const std::string& name);
 
-    // The packets since the last display; none in a generator that was never initialised.
+    // The packets since the last display; none where they are not kept.
     std::optional<PeriodPackets> _binData;
     std::string _templateExtension;
     std::string _templatePath;   // where the template was read

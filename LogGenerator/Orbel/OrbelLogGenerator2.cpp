@@ -48,6 +48,7 @@ void OrbelLogGenerator2::updateState(PlistDictionary& state, ByteView data)
 
 void OrbelLogGenerator2::updateWithData(ByteView data)
 {
+    _lastRead = nullptr;
     if (data.size() < logPacketHeaderSize)
         return;
     const LogPacket packet(stripPrefix(data), _propertyLists);
@@ -60,8 +61,11 @@ void OrbelLogGenerator2::updateWithData(ByteView data)
     const auto* subscribers = cIndex ? cIndex->getSubscribers(logCode) : nullptr;
     if (!subscribers)
         return;
-    for (Base* section : *subscribers)
+    for (Base* section : *subscribers) {
         deliver(packet, logCode, *section);
+        if (const ReadLayout* read = section->lastRead())
+            _lastRead = read;
+    }
 }
 
 void OrbelLogGenerator2::deliver(const LogPacket& packet, std::uint32_t logCode, Base& section)
@@ -128,16 +132,17 @@ OrbelLogGenerator2::cellPlaceAt(const PlistDictionary&,
             return CellPlace{.section = section, .key = rest[0]};
         const auto row = rowNumber(rest[rest.size() - 2]);
         if (rest.size() > 3 || !row)
-            return std::nullopt;
+            break;
         return CellPlace{section, rest.size() == 3 ? rest[0] : std::string_view(), row,
                          rest.back()};
     }
-    return std::nullopt;
+    return CellPlace{};
 }
 
 std::optional<ShownCell> OrbelLogGenerator2::cellAt(CellPlace& place) const
 {
-    return static_cast<const Base*>(place.section)->cellAt(place);
+    const auto* section = static_cast<const Base*>(place.section);
+    return section ? section->cellAt(place) : std::nullopt;
 }
 
 std::optional<ValueOrigin>
@@ -145,7 +150,7 @@ OrbelLogGenerator2::originOf(const PlistDictionary& state,
                              std::span<const std::string_view> path) const
 {
     const auto place = cellPlaceAt(state, path);
-    if (!place)
+    if (!place || !place->section)
         return std::nullopt;
     const Base& section = *static_cast<const Base*>(place->section);
     return place->row ? section.originOf(place->list, *place->row, place->key)

@@ -36,6 +36,7 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     std::vector<ReadLayout> layoutsAt(const PlistDictionary& state,
                                       std::span<const std::string_view> path) const override;
     std::vector<ReadLayout> layouts() const override;
+    const ReadLayout* lastRead() const override { return _lastRead; }
 
     /// Routes one packet, as it arrived, to the subscribed sections.
     void updateWithData(ByteView data);
@@ -69,8 +70,9 @@ class OrbelLogGenerator2 : public OrbelLogGenerator
     PropertyListMemory _propertyLists;
     // The display that our sections are bound to.
     WeakContainer _boundDisplay;
-    std::size_t _displayPlace = 0; // in the state, as far as is known
-    bool _cannotBuild = false;     // the template holds what no template may hold
+    std::size_t _displayPlace = 0;         // in the state, as far as is known
+    const ReadLayout* _lastRead = nullptr; // a section's
+    bool _cannotBuild = false;             // the template holds what no template may hold
 };
 
 } // namespace ventrik

@@ -71,7 +71,7 @@ std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
     return _memory.originOf(key);
 }
 
-std::optional<ShownCell> ShownFields::cellOf(std::string_view key, std::size_t& slot) const
+std::optional<ShownCell> ShownFields::cellOf(std::string_view& key, std::size_t& slot) const
 {
     return _memory.cellOf(key, slot);
 }

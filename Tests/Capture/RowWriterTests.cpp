@@ -26,7 +26,13 @@ class RowWriterTest : public testing::Test
     {
         RowWriter writer(format, "drive, \"one\".pcap", "lte");
         return std::string(writer.recordPart(record)) + writer.placePart(place) +
-               writer.valuePart(value);
+               valueOf(writer, value);
+    }
+    static std::string valueOf(const RowWriter& writer, const RowValue& value)
+    {
+        std::string row;
+        writer.addValue(row, value);
+        return row;
     }
     static std::string closingOf(RowFormat format, const RowClosing& closing)
     {
@@ -88,6 +94,12 @@ TEST_F(RowWriterTest, WritesNumbersWithAllTheirDigitsAndNoMore)
     EXPECT_THAT(numberRow(RowFormat::Csv, 12), HasSubstr(",12,dB,"));
     EXPECT_THAT(numberRow(RowFormat::Csv, 0.1), HasSubstr(",0.1,dB,"));
     EXPECT_THAT(numberRow(RowFormat::Csv, -0.0625), HasSubstr(",-0.0625,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, 100.5), HasSubstr(",100.5,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, 7.0009), HasSubstr(",7.0009,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, 0.1 + 0.2), HasSubstr(",0.30000000000000004,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, 0.03125), HasSubstr(",0.03125,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, -0.00001), HasSubstr(",-1e-05,dB,"));
+    EXPECT_THAT(numberRow(RowFormat::Csv, 12345678901.5), HasSubstr(",12345678901.5,dB,"));
 }
 
 TEST_F(RowWriterTest, HasNoNumberThatIsNotFinite)
@@ -106,6 +118,15 @@ TEST_F(RowWriterTest, KeepsATextOnOneLineOfJsonAndInOneFieldOfATable)
     EXPECT_THAT(rowOf(RowFormat::Csv, {0, moment}, wholePlace, value), HasSubstr("\"a\nb\"\"c\","));
 }
 
+TEST_F(RowWriterTest, HasNothingInATableThatATerminalWouldObey)
+{
+    const RowValue value{.text = "a\x1b[2J\tb\xc2\x9b\xff"};
+    EXPECT_THAT(rowOf(RowFormat::Csv, {0, moment}, wholePlace, value),
+                HasSubstr(",a [2J\tb \xef\xbf\xbd,"));
+    EXPECT_THAT(rowOf(RowFormat::JsonLines, {0, moment}, wholePlace, value),
+                HasSubstr(R"("text":"a\u001b[2J)"));
+}
+
 TEST_F(RowWriterTest, ClosesACapture)
 {
     EXPECT_EQ(closingOf(RowFormat::JsonLines, {"ok", {}, {}, 10, 8, 25, 360}),
@@ -122,7 +143,7 @@ TEST_F(RowWriterTest, HasATableWithAsManyNamesAsFields)
     const auto inHeading = commas(rowHeading(RowFormat::Csv));
     RowWriter writer(RowFormat::Csv, "c", "lte");
     EXPECT_EQ(commas(std::string(writer.recordPart(wholeRecord)) + writer.placePart(wholePlace) +
-                     writer.valuePart(wholeValue)),
+                     valueOf(writer, wholeValue)),
               inHeading);
     EXPECT_EQ(commas(closingOf(RowFormat::Csv, {"ok"})), inHeading);
 }
@@ -136,6 +157,32 @@ TEST_F(RowWriterTest, TellsARecordBehindAnother)
               "c,1,2001-09-09T01:46:42.000250Z,2,lte,0xB17F,3,base");
     EXPECT_EQ(writer.recordPart({2, moment, {}, RecordKind{0xB17F, 4, 33, LayoutKind::NotKnown}}),
               "c,2,2001-09-09T01:46:40.000250Z,,lte,0xB17F,4,not known");
+}
+
+TEST_F(RowWriterTest, TellsEachRecordAnewThatIsMuchLikeTheLast)
+{
+    const RecordKind kind{0xB17F, 3, 33, LayoutKind::Base};
+    RowWriter writer(RowFormat::Csv, "c", "lte");
+    EXPECT_EQ(writer.recordPart({9, moment, 1U, kind}),
+              "c,9,2001-09-09T01:46:40.000250Z,1,lte,0xB17F,3,base");
+    EXPECT_EQ(writer.recordPart({10, moment + 1us, 1U, kind}),
+              "c,10,2001-09-09T01:46:40.000251Z,1,lte,0xB17F,3,base");
+    EXPECT_EQ(writer.recordPart({11, moment + 999ms, 1U, kind}),
+              "c,11,2001-09-09T01:46:40.999250Z,1,lte,0xB17F,3,base");
+    EXPECT_EQ(writer.recordPart({12, moment + 1s, 1U, kind}),
+              "c,12,2001-09-09T01:46:41.000250Z,1,lte,0xB17F,3,base");
+    EXPECT_EQ(writer.recordPart({12, moment + 1s, 2U, kind}),
+              "c,12,2001-09-09T01:46:41.000250Z,2,lte,0xB17F,3,base");
+}
+
+// More kinds than are kept take each other's place.
+TEST_F(RowWriterTest, TellsRecordsOfManyKinds)
+{
+    RowWriter writer(RowFormat::Csv, "c", "lte");
+    for (int round = 0; round < 2; ++round)
+        for (std::uint32_t code = 0x1000; code < 0x1400; ++code)
+            EXPECT_EQ(writer.recordPart({7, moment, {}, RecordKind{code, {}, 33, {}}}),
+                      fmt::format("c,7,2001-09-09T01:46:40.000250Z,,lte,0x{:04X},,", code));
 }
 
 TEST_F(RowWriterTest, TellsTimesBefore1970)

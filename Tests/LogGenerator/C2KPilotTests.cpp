@@ -42,6 +42,34 @@ TEST_F(C2KActiveSetPilotsTest, StrengthsAreIn512ths)
     }
 }
 
+TEST_F(C2KActiveSetPilotsTest, TheLastRecordReadIsKnown)
+{
+    feed(activeSetPilotsPacket());
+    ASSERT_TRUE(generator->lastRead());
+    EXPECT_EQ(generator->lastRead()->logCode, 0x12B6U);
+    EXPECT_EQ(generator->lastRead()->kind, LayoutKind::Base);
+    feed(PacketBuilder(0x12B6).size(24));
+    EXPECT_EQ(generator->lastRead(), nullptr);
+}
+
+TEST_F(C2KActiveSetPilotsTest, APilotsLevelIsANumberAsItShows)
+{
+    feed(activeSetPilotsPacket());
+    const auto levelOf = [this](std::string_view key) {
+        auto place =
+            generator->cellPlaceAt(state, std::vector<std::string_view>{"kActiveSetPilots", key});
+        const auto cell = place ? generator->cellAt(*place) : std::nullopt;
+        return cell ? cell->number() : std::nullopt;
+    };
+    EXPECT_EQ(levelOf("1;12"), -3.01);
+    EXPECT_EQ(levelOf("0;264"), 0.0);
+    EXPECT_EQ(levelOf("0;12"), std::nullopt);
+    EXPECT_EQ(levelOf("2;12"), std::nullopt);
+    EXPECT_EQ(levelOf("_sorted"), std::nullopt);
+    feed(activeSetPilotsPacket().u8(15, 0).size(25));
+    EXPECT_EQ(levelOf("1;12"), std::nullopt);
+}
+
 TEST_F(C2KActiveSetPilotsTest, NoPilotsAreSaidToBeNone)
 {
     feed(activeSetPilotsPacket());

@@ -353,6 +353,17 @@ TEST_F(OrbelLogGenerator2Test, AnArrayOfTheTemplateIsBoundElementByElementAfterA
     EXPECT_EQ(textAt(list[0], {"First", "Size"}), "30");
 }
 
+TEST_F(OrbelLogGenerator2Test, KeepsNoPacketsWhereNobodyWantsThem)
+{
+    GeneratorServices without = services();
+    without.rawPackets = RawPackets::Dropped;
+    NotingGenerator dropping(without, notes);
+    dropping.updateState(state, PacketBuilder(0x1000).build());
+    dropping.generateLogUsingState(state);
+    EXPECT_EQ(state.find("DisplayState"), nullptr);
+    EXPECT_THAT(notes, ElementsAre("First 1000 13"));
+}
+
 TEST_F(OrbelLogGenerator2Test, AFloodKeepsTheNewestPacketsOfThePeriodAndSaysSoOnce)
 {
     for (int i = 0; i < 70; ++i)

@@ -283,6 +283,21 @@ TEST_F(LTERecordsModeTest, TellsTheLayoutsOfAllSectionsOnce)
                                               ReadLayout{0xB180, 7, 60, LayoutKind::NotKnown}));
 }
 
+TEST_F(LTERecordsModeTest, TellsHowTheLastRecordWasRead)
+{
+    const auto newer = generator(RecordsMode::Newer);
+    EXPECT_EQ(newer->lastRead(), nullptr);
+    newer->updateState(state, cellInfo().build());
+    ASSERT_TRUE(newer->lastRead());
+    EXPECT_EQ(*newer->lastRead(), (ReadLayout{0xB0C2, 3, 42, LayoutKind::Newer}));
+    for (const Bytes& unread : {PacketBuilder(0x1234).size(42).build(), Bytes(5, 1), Bytes(42, 7),
+                                PacketBuilder(0xB0C2).size(20).build()}) {
+        newer->updateState(state, cellInfo().build());
+        newer->updateState(state, unread);
+        EXPECT_EQ(newer->lastRead(), nullptr);
+    }
+}
+
 // A warning goes when a record comes whose layout is known.
 TEST_F(LTERecordsModeTest, AKnownLayoutEndsTheWarning)
 {

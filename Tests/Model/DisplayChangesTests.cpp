@@ -3,6 +3,7 @@
 #include "Tests/Support/IdleGenerator.h"
 
 #include <map>
+#include <set>
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
@@ -25,14 +26,18 @@ class KnowingGenerator : public IdleGenerator
                                          std::span<const std::string_view> path) const override
     {
         ++lookups;
-        const auto known = cells.find(fmt::format("{}", fmt::join(path, ">")));
+        const std::string keys = fmt::format("{}", fmt::join(path, ">"));
+        if (noFields.contains(keys))
+            return CellPlace{};
+        const auto known = cells.find(keys);
         return known == cells.end()
                    ? std::nullopt
                    : std::optional(CellPlace{.section = &known->second, .key = path.back()});
     }
     std::optional<ShownCell> cellAt(CellPlace& place) const override
     {
-        return *static_cast<const ShownCell*>(place.section);
+        const auto* cell = static_cast<const ShownCell*>(place.section);
+        return cell ? std::optional(*cell) : std::nullopt;
     }
     std::string_view sectionAt(const PlistDictionary&,
                                std::span<const std::string_view> path) const override
@@ -41,6 +46,7 @@ class KnowingGenerator : public IdleGenerator
     }
 
     std::map<std::string, ShownCell> cells;
+    std::set<std::string> noFields; // places that never have one
     mutable int lookups = 0;
 };
 
@@ -228,6 +234,30 @@ TEST_F(DisplayChangesTest, ShowKeysInOrderByTheirLabels)
 {
     show(PlistDictionary{{"2;b", "1"}, {"_sorted", ""}, {"1;a;c", "2"}});
     EXPECT_THAT(take(), ElementsAre("/b=1", "/1;a;c=2"));
+}
+
+TEST_F(DisplayChangesTest, TellTheValuesThatChangedAmongKeysInOrder)
+{
+    PlistDictionary display{{"2;b", "1"}, {"_sorted", ""}, {"1;a", "2"}, {"3;c", "3"}};
+    show(display);
+    take();
+    display.set("2;b", "4");
+    EXPECT_THAT(take(), ElementsAre("/b=4"));
+    display.set("3;c", "5");
+    display.set("_sorted", "x");
+    EXPECT_THAT(take(), ElementsAre("/c=5"));
+}
+
+TEST_F(DisplayChangesTest, DoNotLookAgainForWhatIsNoField)
+{
+    generator.noFields.insert("a>x");
+    PlistDictionary group{{"x", "5"}};
+    show(PlistDictionary{{"a", group}});
+    const auto taken = changes.take(state);
+    ASSERT_EQ(taken.size(), 1U);
+    EXPECT_FALSE(changes.cellAt(*taken[0].place, state));
+    EXPECT_FALSE(changes.cellAt(*taken[0].place, state));
+    EXPECT_EQ(generator.lookups, 1);
 }
 
 // The panes know one node for a path: the last one in order.

@@ -82,10 +82,10 @@ TEST_F(ChangeLogTest, KnowsWhichValuesChangedWhereNothingElseDid)
     std::vector<std::size_t> entries;
     dictionary.set("b", "3");
     dictionary.entryAt(0)->value.setText("4");
-    EXPECT_TRUE(dictionary.watch().haveOnlyValuesChanged(entries));
+    EXPECT_TRUE(dictionary.watch().takeOnlyValuesChanged(entries));
     EXPECT_THAT(entries, ElementsAre(1, 0));
     array.replace(1, "z");
-    EXPECT_TRUE(array.watch().haveOnlyValuesChanged(entries));
+    EXPECT_TRUE(array.watch().takeOnlyValuesChanged(entries));
     EXPECT_THAT(entries, ElementsAre(1));
 }
 
@@ -94,10 +94,10 @@ TEST_F(ChangeLogTest, KnowsThatMoreThanValuesChanged)
     std::vector<std::size_t> entries;
     dictionary.set("b", "3");
     dictionary.set("c", "4");
-    EXPECT_FALSE(dictionary.watch().haveOnlyValuesChanged(entries));
+    EXPECT_FALSE(dictionary.watch().takeOnlyValuesChanged(entries));
     array.append("z");
     array.replace(0, "w");
-    EXPECT_FALSE(array.watch().haveOnlyValuesChanged(entries));
+    EXPECT_FALSE(array.watch().takeOnlyValuesChanged(entries));
 }
 
 TEST_F(ChangeLogTest, DoesNotTellTheValuesOfWhatStandsAtTwoPlaces)
@@ -105,7 +105,7 @@ TEST_F(ChangeLogTest, DoesNotTellTheValuesOfWhatStandsAtTwoPlaces)
     std::vector<std::size_t> entries;
     dictionary.watch().add(log, 7);
     dictionary.set("b", "3");
-    EXPECT_FALSE(dictionary.watch().haveOnlyValuesChanged(entries));
+    EXPECT_FALSE(dictionary.watch().takeOnlyValuesChanged(entries));
 }
 
 TEST_F(ChangeLogTest, KeepsNoMoreValuesThanAFew)
@@ -113,7 +113,7 @@ TEST_F(ChangeLogTest, KeepsNoMoreValuesThanAFew)
     std::vector<std::size_t> entries;
     for (int i = 0; i < 1000; ++i)
         dictionary.set("a", "3");
-    EXPECT_FALSE(dictionary.watch().haveOnlyValuesChanged(entries));
+    EXPECT_FALSE(dictionary.watch().takeOnlyValuesChanged(entries));
 }
 
 TEST_F(ChangeLogTest, SeesAChangeByAnotherHandle)

@@ -59,7 +59,7 @@ class CaptureRowsTest : public testing::Test
         std::string_view text = rows().text();
         for (std::size_t end = 0; (end = text.find('\n')) != text.npos; text.remove_prefix(end + 1))
             lines.push_back(lineOf(text.substr(0, end)));
-        rows().text().clear();
+        rows().clearText();
         return lines;
     }
     // c,RECORD,1970-01-01T00:00:SS.mmm000Z,,lte,CODE,,,SECTION,PATH,INDEX,NAME,NUMBER,UNIT,TEXT,

@@ -64,6 +64,16 @@ TEST_F(OfflineDecoderTest, GeneratesAtTheTickAfterAMessage)
     EXPECT_THAT(generator.notes, ElementsAre("12000:2"));
 }
 
+TEST_F(OfflineDecoderTest, GeneratesAtTheEndAloneWhereNobodyWantsTheHistory)
+{
+    OfflineDecoder without(generator, clock, OfflineDecoder::History::NotWanted);
+    for (const auto time : {10s, 20s, 5s, 40s})
+        without.take({Clock::TimePoint(time), {}});
+    EXPECT_TRUE(generator.notes.empty());
+    without.finish();
+    EXPECT_THAT(generator.notes, ElementsAre("40000:4"));
+}
+
 TEST_F(OfflineDecoderTest, AMessageAtATickBelongsToIt)
 {
     take(10s);

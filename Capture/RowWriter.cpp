@@ -164,6 +164,42 @@ bool areAlike(const std::optional<RecordKind>& a, const std::optional<RecordKind
            (!a || (a->logCode == b->logCode && a->version == b->version && a->layout == b->layout));
 }
 
+// With a backslash before each of the special characters.
+void appendEscaped(std::string& point, std::string_view text, std::string_view special)
+{
+    for (const char character : text) {
+        if (special.find(character) != special.npos)
+            point += '\\';
+        point += character;
+    }
+}
+
+// A point is one line.
+std::string onOneLine(std::string_view text)
+{
+    std::string line;
+    appendTerminalText(line, text);
+    return line;
+}
+
+// No tag is empty, and a backslash in one would be taken for an escape.
+void appendTag(std::string& point, std::string_view name, std::string_view value)
+{
+    if (value.empty())
+        return;
+    std::string line = onOneLine(value);
+    std::ranges::replace(line, '\\', '/');
+    ((point += ',') += name) += '=';
+    appendEscaped(point, line, ",= ");
+}
+
+void appendFieldText(std::string& point, std::string_view text)
+{
+    point += '"';
+    appendEscaped(point, isPlainAscii(text) ? text : std::string_view(onOneLine(text)), "\"\\");
+    point += '"';
+}
+
 // Beyond that many fields of nothing a row of values, or before them the closing one, begins.
 template <std::size_t size>
 std::string nothings(const std::array<Column, size>&)
@@ -186,7 +222,7 @@ std::string rowSchema()
 
 std::string rowHeading(RowFormat format)
 {
-    if (format == RowFormat::JsonLines)
+    if (format != RowFormat::Csv)
         return {};
     std::string heading;
     for (const Column& column : valueColumns)
@@ -202,7 +238,9 @@ RowWriter::RowWriter(RowFormat format, std::string_view capture, std::string_vie
       _csvEnd(nothings(closingColumns) + "\n"),
       _kindParts(kindPartCount)
 {
-    if (isJson()) {
+    if (isPoint()) {
+        appendTag(_capture, "capture", capture);
+    } else if (isJson()) {
         _capture = "{\"capture\":";
         appendJsonText(_capture, capture);
     } else {
@@ -252,6 +290,8 @@ void RowWriter::addNumber(std::string& row, std::string_view column, const Numbe
 
 std::string_view RowWriter::recordPart(const RowRecord& record)
 {
+    if (isPoint())
+        return timePart(record.time);
     const auto micros = std::chrono::floor<std::chrono::microseconds>(record.time);
     const auto second = std::chrono::floor<std::chrono::seconds>(micros);
     const KindPart& kind = kindPart(record);
@@ -306,8 +346,64 @@ const RowWriter::KindPart& RowWriter::kindPart(const RowRecord& record)
     return part;
 }
 
+std::string_view RowWriter::timePart(Clock::TimePoint time)
+{
+    _recordPart = fmt::format(FMT_COMPILE(" {}\n"), time.time_since_epoch().count());
+    return _recordPart;
+}
+
+// Points of a path are a series. What tells records apart would make series without end.
+std::string RowWriter::tagsOf(const RowPlace& place) const
+{
+    std::string tags = "ventrik" + _capture;
+    appendTag(tags, "technology", _technology);
+    appendTag(tags, "section", place.section);
+    appendTag(tags, "path", place.path);
+    if (place.index)
+        appendTag(tags, "index", fmt::format_int(*place.index).c_str());
+    appendTag(tags, "name", place.name);
+    return tags;
+}
+
+void RowWriter::addFields(std::string& point, const RowValue& value) const
+{
+    if (!value.text) {
+        point += " gone=true";
+        return;
+    }
+    point += " text=";
+    appendFieldText(point, *value.text);
+    if (!value.number || !std::isfinite(*value.number))
+        return;
+    point += ",number=";
+    appendDigits(point, *value.number);
+    if (value.unit.empty())
+        return;
+    point += ",unit=";
+    appendFieldText(point, value.unit);
+}
+
+// Without a time: that is when it comes to the engine.
+void RowWriter::appendClosingPoint(std::string& rows, const RowClosing& closing) const
+{
+    rows += "ventrik_capture" + _capture;
+    appendTag(rows, "technology", _technology);
+    rows += " status=";
+    appendFieldText(rows, closing.status);
+    if (!closing.reason.empty()) {
+        rows += ",reason=";
+        appendFieldText(rows, closing.reason);
+    }
+    if (closing.offset)
+        rows += fmt::format(",offset={}i", *closing.offset);
+    rows += fmt::format(",records={}i,decoded={}i,rows={}i,bytes={}i\n", closing.records,
+                        closing.decoded, closing.rows, closing.bytes);
+}
+
 std::string RowWriter::placePart(const RowPlace& place) const
 {
+    if (isPoint())
+        return tagsOf(place);
     std::string row;
     addText(row, R"(,"section":)", place.section);
     addText(row, R"(,"path":)", place.path);
@@ -318,6 +414,8 @@ std::string RowWriter::placePart(const RowPlace& place) const
 
 void RowWriter::addValue(std::string& row, const RowValue& value) const
 {
+    if (isPoint())
+        return addFields(row, value);
     constexpr std::size_t most = 96; // as a rule
     row.reserve(most);
     // JSON has no number that is not finite.
@@ -333,6 +431,8 @@ void RowWriter::addValue(std::string& row, const RowValue& value) const
 
 void RowWriter::appendClosing(std::string& rows, const RowClosing& closing) const
 {
+    if (isPoint())
+        return appendClosingPoint(rows, closing);
     rows += _capture;
     if (!isJson())
         rows += nothings(valueColumns).substr(1);

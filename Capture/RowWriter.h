@@ -19,6 +19,7 @@ namespace ventrik
 enum class RowFormat {
     JsonLines, ///< one object a line
     Csv,       ///< a first line with the columns' names; null is nothing, an empty text is ""
+    Influx,    ///< points in InfluxDB's line protocol, in the measurement "ventrik"
 };
 
 /// The columns, a line for each, behind one with the number of the schema.
@@ -60,14 +61,18 @@ struct RowClosing {
 };
 
 /// Writes the rows of one capture. A row is the parts of its record, its place and its value, one
-/// behind the other: whoever has many rows keeps the parts that they share.
+/// behind the other, of a point the record behind the others: whoever has many rows keeps the parts
+/// that they share.
 class RowWriter
 {
   public:
     /// The technology is empty where it is not known.
     RowWriter(RowFormat format, std::string_view capture, std::string_view technology);
 
-    /// The columns from the first one to the record's layout. It lives until the next one.
+    bool isRecordLast() const { return _format == RowFormat::Influx; }
+
+    /// The columns from the first one to the record's layout; of a point its time. It lives until
+    /// the next one.
     std::string_view recordPart(const RowRecord& record);
     /// Those of a value's place.
     std::string placePart(const RowPlace& place) const;
@@ -86,6 +91,11 @@ class RowWriter
     };
 
     bool isJson() const { return _format == RowFormat::JsonLines; }
+    bool isPoint() const { return _format == RowFormat::Influx; }
+    std::string_view timePart(Clock::TimePoint time);
+    std::string tagsOf(const RowPlace& place) const;
+    void addFields(std::string& point, const RowValue& value) const;
+    void appendClosingPoint(std::string& rows, const RowClosing& closing) const;
     const KindPart& kindPart(const RowRecord& record);
     /// A column's name, in JSON, and a text. Names come as `,"name":`.
     void addText(std::string& row, std::string_view column, std::string_view text) const;

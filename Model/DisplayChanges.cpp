@@ -60,10 +60,11 @@ void keepText(std::string& kept, std::string_view text)
         kept = text;
 }
 
-std::string pathOf(const DisplayPlace& place)
+void joinPathOf(const DisplayPlace& place, std::string& path)
 {
-    const DisplayPlace* holder = place.holder->place;
-    return pathJoining(holder ? pathOf(*holder) : "/", nameOf(place));
+    if (const DisplayPlace* holder = place.holder->place)
+        joinPathOf(*holder, path);
+    joinPath(path, nameOf(place));
 }
 
 std::optional<std::size_t> indexOf(const DisplayPlace& place)
@@ -426,7 +427,9 @@ DisplayPlaceDescription DisplayChanges::describe(const DisplayPlace& place,
         group = group->place->holder;
     if (section.empty() && group->place)
         section = nameOf(*group->place);
-    return {pathOf(place), std::string(nameOf(place)), std::move(section), indexOf(place)};
+    std::string path;
+    joinPathOf(place, path);
+    return {std::move(path), std::string(nameOf(place)), std::move(section), indexOf(place)};
 }
 
 std::optional<ShownCell> DisplayChanges::cellAt(const DisplayPlace& place,

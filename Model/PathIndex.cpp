@@ -5,8 +5,6 @@
 #include <algorithm>
 #include <functional>
 
-#include <fmt/format.h>
-
 namespace ventrik
 {
 
@@ -111,12 +109,19 @@ std::vector<std::string_view> PathIndex::keysOf(std::string_view path) const
 
 std::string pathJoining(std::string_view path, std::string_view name)
 {
+    std::string joined(path);
+    joinPath(joined, name);
+    return joined;
+}
+
+void joinPath(std::string& path, std::string_view name)
+{
     while (path.ends_with('/'))
-        path.remove_suffix(1);
+        path.pop_back();
     removeLeadingSlashes(name);
-    if (name.empty())
-        return path.empty() ? "/" : std::string(path);
-    return fmt::format("{}/{}", path, name);
+    if (!name.empty() || path.empty())
+        path += '/';
+    path += name;
 }
 
 } // namespace ventrik

@@ -78,5 +78,7 @@ class PathIndex
 
 /// The path of a child, by the same rule.
 std::string pathJoining(std::string_view path, std::string_view name);
+/// The path becomes that of its child.
+void joinPath(std::string& path, std::string_view name);
 
 } // namespace ventrik

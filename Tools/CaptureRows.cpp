@@ -83,9 +83,12 @@ void CaptureRows::append(std::string_view recordPart, std::string_view placePart
     if (size > _text.size())
         _text.resize(std::max(2 * size, firstRoom));
     char* end = _text.data() + _used;
-    end = std::copy_n(recordPart.data(), recordPart.size(), end);
+    if (!_writer.isRecordLast())
+        end = std::copy_n(recordPart.data(), recordPart.size(), end);
     end = std::copy_n(placePart.data(), placePart.size(), end);
-    std::copy_n(valuePart.data(), valuePart.size(), end);
+    end = std::copy_n(valuePart.data(), valuePart.size(), end);
+    if (_writer.isRecordLast())
+        std::copy_n(recordPart.data(), recordPart.size(), end);
     _used = size;
 }
 

@@ -87,18 +87,20 @@ PathSelection::PathSelection(const std::vector<std::string>& patterns)
 
 bool PathSelection::selects(std::string_view path) const
 {
+    if (_patterns.empty())
+        return true;
     const Parts parts = partsOf(path);
-    return _patterns.empty() || std::ranges::any_of(_patterns, [&](const Parts& pattern) {
-               return fitOf(pattern, parts).isWhole;
-           });
+    return std::ranges::any_of(_patterns,
+                               [&](const Parts& pattern) { return fitOf(pattern, parts).isWhole; });
 }
 
 bool PathSelection::reaches(std::string_view path) const
 {
+    if (_patterns.empty())
+        return true;
     const Parts parts = partsOf(path);
-    return _patterns.empty() || std::ranges::any_of(_patterns, [&](const Parts& pattern) {
-               return fitOf(pattern, parts).isBegun;
-           });
+    return std::ranges::any_of(_patterns,
+                               [&](const Parts& pattern) { return fitOf(pattern, parts).isBegun; });
 }
 
 } // namespace ventrik

@@ -7,13 +7,28 @@
 #include <QCoreApplication>
 
 #include <cstdlib>
+#include <map>
+#include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
+
+#include <fmt/format.h>
 
 using namespace ventrik;
 
 namespace
 {
+
+RowFormat rowFormatValue(const std::string& text)
+{
+    static const std::map<std::string_view, RowFormat> formats{
+        {"rows", RowFormat::JsonLines}, {"csv", RowFormat::Csv}, {"influx", RowFormat::Influx}};
+    const auto format = formats.find(text);
+    if (format == formats.end())
+        throw WrongValue(fmt::format("there are no rows in the format '{}'", text));
+    return format->second;
+}
 
 WatchOptions parseArguments(int argc, char** argv)
 {
@@ -23,11 +38,14 @@ WatchOptions parseArguments(int argc, char** argv)
                      "time something new has arrived.");
     WatchOptions result;
     std::vector<std::string> selected;
+    std::optional<RowFormat> rowFormat;
     line.addFlag("--once", "prints the first tree and ends", result.once);
     line.addFlag("--plain", "prints trees on a terminal, too, one in the place of the other",
                  result.plain);
     line.addFlag("--rows", "prints rows of values as they change, as ventrik-decode --format rows",
                  [&] { result.rows.emplace(); });
+    line.addOption("--format FORMAT", "of the rows: rows (default), csv or influx", rowFormat,
+                   rowFormatValue);
     line.addOption("--select PATH", "of the rows those of the values there and below",
                    [&](const std::string& path) { selected.push_back(textValue(path)); });
     line.addFlag("--channel-pane",
@@ -50,8 +68,12 @@ WatchOptions parseArguments(int argc, char** argv)
         line.refuse("--select goes with --rows");
     if (result.channelPane && result.rows)
         line.refuse("--channel-pane does not go with --rows");
-    if (result.rows)
+    if (rowFormat && !result.rows)
+        line.refuse("--format goes with --rows");
+    if (result.rows) {
         result.rows->selection = PathSelection(selected);
+        result.rows->format = rowFormat.value_or(RowFormat::JsonLines);
+    }
     return result;
 }
 

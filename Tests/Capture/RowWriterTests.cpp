@@ -25,8 +25,9 @@ class RowWriterTest : public testing::Test
                              const RowValue& value)
     {
         RowWriter writer(format, "drive, \"one\".pcap", "lte");
-        return std::string(writer.recordPart(record)) + writer.placePart(place) +
-               valueOf(writer, value);
+        const std::string ofRecord(writer.recordPart(record));
+        const std::string rest = writer.placePart(place) + valueOf(writer, value);
+        return writer.isRecordLast() ? rest + ofRecord : ofRecord + rest;
     }
     static std::string valueOf(const RowWriter& writer, const RowValue& value)
     {
@@ -125,6 +126,47 @@ TEST_F(RowWriterTest, HasNothingInATableThatATerminalWouldObey)
                 HasSubstr(",a [2J\tb \xef\xbf\xbd,"));
     EXPECT_THAT(rowOf(RowFormat::JsonLines, {0, moment}, wholePlace, value),
                 HasSubstr(R"("text":"a\u001b[2J)"));
+}
+
+TEST_F(RowWriterTest, WritesAPointOfALineProtocol)
+{
+    EXPECT_EQ(rowOf(RowFormat::Influx, wholeRecord, wholePlace, wholeValue),
+              R"(ventrik,capture=drive\,\ "one".pcap,technology=lte,section=Measurements,)"
+              R"(path=/A/0/RSRP,index=0,name=RSRP )"
+              R"(text="-63.75 dBm",number=-63.75,unit="dBm" 1000000000000250000)"
+              "\n");
+}
+
+TEST_F(RowWriterTest, WritesAPointOfATextAndOneOfWhatIsGone)
+{
+    EXPECT_THAT(rowOf(RowFormat::Influx, {0, moment}, {"", "/a", {}, "a"}, {.text = "say \"a\\\""}),
+                testing::EndsWith(R"(,technology=lte,path=/a,name=a text="say \"a\\\"" )"
+                                  "1000000000000250000\n"));
+    EXPECT_THAT(rowOf(RowFormat::Influx, {0, moment}, {"s", "/a", {}, "a"}, {}),
+                HasSubstr(",name=a gone=true 1000000000000250000\n"));
+}
+
+TEST_F(RowWriterTest, APointIsOneLineAndItsTagsHoldNothingThatEndsThem)
+{
+    const RowPlace place{"a,b=c d", "/x\\", {}, "n\nm"};
+    EXPECT_EQ(rowOf(RowFormat::Influx, {0, moment}, place, {.text = "1\n2"}),
+              R"(ventrik,capture=drive\,\ "one".pcap,technology=lte,section=a\,b\=c\ d,)"
+              R"(path=/x/,name=n\ m text="1 2" 1000000000000250000)"
+              "\n");
+}
+
+TEST_F(RowWriterTest, APointHasNoNumberThatIsNotFinite)
+{
+    EXPECT_THAT(numberRow(RowFormat::Influx, -std::numeric_limits<double>::infinity()),
+                HasSubstr(R"( text="text" 1)"));
+}
+
+TEST_F(RowWriterTest, ClosesACaptureWithAPointOfItsOwn)
+{
+    EXPECT_EQ(closingOf(RowFormat::Influx, {"damaged", 24, "cut \"short\"", 10, 8, 25, 360}),
+              R"(ventrik_capture,capture=drive.pcap,technology=lte status="damaged",)"
+              R"(reason="cut \"short\"",offset=24i,records=10i,decoded=8i,rows=25i,bytes=360i)"
+              "\n");
 }
 
 TEST_F(RowWriterTest, ClosesACapture)

@@ -77,6 +77,16 @@ TEST_F(WatchProcess, OncePrintsTheRowsUpToTheFirstRefresh)
     EXPECT_THAT(watch->output(), HasSubstr("\"path\":\"/Serving Cell Info/Physical Cell ID\""));
 }
 
+TEST_F(WatchProcess, PrintsPointsWhereThatIsAskedFor)
+{
+    const auto capture = PcapBytes(lteLinkType).record(captureStart, 0, cellInfoMessage(301));
+    const auto service = startReplay("cells.pcap", capture.bytes());
+    const auto watch = start("ventrik-watch", {"--rows", "--format", "influx", "--once"});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("name=Physical\\ Cell\\ ID text=\"301\",number=301 "));
+    EXPECT_THAT(linesOf(watch->output()).back(), StartsWith("ventrik_capture,capture=live "));
+}
+
 TEST_F(WatchProcess, ReadsRecordsAsItIsTold)
 {
     const Bytes state = PacketBuilder(0xB0EE).size(32).u8(13, 2).u8(14, 3).build();

@@ -1,4 +1,4 @@
-#!/usr/bin/env python3
+#!/usr/bin/python3
 """Decodes captures on many workers and loads their rows into ClickHouse.
 
     fleet.py --workers 2 CAPTURE|DIRECTORY...

@@ -5,4 +5,4 @@ target_link_libraries(ventrik PRIVATE ventrik-app ventrik-tools ventrik-capture)
 set_target_properties(ventrik PROPERTIES ENABLE_EXPORTS ON)
 target_link_options(ventrik PRIVATE -Wl,-u,lz4_decode_fast -Wl,-u,ETLDLFAddVersionReport)
 
-install(TARGETS ventrik)
+install(TARGETS ventrik COMPONENT viewer)

@@ -57,7 +57,7 @@ void VentrikApp::applicationDidFinishLaunching()
     _model = std::make_shared<VentrikModel>(
         _platform, [this] { updateViewControllerFromModel(); },
         LogGenerator::generatorsReading(_options.records));
-    _model->observeMessages(&_channelCounts);
+    _model->addObserver(_channelCounts);
     _model->setChannelCallback([this] { channelChanged(); });
     _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, _platform.clock);
     setUpdateMessage(connectingStatus);

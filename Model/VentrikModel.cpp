@@ -94,7 +94,7 @@ VentrikModel::VentrikModel(const Platform& platform, UpdateCallback updateScreen
 VentrikModel::~VentrikModel()
 {
     destroyPorts();
-    tellObserver(nullptr, {});
+    tellObservers(nullptr, {});
 }
 
 bool VentrikModel::isConnected() const
@@ -223,20 +223,20 @@ void VentrikModel::configureGenerator()
         return;
     }
     setFault(ChannelFault::NoTechnology);
-    tellObserver(nullptr, {});
+    tellObservers(nullptr, {});
     _logGenerator =
         _makeGenerator(*technology, {_platform.log, _platform.resources, _platform.clock});
     if (const auto known = technologyOfIdentifier(*technology); known && _logGenerator) {
         _technologyName = known->displayName;
-        tellObserver(_logGenerator.get(), known->name);
+        tellObservers(_logGenerator.get(), known->name);
     }
     _platform.log.error("Got log generated: {}", fmt::ptr(_logGenerator.get()));
 }
 
-void VentrikModel::tellObserver(const LogGenerator* generator, std::string_view technology)
+void VentrikModel::tellObservers(const LogGenerator* generator, std::string_view technology)
 {
-    if (_observer)
-        _observer->useGenerator(generator, technology);
+    for (MessageObserver* observer : _observers)
+        observer->useGenerator(generator, technology);
 }
 
 void VentrikModel::startMonitor()
@@ -405,8 +405,9 @@ void VentrikModel::updateWithData(ByteView data)
         _logGenerator->updateState(_state, data);
     _updated = true;
     _lastMessageTime = _platform.clock.now();
-    if (_observer && _logGenerator)
-        _observer->messageTaken(*_lastMessageTime, data, _state);
+    if (_logGenerator)
+        for (MessageObserver* observer : _observers)
+            observer->messageTaken(*_lastMessageTime, data, _state);
 }
 
 std::optional<PlistValue> VentrikModel::getSaveContents() const

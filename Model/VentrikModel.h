@@ -10,6 +10,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace ventrik
 {
@@ -80,8 +81,9 @@ class VentrikModel : public DisplayTree
     /// Null while there is none.
     const LogGenerator* generator() const { return _logGenerator.get(); }
 
-    /// Null for none. Before the first message, and it outlives the model.
-    void observeMessages(MessageObserver* observer) { _observer = observer; }
+    /// Before the first message. An observer outlives the model, or leaves before.
+    void addObserver(MessageObserver& observer) { _observers.push_back(&observer); }
+    void removeObserver(MessageObserver& observer) { std::erase(_observers, &observer); }
 
     bool createPorts();
     void destroyPorts();
@@ -111,7 +113,7 @@ class VentrikModel : public DisplayTree
     /// Without a port the result is `PortError::invalidPort`.
     RemotePort::SendResult sendCommand(const Bytes& command, RemotePort::Seconds replyTimeout,
                                        RemotePort::Reply reply);
-    void tellObserver(const LogGenerator* generator, std::string_view technology);
+    void tellObservers(const LogGenerator* generator, std::string_view technology);
     void retryLater();
     void setFault(ChannelFault fault) { _attemptFault = fault; }
     /// Tells the screens where the channel's state is not what they were told last.
@@ -134,7 +136,7 @@ class VentrikModel : public DisplayTree
     ModelNodePointer _nodes;
     std::optional<PathIndex> _nodesByPath;
 
-    MessageObserver* _observer = nullptr;
+    std::vector<MessageObserver*> _observers;
     std::function<void()> _channelCallback;
     ChannelFault _attemptFault = ChannelFault::None; // of the attempt that is being made
     ChannelFault _channelFault = ChannelFault::None;

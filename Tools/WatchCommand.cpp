@@ -8,8 +8,10 @@
 #include <QCoreApplication>
 
 #include <cerrno>
+#include <chrono>
 #include <cstdlib>
 #include <stdexcept>
+#include <utility>
 
 #include <fmt/format.h>
 #include <unistd.h>
@@ -24,6 +26,7 @@ constexpr const char* programName = "ventrik-watch";
 // Of what was kept from the screen: what was asked for, or what tells how it ended.
 constexpr int linesWhenVerbose = 1000;
 constexpr int linesOtherwise = 20;
+constexpr auto metricsInterval = std::chrono::seconds(2); // as often as the screens
 constexpr std::string_view clearScreen = "\033[H\033[2J";
 
 LinuxPlatformOptions platformOptions(const WatchOptions& options)
@@ -51,9 +54,13 @@ int WatchCommand::run()
     const Platform platform = recording.platform();
     _model = makeModel(platform);
     if (_options.rows)
-        _model->observeMessages(&_rows.emplace(*_options.rows, _options.records));
-    else
-        _model->observeMessages(&_channelCounts);
+        _model->addObserver(_rows.emplace(*_options.rows, _options.records));
+    _model->addObserver(_channelCounts);
+    if (_options.metricsFile)
+        _model->addObserver(_metrics.emplace(*_options.metricsFile));
+    std::unique_ptr<RepeatingTimer> metricsTimer;
+    if (_metrics)
+        metricsTimer = platform.mainQueue.repeatEvery(metricsInterval, [this] { writeMetrics(); });
     _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, platform.clock);
     if (_options.channelPane)
         _tree->show();
@@ -103,6 +110,18 @@ void WatchCommand::refresh()
         printRows();
     else
         printTree();
+}
+
+// A failure is told once, until it is over.
+void WatchCommand::writeMetrics()
+{
+    std::string error;
+    if (!_metrics || _metrics->write(*_model, error)) {
+        _metricsFault.clear();
+        return;
+    }
+    if (error != std::exchange(_metricsFault, error))
+        complain(programName, error);
 }
 
 void WatchCommand::printRows()

@@ -5,11 +5,13 @@
 #include "Platform/Platform.h"
 #include "Platform/SystemLog.h"
 #include "Tools/LiveRows.h"
+#include "Tools/MetricsFile.h"
 #include "Tools/Recording.h"
 #include "Tools/Watch/WatchViewer.h"
 
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 
 #include <unistd.h>
@@ -18,10 +20,11 @@ namespace ventrik
 {
 
 struct WatchOptions {
-    bool once = false;              ///< ends after the first tree
-    bool channelPane = false;       ///< the root ends with a row for the channel
-    bool plain = false;             ///< prints trees on a terminal, too
-    std::optional<RowOptions> rows; ///< prints rows instead
+    bool once = false;                      ///< ends after the first tree
+    bool channelPane = false;               ///< the root ends with a row for the channel
+    std::optional<std::string> metricsFile; ///< where numbers go at each refresh
+    bool plain = false;                     ///< prints trees on a terminal, too
+    std::optional<RowOptions> rows;         ///< prints rows instead
     RecordsMode records = RecordsMode::Newer;
     RecordingOptions recording;
     int logLevel = LogPriority::error;
@@ -44,14 +47,17 @@ class WatchCommand
     bool showsPanes() const;
     std::unique_ptr<VentrikModel> makeModel(const Platform& platform);
     void refresh();
+    void writeMetrics();
     void printTree();
     void printRows();
     bool print(std::string_view text) const;
     bool print(const VentrikModelNode& root) const;
 
     WatchOptions _options;
-    int _output = STDOUT_FILENO;   // where the result goes
-    std::optional<LiveRows> _rows; // where they are printed
+    int _output = STDOUT_FILENO;         // where the result goes
+    std::optional<LiveRows> _rows;       // where they are printed
+    std::optional<MetricsFile> _metrics; // where they are written
+    std::string _metricsFault;           // why they were not, the last time; else empty
     ChannelCounts _channelCounts;
     std::unique_ptr<VentrikModel> _model;
     std::unique_ptr<ChannelPane> _tree;   // the model's, with a row for the channel

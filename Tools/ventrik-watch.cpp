@@ -52,6 +52,10 @@ WatchOptions parseArguments(int argc, char** argv)
                  "the root ends with a row for the channel: what came, and what did not; c shows "
                  "it, too",
                  result.channelPane);
+    line.addOption("--metrics-file FILE",
+                   "writes the numbers that show to FILE every 2 s, for Prometheus' node "
+                   "exporter",
+                   result.metricsFile, textValue);
     line.addOption("--records LAYOUTS", recordsNames(), result.records, recordsValue);
     addRecordingOptions(line, result.recording);
     line.addLogOptions("go to the system log", result.logLevel,

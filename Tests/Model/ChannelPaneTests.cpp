@@ -17,8 +17,8 @@ using testing::Not;
 class ChannelPaneTest : public ModelFixture
 {
   protected:
-    ChannelPaneTest() { model.observeMessages(&counts); }
-    ~ChannelPaneTest() override { model.observeMessages(nullptr); }
+    ChannelPaneTest() { model.addObserver(counts); }
+    ~ChannelPaneTest() override { model.removeObserver(counts); }
 
     void start()
     {

@@ -77,6 +77,21 @@ TEST_F(WatchProcess, OncePrintsTheRowsUpToTheFirstRefresh)
     EXPECT_THAT(watch->output(), HasSubstr("\"path\":\"/Serving Cell Info/Physical Cell ID\""));
 }
 
+TEST_F(WatchProcess, WritesMetricsAlsoWhenTheServiceIsGone)
+{
+    auto service = startScenario();
+    const auto watch = start("ventrik-watch", {"--rows", "--metrics-file", path("metrics")});
+    const auto holds = [this](const char* line) {
+        return waitUntil([&] { return readFile(path("metrics")).find(line) != std::string::npos; });
+    };
+    EXPECT_TRUE(holds("ventrik_channel_open 1\n"));
+    EXPECT_TRUE(holds("ventrik_measured_rsrp_dbm{technology=\"lte\","));
+    service.reset();
+    EXPECT_TRUE(holds("ventrik_channel_open 0\n"));
+    watch->send(SIGTERM);
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+}
+
 TEST_F(WatchProcess, PrintsPointsWhereThatIsAskedFor)
 {
     const auto capture = PcapBytes(lteLinkType).record(captureStart, 0, cellInfoMessage(301));

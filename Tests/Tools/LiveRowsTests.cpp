@@ -14,8 +14,8 @@ using testing::IsEmpty;
 class LiveRowsTest : public ModelFixture
 {
   protected:
-    LiveRowsTest() { model.observeMessages(&rows); }
-    ~LiveRowsTest() override { model.observeMessages(nullptr); }
+    LiveRowsTest() { model.addObserver(rows); }
+    ~LiveRowsTest() override { model.removeObserver(rows); }
 
     LiveRows rows{{.selection = PathSelection({"/a/x"})}, RecordsMode::Newer};
 };

@@ -17,6 +17,7 @@ namespace
 {
 
 constexpr mode_t ownerOnly = S_IRUSR | S_IWUSR;
+constexpr mode_t readByAll = ownerOnly | S_IRGRP | S_IROTH;
 constexpr std::string_view temporaryPattern = ".ventrik-XXXXXX";
 
 std::string lineOf(const std::string& path, int error)
@@ -63,7 +64,18 @@ bool flushToDisk(int descriptor)
 
 std::optional<PrivateFile> PrivateFile::create(const std::string& path, std::string& error)
 {
-    PrivateFile file(path);
+    return create(path, Kind::Private, error);
+}
+
+std::optional<PrivateFile> PrivateFile::createForAll(const std::string& path, std::string& error)
+{
+    return create(path, Kind::ForAll, error);
+}
+
+std::optional<PrivateFile> PrivateFile::create(const std::string& path, Kind kind,
+                                               std::string& error)
+{
+    PrivateFile file(path, kind);
     if (const int obstacle = obstacleAt(path); obstacle == EINVAL)
         error = fmt::format("{}: is no ordinary file", path);
     else if (obstacle != 0)
@@ -78,7 +90,9 @@ std::optional<PrivateFile> PrivateFile::create(const std::string& path, std::str
 bool PrivateFile::open()
 {
     const std::string directory = directoryOf(_path);
-    return openNameless(directory) || openNamed(directory);
+    if (!openNameless(directory) && !openNamed(directory))
+        return false;
+    return _kind == Kind::Private || ::fchmod(::fileno(stream()), readByAll) == 0;
 }
 
 // A file without a name leaves nothing behind, however the process ends.
@@ -107,6 +121,7 @@ PrivateFile::~PrivateFile()
 
 PrivateFile::PrivateFile(PrivateFile&& other) noexcept
     : _path(std::move(other._path)),
+      _kind(other._kind),
       _temporaryName(std::exchange(other._temporaryName, {})),
       _writeError(other._writeError),
       _stream(std::move(other._stream))
@@ -117,6 +132,7 @@ PrivateFile& PrivateFile::operator=(PrivateFile&& other) noexcept
 {
     discard();
     _path = std::move(other._path);
+    _kind = other._kind;
     _temporaryName = std::exchange(other._temporaryName, {});
     _writeError = other._writeError;
     _stream = std::move(other._stream);
@@ -143,9 +159,14 @@ bool PrivateFile::bringToDisk()
     const bool isFlushed = std::fflush(stream()) == 0;
     const int error = isFlushed ? EIO : errno;
     if (isFlushed && _writeError == 0 && std::ferror(stream()) == 0)
-        return flushToDisk(::fileno(stream()));
+        return flush(::fileno(stream()));
     errno = _writeError != 0 ? _writeError : error;
     return false;
+}
+
+bool PrivateFile::flush(int descriptor) const
+{
+    return _kind == Kind::ForAll || flushToDisk(descriptor);
 }
 
 bool PrivateFile::takeName()
@@ -169,7 +190,7 @@ bool PrivateFile::takeName()
     _temporaryName.clear();
     const int opened = ::open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
     if (opened >= 0) {
-        flushToDisk(opened); // the name as well; the file is there already either way
+        flush(opened); // the name as well; the file is there already either way
         ::close(opened);
     }
     return true;

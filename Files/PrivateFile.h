@@ -22,6 +22,9 @@ class PrivateFile
   public:
     /// None, and the error, when there can be no such file.
     static std::optional<PrivateFile> create(const std::string& path, std::string& error);
+    /// One that everybody may read, and for which nothing waits for the disk: of what is written
+    /// anew all the time.
+    static std::optional<PrivateFile> createForAll(const std::string& path, std::string& error);
     /// Forgets what was not committed.
     ~PrivateFile();
     PrivateFile(PrivateFile&& other) noexcept;
@@ -41,7 +44,12 @@ class PrivateFile
         void operator()(std::FILE* stream) const { std::fclose(stream); }
     };
 
-    explicit PrivateFile(std::string path) : _path(std::move(path)) {}
+    enum class Kind { Private, ForAll };
+
+    PrivateFile(std::string path, Kind kind) : _path(std::move(path)), _kind(kind) {}
+    static std::optional<PrivateFile> create(const std::string& path, Kind kind,
+                                             std::string& error);
+    bool flush(int descriptor) const;
     bool open();
     bool openNameless(const std::string& directory);
     bool openNamed(const std::string& directory);
@@ -50,6 +58,7 @@ class PrivateFile
     void discard();
 
     std::string _path;
+    Kind _kind;
     std::string _temporaryName; // empty while it has none
     int _writeError = 0;        // errno of the first write that failed
     std::unique_ptr<std::FILE, Closer> _stream;

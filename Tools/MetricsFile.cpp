@@ -1,5 +1,6 @@
 #include "Tools/MetricsFile.h"
 
+#include "Files/PrivateFile.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Model/DisplayChanges.h"
 #include "Model/DisplayNames.h"
@@ -7,13 +8,9 @@
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
 #include <cmath>
-#include <cstdio>
-#include <cstring>
 
 #include <fmt/format.h>
-#include <unistd.h>
 
 namespace ventrik
 {
@@ -79,24 +76,10 @@ std::string_view cellOf(const PlistValue& group)
     return {};
 }
 
-std::string oneLine(std::string_view metric, std::string_view labels, double number)
+std::string lineOf(std::string_view metric, std::string_view labels, double number)
 {
     return labels.empty() ? fmt::format("{} {}\n", metric, number)
                           : fmt::format("{}{{{}}} {}\n", metric, labels, number);
-}
-
-// Who reads in between sees the former file. Nothing waits for the disk: the next one comes soon.
-bool replaceFile(const std::string& path, const std::string& text, std::string& error)
-{
-    const std::string temporary = fmt::format("{}.{}", path, getpid());
-    std::FILE* file = std::fopen(temporary.c_str(), "we");
-    bool isWritten = file && std::fwrite(text.data(), 1, text.size(), file) == text.size();
-    isWritten = file && std::fclose(file) == 0 && isWritten;
-    if (isWritten && std::rename(temporary.c_str(), path.c_str()) == 0)
-        return true;
-    error = fmt::format("{}: {}", path, std::strerror(errno));
-    std::remove(temporary.c_str());
-    return false;
 }
 
 } // namespace
@@ -125,12 +108,15 @@ void MetricsFile::addGroup(Metrics& metrics, const PlistValue& group, Keys& keys
             addGroup(metrics, value, keys, itsIndex);
         keys.pop_back();
     };
-    if (const PlistDictionary* dictionary = group.dictionary())
-        for (const auto& [key, value] : *dictionary)
-            addEntry(key, value, index);
-    else if (const PlistArray* array = group.array())
+    if (const PlistDictionary* dictionary = group.dictionary()) {
+        for (const auto& [key, value] : *dictionary) {
+            if (key != sortedMarker)
+                addEntry(key, value, index);
+        }
+    } else if (const PlistArray* array = group.array()) {
         for (std::size_t i = 0; i < array->size(); ++i)
             addEntry(fmt::format_int(i).str(), (*array)[i], static_cast<int>(i));
+    }
 }
 
 void MetricsFile::addValue(Metrics& metrics, const PlistValue& group, const Keys& keys, int index,
@@ -156,7 +142,7 @@ void MetricsFile::addValue(Metrics& metrics, const PlistValue& group, const Keys
         joinPath(path, labelOfSortedKey(key));
     addLabel(labels, "path", path);
     const std::string metric = metricOf(labelOfSortedKey(keys.back()), unit);
-    metrics[metric].push_back(oneLine(metric, labels, *number));
+    metrics[metric].insert_or_assign(labels, *number);
 }
 
 std::string MetricsFile::text(const VentrikModel& model) const
@@ -168,7 +154,7 @@ std::string MetricsFile::text(const VentrikModel& model) const
         addGroup(metrics, *display, keys, noIndex);
     }
     const auto addCount = [&](const char* metric, double number) {
-        metrics[metric].push_back(oneLine(metric, {}, number));
+        metrics[metric].insert_or_assign({}, number);
     };
     addCount("ventrik_channel_open", model.isConnected() ? 1 : 0);
     addCount("ventrik_channel_opened_total", static_cast<double>(model.timesOpened()));
@@ -180,18 +166,22 @@ std::string MetricsFile::text(const VentrikModel& model) const
                      std::chrono::floor<std::chrono::milliseconds>(time->time_since_epoch()))
                      .count());
     std::string text;
-    for (const auto& [metric, lines] : metrics) {
+    for (const auto& [metric, numbers] : metrics) {
         text +=
             fmt::format("# TYPE {} {}\n", metric, metric.ends_with("_total") ? "counter" : "gauge");
-        for (const std::string& line : lines)
-            text += line;
+        for (const auto& [labels, number] : numbers)
+            text += lineOf(metric, labels, number);
     }
     return text;
 }
 
 bool MetricsFile::write(const VentrikModel& model, std::string& error) const
 {
-    return replaceFile(_path, text(model), error);
+    auto file = PrivateFile::createForAll(_path, error);
+    if (!file)
+        return false;
+    file->write(text(model));
+    return file->commit(error);
 }
 
 } // namespace ventrik

@@ -30,8 +30,8 @@ class MetricsFile : public MessageObserver
     bool write(const VentrikModel& model, std::string& error) const;
 
   private:
-    /// The lines of each metric.
-    using Metrics = std::map<std::string, std::vector<std::string>>;
+    /// The numbers of each metric by their labels, of which no two may be the same.
+    using Metrics = std::map<std::string, std::map<std::string, double>>;
     using Keys = std::vector<std::string_view>;
 
     void addGroup(Metrics& metrics, const PlistValue& group, Keys& keys, int index) const;

@@ -104,6 +104,7 @@ std::unique_ptr<VentrikModel> WatchCommand::makeModel(const Platform& platform)
 
 void WatchCommand::refresh()
 {
+    writeMetrics();
     if (_viewer)
         _viewer->refresh();
     else if (_rows)

@@ -77,7 +77,9 @@ std::optional<ShownCell> FieldMemory::cellOf(std::size_t slot) const
 
 std::optional<ShownCell> FieldMemory::cellOf(std::string_view& key, std::size_t& slot) const
 {
-    const bool isKnown = slot < _slots.size() && _slots[slot].key.data() == key.data();
+    // Once found, the two are one text.
+    const bool isKnown = slot < _slots.size() && _slots[slot].key.data() == key.data() &&
+                         _slots[slot].key.size() == key.size();
     if (!isKnown) {
         const auto known = knownSlotOf(key);
         if (!known)

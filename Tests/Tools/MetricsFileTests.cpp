@@ -78,6 +78,21 @@ TEST_F(MetricsFileTest, HoldsNothingThatEndsALabelOrALine)
                                   "path=\"/a\\\"b\\\\c d\"} 5\n"));
 }
 
+TEST_F(MetricsFileTest, LeavesOutWhatOnlySortsAGroup)
+{
+    show(PlistDictionary{{"_sorted", "1"}, {"2;b", "5"}});
+    EXPECT_THAT(text(), Not(HasSubstr("sorted")));
+    EXPECT_THAT(text(), HasSubstr("path=\"/b\"} 5\n"));
+}
+
+// Prometheus refuses a whole file for two lines of one metric and labels.
+TEST_F(MetricsFileTest, HasOneLineForTwoKeysWithOneLabel)
+{
+    show(PlistDictionary{{"_sorted", ""}, {"1;a", "1"}, {"2;a", "2"}});
+    EXPECT_THAT(text(), HasSubstr("path=\"/a\"} 2\n"));
+    EXPECT_THAT(text(), Not(HasSubstr("path=\"/a\"} 1\n")));
+}
+
 TEST_F(MetricsFileTest, CountsWhatTheChannelDid)
 {
     EXPECT_THAT(text(), HasSubstr("ventrik_channel_open 0\n"));
@@ -100,7 +115,9 @@ TEST_F(MetricsFileTest, IsWrittenWholeAndReadableToOthers)
     EXPECT_EQ(contentOf(path), text());
     ASSERT_TRUE(metrics.write(model, error)) << error;
     EXPECT_EQ(contentOf(path), text());
-    EXPECT_FALSE(std::filesystem::exists(path + "." + std::to_string(getpid())));
+    using std::filesystem::perms;
+    EXPECT_EQ(std::filesystem::status(path).permissions(),
+              perms::owner_read | perms::owner_write | perms::group_read | perms::others_read);
 }
 
 TEST_F(MetricsFileTest, TellsWhyItCannotBeWritten)

@@ -68,7 +68,7 @@ void VentrikApp::applicationDidFinishLaunching()
     _channelTimer =
         _platform.mainQueue.repeatEvery(channelInterval, [this] { updateChannelPane(); });
     if (_options.channelPane) {
-        _tree->show();
+        _tree->keep();
         reloadScreens();
     }
     startModelLater();
@@ -241,14 +241,10 @@ void VentrikApp::toggleChannelPane()
 {
     if (!_navController || _saveViewController)
         return;
-    const bool leaves = showsChannelPane();
-    if (leaves && !_options.channelPane)
-        _tree->hide();
-    else
-        _tree->show();
+    const bool leadsThere = _tree->toggle(topPath());
     _navController->popTo(*_navController->screens().front(), false);
     reloadScreens();
-    if (!leaves) {
+    if (leadsThere) {
         auto pane = VentrikPaneController::initWithNode(
             *this, _tree->nodeAtPath(ChannelPane::rowPath), ChannelPane::rowPath);
         _navController->push(std::move(pane), true);
@@ -256,16 +252,17 @@ void VentrikApp::toggleChannelPane()
     }
 }
 
-bool VentrikApp::showsChannelPane() const
+// Every screen of the stack is a pane.
+std::string VentrikApp::topPath() const
 {
     const auto* pane = dynamic_cast<VentrikPaneController*>(&_navController->topScreen());
-    return pane && _tree->holds(pane->path());
+    return pane ? pane->path() : std::string();
 }
 
 // Also while nothing comes; then above all.
 void VentrikApp::updateChannelPane()
 {
-    if (!_navController || !showsChannelPane())
+    if (!_navController || !_tree->holds(topPath()))
         return;
     _tree->update();
     reloadScreens();

@@ -100,7 +100,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void startModelLater();
     void channelChanged();
     void updateTopNotes();
-    bool showsChannelPane() const;
+    std::string topPath() const;
     void updateChannelPane();
     void updateWindowTitle();
     void reloadScreens();

@@ -93,6 +93,16 @@ void ChannelPane::hide()
     _nodesByPath.reset();
 }
 
+bool ChannelPane::toggle(const std::string& path)
+{
+    const bool leaves = holds(path);
+    if (leaves && !_isKept)
+        hide();
+    else
+        show();
+    return !leaves;
+}
+
 void ChannelPane::update()
 {
     if (isShown())

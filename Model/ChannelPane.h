@@ -46,6 +46,15 @@ class ChannelPane : public DisplayTree
     bool isShown() const { return _node != nullptr; }
     void show();
     void hide();
+    /// The row stays from now on.
+    void keep()
+    {
+        _isKept = true;
+        show();
+    }
+    /// For the key that leads to the row and back, from what shows at a path: true where it leads
+    /// to the row, which is shown then. Back at the root the row is left out again.
+    bool toggle(const std::string& path);
     /// The model has news of its display.
     void takeDisplay() { _display = _model.topLevelNodes(); }
     /// Brings the channel's rows up to date, where they are shown. May wait for the service.
@@ -69,6 +78,7 @@ class ChannelPane : public DisplayTree
     const Clock& _clock;
     ModelNodePointer _display; // the model's root, when it last had news
     ModelNodePointer _node;    // null while the row is left out
+    bool _isKept = false;
     std::optional<PathIndex> _nodesByPath;
 };
 

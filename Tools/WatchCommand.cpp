@@ -63,7 +63,7 @@ int WatchCommand::run()
         metricsTimer = platform.mainQueue.repeatEvery(metricsInterval, [this] { writeMetrics(); });
     _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, platform.clock);
     if (_options.channelPane)
-        _tree->show();
+        _tree->keep();
     const int mostErrorLines = _options.verbose ? linesWhenVerbose : linesOtherwise;
     try {
         if (showsPanes())

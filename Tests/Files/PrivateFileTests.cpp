@@ -77,6 +77,19 @@ TEST_F(PrivateFileTest, HoldsWhatWasWrittenAndIsItsOwnersAlone)
     EXPECT_THAT(names(), ElementsAre("file"));
 }
 
+TEST_F(PrivateFileTest, IsReadByAllWhereThatIsSaidWhateverTheProcessMasks)
+{
+    const mode_t before = umask(077);
+    auto file = PrivateFile::createForAll(path, error);
+    ASSERT_TRUE(file) << error;
+    file->write("content");
+    EXPECT_TRUE(file->commit(error)) << error;
+    umask(before);
+    EXPECT_EQ(read(path), "content");
+    EXPECT_EQ(modeOf(path), 0644U);
+    EXPECT_THAT(names(), ElementsAre("file"));
+}
+
 TEST_F(PrivateFileTest, IsNotThereBeforeItIsWhole)
 {
     auto file = PrivateFile::create(path, error);

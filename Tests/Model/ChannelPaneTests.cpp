@@ -219,6 +219,23 @@ TEST_F(ChannelPaneTest, BeginsToCountCodesAnewWithAnotherTechnology)
     EXPECT_EQ(counts.messages(), 1U);
 }
 
+TEST_F(ChannelPaneTest, IsShownAndLeftOutByOneKey)
+{
+    EXPECT_TRUE(pane.toggle("/Somewhere"));
+    EXPECT_TRUE(pane.isShown());
+    EXPECT_TRUE(pane.toggle("/Somewhere")); // it is shown, but not what one is at
+    EXPECT_FALSE(pane.toggle("/Channel/Service"));
+    EXPECT_FALSE(pane.isShown());
+}
+
+TEST_F(ChannelPaneTest, StaysWhereItIsKept)
+{
+    pane.keep();
+    EXPECT_TRUE(pane.toggle("/"));
+    EXPECT_FALSE(pane.toggle("/Channel"));
+    EXPECT_TRUE(pane.isShown());
+}
+
 TEST_F(ChannelPaneTest, HoldsItsOwnPathsOnly)
 {
     EXPECT_FALSE(pane.holds("/Channel"));

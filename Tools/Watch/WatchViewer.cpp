@@ -23,7 +23,6 @@ WatchViewer::WatchViewer(const Platform& platform, VentrikModel& model, ChannelP
     : _platform(platform),
       _model(model),
       _tree(tree),
-      _keepsChannel(tree.isShown()),
       _end(std::move(end)),
       _panes(tree),
       _screen(mostErrorLines, [this] { draw(); }),
@@ -68,8 +67,10 @@ void WatchViewer::readKeys()
 {
     bool quits = _screen.hasEnded();
     for (const KeyPress press : _screen.readKeys()) {
+        if (quits)
+            break; // what was typed behind it is for nobody
         const auto outcome = _panes.handle(press);
-        quits = quits || outcome == WatchPanes::Outcome::Quits;
+        quits = outcome == WatchPanes::Outcome::Quits;
         if (outcome == WatchPanes::Outcome::TogglesChannel)
             toggleChannel();
     }
@@ -81,14 +82,10 @@ void WatchViewer::readKeys()
 
 void WatchViewer::toggleChannel()
 {
-    const bool leaves = _tree.holds(_panes.pane().path);
-    if (leaves && !_keepsChannel)
-        _tree.hide();
-    else
-        _tree.show();
+    const bool leadsThere = _tree.toggle(_panes.pane().path);
     _panes.goToRoot();
     _panes.reload();
-    if (!leaves)
+    if (leadsThere)
         _panes.goToLastOfRoot();
 }
 

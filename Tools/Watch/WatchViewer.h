@@ -44,7 +44,6 @@ class WatchViewer
     Platform _platform;
     VentrikModel& _model;
     ChannelPane& _tree;
-    const bool _keepsChannel; // its row was there from the start
     int _seconds = 0;
     std::function<void()> _end;
     std::optional<Clock::TimePoint> _lastUpdate;

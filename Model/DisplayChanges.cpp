@@ -264,8 +264,8 @@ std::vector<bool> DisplayChanges::takeOverKeys(DisplayGroup& group,
             remove(entry); // the names of all change, or it is gone
         else
             present.emplace(entry.place->key, entry);
+    const auto former = std::exchange(group.entries, {});
     group.isSorted = isSorted;
-    group.entries.clear();
     std::vector<bool> areNew;
     for (const auto& [key, value] : dictionary) {
         if (key == sortedMarker)
@@ -276,7 +276,23 @@ std::vector<bool> DisplayChanges::takeOverKeys(DisplayGroup& group,
                                     ? DisplayGroup::Entry{&newPlace(group, key), nullptr}
                                     : known->second);
     }
+    noteOrder(former, group);
     return areNew;
+}
+
+// Those that stay come first, as they stood.
+void DisplayChanges::noteOrder(const std::vector<DisplayGroup::Entry>& former,
+                               const DisplayGroup& group)
+{
+    auto next = group.entries.begin();
+    for (const DisplayGroup::Entry& entry : former)
+        if (next != group.entries.end() && next->place == entry.place)
+            ++next;
+    const auto isFormer = [&](const DisplayGroup::Entry& entry) {
+        return std::ranges::find(former, entry.place, &DisplayGroup::Entry::place) != former.end();
+    };
+    if (!group.isSorted && std::any_of(next, group.entries.end(), isFormer))
+        _isReordered = true;
 }
 
 void DisplayChanges::compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew)
@@ -388,9 +404,9 @@ void DisplayChanges::add(DisplayChange::Kind kind, const DisplayPlace& place)
     _changes.push_back({kind, &place});
 }
 
-std::vector<const DisplayPlace*> DisplayChanges::values() const
+std::vector<const DisplayGroup::Entry*> DisplayChanges::entries() const
 {
-    std::vector<const DisplayPlace*> values;
+    std::vector<const DisplayGroup::Entry*> entries;
     std::vector<const DisplayGroup::Entry*> pending;
     const auto addEntries = [&](const DisplayGroup& group) {
         for (auto entry = group.entries.rbegin(); entry != group.entries.rend(); ++entry)
@@ -399,13 +415,20 @@ std::vector<const DisplayPlace*> DisplayChanges::values() const
     if (_root)
         addEntries(*_root);
     while (!pending.empty()) {
-        const DisplayGroup::Entry& entry = *pending.back();
+        entries.push_back(pending.back());
         pending.pop_back();
-        if (entry.group)
-            addEntries(*entry.group);
-        else
-            values.push_back(entry.place);
+        if (entries.back()->group)
+            addEntries(*entries.back()->group);
     }
+    return entries;
+}
+
+std::vector<const DisplayPlace*> DisplayChanges::values() const
+{
+    std::vector<const DisplayPlace*> values;
+    for (const DisplayGroup::Entry* entry : entries())
+        if (!entry->group)
+            values.push_back(entry->place);
     return values;
 }
 

@@ -11,6 +11,7 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace ventrik
@@ -83,7 +84,13 @@ class DisplayChanges
     /// What has changed in the state's display since the last time; all of it the first time.
     std::span<const DisplayChange> take(const PlistDictionary& state);
 
-    /// The places of all values, in the order of the display.
+    /// Whether a dictionary that does not show its keys in their order has got another order of them
+    /// than by what came at its end and what went, since it was last asked.
+    bool takeReordered() { return std::exchange(_isReordered, false); }
+    /// All places, in the order of the display, holders before what they hold. They live until the
+    /// next changes are taken.
+    std::vector<const DisplayGroup::Entry*> entries() const;
+    /// Those of all values.
     std::vector<const DisplayPlace*> values() const;
 
     DisplayPlaceDescription describe(const DisplayPlace& place, const PlistDictionary& state) const;
@@ -105,6 +112,7 @@ class DisplayChanges
     void repeatDoubles(const DisplayGroup& group, std::size_t firstChange);
     void repeat(const DisplayGroup::Entry& entry);
     std::vector<bool> takeOverKeys(DisplayGroup& group, const PlistDictionary& dictionary);
+    void noteOrder(const std::vector<DisplayGroup::Entry>& former, const DisplayGroup& group);
     void compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void compareContainer(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void follow(DisplayGroup& group, const PlistValue& container);
@@ -132,6 +140,7 @@ class DisplayChanges
     std::vector<std::size_t> _freePlaces;
     std::vector<std::size_t> _gonePlaces;
     std::uint64_t _lastSerial = 0;
+    bool _isReordered = false;
 
     mutable std::vector<std::string_view> _keys;
     std::vector<std::size_t> _entries; // room for those that changed

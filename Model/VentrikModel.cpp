@@ -41,13 +41,6 @@ ChannelFault faultOfRequest(const TelephonyError& error)
 
 constexpr std::size_t mostLayoutWarnings = 2;
 
-// More may have come since the value was shown: then its text tells the number.
-std::string_view doubtOfShown(const ValueOrigin& origin, const std::string& value)
-{
-    return origin.field->shown.textOf(origin.raw) == value ? doubtOf(*origin.field, origin.raw)
-                                                           : doubtOfText(*origin.field, value);
-}
-
 // So many lines and one that counts the rest.
 void shorten(std::vector<std::string>& lines, std::size_t most)
 {
@@ -384,7 +377,7 @@ std::string_view VentrikModel::doubtAt(const std::string& path) const
     if (node->date())
         return doubtOf(*node->date());
     const auto origin = _logGenerator->originOf(_state, _nodesByPath->keysOf(path));
-    return origin ? doubtOfShown(*origin, *node->value()) : std::string_view();
+    return origin ? doubtOfShown(*origin->field, origin->raw, *node->value()) : std::string_view();
 }
 
 std::vector<std::string> VentrikModel::layoutWarningsAt(const std::string& path) const

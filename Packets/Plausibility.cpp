@@ -92,6 +92,11 @@ std::string_view doubtOfText(const Field& field, std::string_view text)
     return number ? doubtOf(field.shown.quantity, *number) : std::string_view();
 }
 
+std::string_view doubtOfShown(const Field& field, std::int64_t raw, std::string_view text)
+{
+    return field.shown.textOf(raw) == text ? doubtOf(field, raw) : doubtOfText(field, text);
+}
+
 std::string_view doubtOf(PlistDate date)
 {
     return date.secondsSince1970 < startOf1980 ? "Date is before 1980" : std::string_view();

@@ -18,6 +18,8 @@ std::string_view doubtOf(Quantity quantity, double number);
 std::string_view doubtOf(const Field& field, std::int64_t raw);
 /// Of a number as the field shows it, for those who have no raw one; other texts are right.
 std::string_view doubtOfText(const Field& field, std::string_view text);
+/// Of what shows. More may have come since: then the text tells the number.
+std::string_view doubtOfShown(const Field& field, std::int64_t raw, std::string_view text);
 std::string_view doubtOf(PlistDate date);
 
 /// What stands behind a doubtful value where only characters can.

@@ -139,6 +139,35 @@ TEST_F(DisplayChangesTest, HaveWhatCameAndWent)
     EXPECT_THAT(take(), ElementsAre("/a/x gone", "/a/z=3"));
 }
 
+TEST_F(DisplayChangesTest, TellThatKeysHaveChangedTheirOrder)
+{
+    show(PlistDictionary{{"a", "1"}, {"b", "2"}});
+    take();
+    EXPECT_FALSE(changes.takeReordered());
+    show(PlistDictionary{{"b", "2"}, {"a", "1"}});
+    take();
+    EXPECT_TRUE(changes.takeReordered());
+    EXPECT_FALSE(changes.takeReordered());
+}
+
+TEST_F(DisplayChangesTest, TellThatAKeyHasComeBetweenOthers)
+{
+    show(PlistDictionary{{"a", "1"}, {"c", "3"}});
+    take();
+    show(PlistDictionary{{"a", "1"}, {"b", "2"}, {"c", "3"}});
+    take();
+    EXPECT_TRUE(changes.takeReordered());
+}
+
+TEST_F(DisplayChangesTest, KeepTheOrderWhereKeysComeAtTheEndAndOthersGo)
+{
+    show(PlistDictionary{{"a", "1"}, {"b", "2"}, {"c", "3"}});
+    take();
+    show(PlistDictionary{{"a", "1"}, {"c", "3"}, {"d", "4"}});
+    take();
+    EXPECT_FALSE(changes.takeReordered());
+}
+
 TEST_F(DisplayChangesTest, OfAListThatGetsShorterTellTheElementsThatGo)
 {
     PlistArray list{PlistDictionary{{"x", "1"}}, PlistDictionary{{"x", "2"}}, "3"};

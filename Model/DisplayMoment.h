@@ -1,0 +1,50 @@
+#pragma once
+
+#include "Model/ChangeStore.h"
+#include "Model/DisplayTree.h"
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace ventrik
+{
+
+/// The display as it stood at a moment. It holds what it tells, whatever becomes of the store.
+class DisplayMoment : public DisplayTree
+{
+  public:
+    /// A value as it stood then.
+    struct Value {
+        StoredValue shown;
+        Clock::TimePoint changed; ///< since when it shows that
+        Clock::TimePoint written; ///< when it was told last, to about a second
+        std::uint32_t logCode;    ///< effective, of the record that told it; 0 where none did
+        std::uint64_t change;     ///< the number of the change
+    };
+
+    DisplayMoment(const ChangeStore& store, std::uint64_t moment);
+    ~DisplayMoment() override;
+    DisplayMoment(DisplayMoment&&) noexcept;
+    DisplayMoment& operator=(DisplayMoment&&) noexcept;
+
+    std::uint64_t moment() const;
+    Clock::TimePoint time() const;
+    /// As on the command line; empty where it was not known.
+    const std::string& technology() const;
+
+    ModelNodePointer topLevelNodes() override;
+    ModelNodePointer nodeAtPath(const std::string& path) override;
+    std::string_view doubtAt(const std::string& path) const override;
+    /// Null where no value stands.
+    const Value* valueAt(const std::string& path) const;
+
+  private:
+    void build() const;
+
+    struct Content;
+    std::unique_ptr<Content> _content;
+};
+
+} // namespace ventrik

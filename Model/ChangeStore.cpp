@@ -40,6 +40,16 @@ std::size_t hashOf(const StoredValue& value)
     return hash >> knownValueShift;
 }
 
+// Texts that no field shows came as they are: numbers with their units, too.
+StoredValue valueOf(const std::optional<ShownCell>& cell, std::string_view text)
+{
+    if (cell)
+        return {text, cell->number(), cell->field->shown.unit, cell->field, cell->raw};
+    if (const auto measurement = measurementIn(text))
+        return {text, measurement->number, measurement->unit};
+    return {text, plainNumber(text)};
+}
+
 PlaceTable::HolderKind kindOf(const DisplayGroup& holder)
 {
     if (holder.isList)
@@ -66,8 +76,8 @@ StoredValue ChangeStore::Chunk::valueAt(std::uint32_t value) const
 {
     const Value& found = values[value];
     return {std::string_view(texts).substr(found.textStart, found.textSize),
-            found.hasNumber ? std::optional(found.number) : std::nullopt,
-            found.field ? found.field->shown.unit : std::string_view(), found.field, found.raw};
+            found.hasNumber ? std::optional(found.number) : std::nullopt, found.unit, found.field,
+            found.raw};
 }
 
 ChangeStore::ChangeStore(RecordsMode records, Limits limits)
@@ -111,14 +121,13 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     _lastTime = std::max(_lastTime, time);
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);
-    if (!_chunks.empty())
-        hear(logCode);
     if (changes.empty())
-        return;
+        return hear(logCode);
     if (_chunks.empty())
         beginChunk();
     beginMessage(message, logCode);
     takeChanges(changes, state);
+    hear(logCode);
     endChunkIfFull(state);
     keepWithin();
 }
@@ -134,11 +143,15 @@ std::uint32_t ChangeStore::codeOf(ByteView message) const
     return kind ? kind->logCode : 0;
 }
 
+// What no record tells is not told again by another message; but that of the cell monitor, whose
+// messages tell all there is.
 void ChangeStore::hear(std::uint32_t logCode)
 {
-    if (logCode == 0)
+    if (logCode == 0 && !_wanted.wantsAll())
         return;
     _lastHeard[logCode] = _lastTime;
+    if (_chunks.empty())
+        return;
     const auto [noted, isFirst] = _lastNoted.emplace(logCode, _lastTime);
     if (!isFirst && _lastTime - noted->second < hearingInterval)
         return;
@@ -150,7 +163,6 @@ void ChangeStore::hear(std::uint32_t logCode)
 void ChangeStore::beginMessage(ByteView message, std::uint32_t logCode)
 {
     Chunk& chunk = *_chunks.back();
-    _lastHeard[logCode] = _lastTime;
     const bool isKept = message.size() <= largestPacketKept;
     chunk.messages.push_back({_lastTime, logCode, static_cast<std::uint32_t>(chunk.changes.size()),
                               chunk.packets.size(),
@@ -204,11 +216,7 @@ void ChangeStore::take(const DisplayChange& change, const PlistDictionary& state
 void ChangeStore::show(const DisplayPlace& place, const PlistDictionary& state)
 {
     const PlaceId id = idOf(place, state);
-    const auto cell = _changes->cellAt(place, state);
-    const StoredValue value =
-        cell ? StoredValue{place.text, cell->number(), cell->field->shown.unit, cell->field,
-                           cell->raw}
-             : StoredValue{.text = place.text, .number = plainNumber(place.text)};
+    const StoredValue value = valueOf(_changes->cellAt(place, state), place.text);
     const std::uint32_t before = standing(id).value;
     if (before < group && isSame(_chunks.back()->valueAt(before), value))
         return;
@@ -300,8 +308,8 @@ std::uint32_t ChangeStore::intern(const StoredValue& value)
         return known.value;
     known = {chunk.first, static_cast<std::uint32_t>(chunk.values.size())};
     chunk.values.push_back({chunk.texts.size(), static_cast<std::uint32_t>(value.text.size()),
-                            value.number.has_value(), value.number.value_or(0), value.field,
-                            value.raw});
+                            value.number.has_value(), value.number.value_or(0), value.unit,
+                            value.field, value.raw});
     chunk.texts += value.text;
     return known.value;
 }

@@ -122,6 +122,7 @@ class ChangeStore : public MessageObserver
         std::uint32_t textSize;
         bool hasNumber;
         double number;
+        std::string_view unit; // a constant
         const Field* field;
         std::int64_t raw;
     };

@@ -94,6 +94,19 @@ std::optional<double> plainNumber(std::string_view text)
     return number;
 }
 
+std::optional<Measurement> measurementIn(std::string_view text)
+{
+    for (const std::string_view unit : {std::string_view("dBm"), std::string_view("dB")}) {
+        const std::size_t size = unit.size() + 1;
+        if (text.size() <= size || !text.ends_with(unit) || text[text.size() - size] != ' ')
+            continue;
+        const std::string_view digits = text.substr(0, text.size() - size);
+        if (const auto number = plainNumber(digits.starts_with('+') ? digits.substr(1) : digits))
+            return Measurement{*number, unit};
+    }
+    return std::nullopt;
+}
+
 std::span<const DisplayChange> DisplayChanges::take(const PlistDictionary& state)
 {
     prepareForChanges();

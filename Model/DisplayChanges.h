@@ -35,6 +35,13 @@ struct DisplayPlace {
 /// plain one.
 std::optional<double> plainNumber(std::string_view text);
 
+/// The same of a text that is a number and, behind a blank, a unit of levels.
+struct Measurement {
+    double number;
+    std::string_view unit; ///< "dBm" or "dB"
+};
+std::optional<Measurement> measurementIn(std::string_view text);
+
 /// What is to be said of a place.
 struct DisplayPlaceDescription {
     std::string path;    ///< as the panes have it
@@ -84,8 +91,8 @@ class DisplayChanges
     /// What has changed in the state's display since the last time; all of it the first time.
     std::span<const DisplayChange> take(const PlistDictionary& state);
 
-    /// Whether a dictionary that does not show its keys in their order has got another order of them
-    /// than by what came at its end and what went, since it was last asked.
+    /// Whether a dictionary that does not show its keys in their order has got another order of
+    /// them than by what came at its end and what went, since it was last asked.
     bool takeReordered() { return std::exchange(_isReordered, false); }
     /// All places, in the order of the display, holders before what they hold. They live until the
     /// next changes are taken.

@@ -103,9 +103,8 @@ void DisplayMoment::Content::takeValues(const ChangeStore::Chunk& chunk)
         StoredValue value = chunk.valueAt(standing.value);
         value.text = texts.emplace_back(value.text);
         const auto again = heard.find(standing.logCode);
-        const Clock::TimePoint written = again == heard.end() || standing.logCode == 0
-                                             ? standing.time
-                                             : std::max(standing.time, again->second);
+        const Clock::TimePoint written =
+            again == heard.end() ? standing.time : std::max(standing.time, again->second);
         values.emplace(id, Value{value, standing.time, written, standing.logCode, standing.change});
     }
 }

@@ -1,0 +1,185 @@
+#include "Model/PinnedSeries.h"
+
+#include <algorithm>
+#include <array>
+#include <utility>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr std::string_view anyElement = "/*/";
+
+struct DefaultPin {
+    std::string_view technology;
+    std::string_view path;
+    std::string_view name;
+};
+
+constexpr std::array defaults = {
+    DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRP", "RSRP"},
+    DefaultPin{"lte", "/Neighbors/Neighbor Cells List/*/Measured RSRP", "Best neighbor RSRP"},
+    DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRQ", "RSRQ"},
+    DefaultPin{"lte", "/Serving Cell Measurements/Measured RSSI", "RSSI"},
+    DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI"},
+    DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor RSSI"},
+    DefaultPin{"gsm", "/Neighbors/UMTS Set/*/RSCP", "Best RSCP"},
+    DefaultPin{"gsm", "/Neighbors/UMTS Set/*/Energy Per Chip", "Best Ec/Io"},
+    DefaultPin{"utran", "/Neighbor Cell List/*/Filter RSCP", "Best RSCP"},
+    DefaultPin{"utran", "/GSM Neighbor Cell List/*/RSSI", "Best GSM RSSI"},
+    DefaultPin{"c2k", "/1x/Radio/Rx 0 AGC", "1x Rx AGC"},
+    DefaultPin{"c2k", "/EV-DO/Radio/Rx 0 AGC", "EV-DO Rx AGC"},
+    DefaultPin{"c2k", "/1x/Radio/Tx AGC", "1x Tx AGC"},
+    DefaultPin{"ifx", "/Serving Cell/RxLev", "RxLev"},
+    DefaultPin{"ifx", "/GSM Neighbor Cells/*/RxLev", "Best neighbor RxLev"},
+    DefaultPin{"ifx", "/Serving Cell/RSCP", "RSCP"},
+    DefaultPin{"ifx", "/UMTS Neighbor Cells/*/RSCP", "Best neighbor RSCP"},
+};
+
+} // namespace
+
+Pin Pin::of(std::string path)
+{
+    const std::string last = path.substr(path.rfind('/') + 1);
+    const bool isOfList = path.find(anyElement) != path.npos;
+    return {std::move(path), isOfList ? "Best " + last : last};
+}
+
+bool Pin::matches(std::string_view valuePath) const
+{
+    const auto any = path.find(anyElement);
+    if (any == path.npos)
+        return valuePath == path;
+    const std::string_view before = std::string_view(path).substr(0, any + 1);
+    const std::string_view behind = std::string_view(path).substr(any + anyElement.size() - 1);
+    if (valuePath.size() <= before.size() + behind.size() || !valuePath.starts_with(before) ||
+        !valuePath.ends_with(behind))
+        return false;
+    const std::string_view part =
+        valuePath.substr(before.size(), valuePath.size() - before.size() - behind.size());
+    return part.find('/') == part.npos;
+}
+
+std::vector<Pin> defaultPins(std::string_view technology)
+{
+    std::vector<Pin> pins;
+    for (const DefaultPin& pin : defaults)
+        if (pin.technology == technology)
+            pins.push_back({std::string(pin.path), std::string(pin.name)});
+    return pins;
+}
+
+void PinnedSeries::setPins(std::vector<Pin> pins)
+{
+    if (pins.size() > mostPins)
+        pins.resize(mostPins);
+    _series.clear();
+    for (Pin& pin : pins)
+        _series.push_back({std::move(pin), {}, {}});
+    beginAnew();
+    update();
+}
+
+void PinnedSeries::beginAnew()
+{
+    for (Series& series : _series)
+        series.points.clear();
+    _followers.assign(_series.size(), {});
+    _places.clear();
+    _next = _store.firstMoment();
+    _generation = _store.generation();
+}
+
+void PinnedSeries::update()
+{
+    if (_generation != _store.generation())
+        beginAnew();
+    _next = std::max(_next, _store.firstMoment());
+    _store.visit(_next, *this);
+    _next = _store.present();
+    for (std::size_t pin = 0; pin < _series.size(); ++pin)
+        if (const auto last = _store.lastHeard(_followers[pin].logCode))
+            heard(*last, _followers[pin].logCode);
+    dropOld();
+}
+
+std::uint32_t PinnedSeries::pinsAt(PlaceId place)
+{
+    if (place >= _places.size())
+        _places.resize(_store.places().size());
+    PlacePins& known = _places[place];
+    if (std::exchange(known.isKnown, true))
+        return known.pins;
+    const std::string path = _store.places().pathOf(place);
+    for (std::size_t pin = 0; pin < _series.size(); ++pin)
+        if (_series[pin].pin.matches(path))
+            known.pins |= std::uint32_t{1} << pin;
+    return known.pins;
+}
+
+void PinnedSeries::changed(const StoredChange& change)
+{
+    // With a group goes what it holds.
+    if (change.kind == DisplayChange::Kind::Gone)
+        for (const PlaceId below : _store.places()[change.place].below) {
+            StoredChange gone = change;
+            gone.place = below;
+            changed(gone);
+        }
+    const std::uint32_t pins = pinsAt(change.place);
+    for (std::size_t pin = 0; pins >> pin != 0; ++pin)
+        if ((pins >> pin & 1U) != 0)
+            take(pin, change);
+}
+
+void PinnedSeries::take(std::size_t pin, const StoredChange& change)
+{
+    Follower& follower = _followers[pin];
+    Series& series = _series[pin];
+    if (change.value.number)
+        follower.numbers[change.place] = *change.value.number;
+    else
+        follower.numbers.erase(change.place);
+    follower.logCode = change.logCode;
+    SeriesPoint* last = series.points.empty() ? nullptr : &series.points.back();
+    if (follower.numbers.empty()) {
+        if (last && !last->isEnd) {
+            last->isEnd = true;
+            last->until = change.time;
+        }
+        return;
+    }
+    if (!change.value.unit.empty())
+        series.unit = change.value.unit;
+    const double value = std::ranges::max_element(follower.numbers, {}, [](const auto& number) {
+                             return number.second;
+                         })->second;
+    // What one message tells, it tells at once. What stays is heard again.
+    if (last && last->from == change.time)
+        *last = {change.time, change.time, value};
+    else if (!last || last->isEnd || last->value != value)
+        series.points.push_back({change.time, change.time, value});
+}
+
+void PinnedSeries::heard(Clock::TimePoint time, std::uint32_t logCode)
+{
+    for (std::size_t pin = 0; pin < _series.size(); ++pin) {
+        auto& points = _series[pin].points;
+        if (!points.empty() && !points.back().isEnd && _followers[pin].logCode == logCode)
+            points.back().until = std::max(points.back().until, time);
+    }
+}
+
+void PinnedSeries::dropOld()
+{
+    const Clock::TimePoint first = _store.firstTime();
+    for (Series& series : _series) {
+        const auto kept = std::ranges::find_if(
+            series.points, [&](const SeriesPoint& point) { return point.until >= first; });
+        series.points.erase(series.points.begin(), kept);
+    }
+}
+
+} // namespace ventrik

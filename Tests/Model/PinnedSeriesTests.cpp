@@ -1,0 +1,179 @@
+#include "LogGenerator/Core/StateKeys.h"
+#include "Model/PinnedSeries.h"
+#include "Tests/Support/FixedClock.h"
+#include "Tests/Support/IdleGenerator.h"
+
+#include <chrono>
+
+#include <fmt/format.h>
+#include <gmock/gmock.h>
+
+namespace ventrik
+{
+
+namespace
+{
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+const Clock::TimePoint start = FixedClock().now();
+
+/// Displays made by hand, one a second, and the series of what is pinned of them.
+class PinnedSeriesTest : public testing::Test
+{
+  protected:
+    PinnedSeriesTest() { store.useGenerator(&generator, "ifx"); }
+
+    void show(const PlistValue& display)
+    {
+        state.set(StateKey::display, display);
+        store.messageTaken(time, {}, state);
+        time += 1s;
+    }
+    /// Points as "from-until: value", in seconds; with a "." where the line ends.
+    std::vector<std::string> points(std::size_t pin = 0)
+    {
+        series.update();
+        std::vector<std::string> lines;
+        for (const SeriesPoint& point : series.series()[pin].points)
+            lines.push_back(fmt::format("{}-{}: {}{}", (point.from - start) / 1s,
+                                        (point.until - start) / 1s, point.value,
+                                        point.isEnd ? "." : ""));
+        return lines;
+    }
+
+    IdleGenerator generator;
+    PlistDictionary state;
+    Clock::TimePoint time = start;
+    ChangeStore store{RecordsMode::Newer};
+    PinnedSeries series{store};
+};
+
+PlistDictionary level(std::string_view text)
+{
+    return PlistDictionary{{"Level", text}};
+}
+
+} // namespace
+
+TEST_F(PinnedSeriesTest, HasTheNumbersOfAValueAndSinceWhenTheyStand)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("-70 dBm")}});
+    show(PlistDictionary{{"Cell", level("-75 dBm")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: -70", "1-1: -75"));
+    EXPECT_EQ(series.series()[0].unit, "dBm");
+    EXPECT_EQ(series.series()[0].pin.name, "Level");
+}
+
+TEST_F(PinnedSeriesTest, GoesOnWithWhatIsToldAgain)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    for (int i = 0; i < 4; ++i)
+        show(PlistDictionary{{"Cell", level("-70 dBm")}});
+    EXPECT_THAT(points(), ElementsAre("0-3: -70"));
+}
+
+TEST_F(PinnedSeriesTest, StandsOnlyUntilItWasToldLast)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("1")}});
+    time += 20s;
+    show(PlistDictionary{{"Cell", level("2")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: 1", "21-21: 2"));
+}
+
+TEST_F(PinnedSeriesTest, TakesWhatIsNewEachTime)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("1")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: 1"));
+    show(PlistDictionary{{"Cell", level("2")}});
+    show(PlistDictionary{{"Cell", level("2")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: 1", "1-2: 2"));
+}
+
+TEST_F(PinnedSeriesTest, EndsWhereTheValueIsNoNumberAnyMore)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("1")}});
+    show(PlistDictionary{{"Cell", level("N/A")}});
+    show(PlistDictionary{{"Cell", level("2")}});
+    EXPECT_THAT(points(), ElementsAre("0-1: 1.", "2-2: 2"));
+}
+
+TEST_F(PinnedSeriesTest, EndsWhereTheGroupGoes)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("1")}});
+    show(PlistDictionary{});
+    EXPECT_THAT(points(), ElementsAre("0-1: 1."));
+}
+
+TEST_F(PinnedSeriesTest, OfAListIsTheHighestNumber)
+{
+    series.setPins({Pin::of("/Cells/*/Level")});
+    show(PlistDictionary{{"Cells", PlistArray{level("-90"), level("-80"), level("none")}}});
+    show(PlistDictionary{{"Cells", PlistArray{level("-90")}}});
+    show(PlistDictionary{{"Cells", PlistArray()}});
+    EXPECT_THAT(points(), ElementsAre("0-0: -80", "1-2: -90."));
+    EXPECT_EQ(series.series()[0].pin.name, "Best Level");
+}
+
+TEST_F(PinnedSeriesTest, OfALaterPinBeginsWithWhatTheStoreHas)
+{
+    show(PlistDictionary{{"Cell", level("1")}});
+    show(PlistDictionary{{"Cell", level("2")}});
+    series.setPins({Pin::of("/Other"), Pin::of("/Cell/Level")});
+    EXPECT_THAT(points(0), IsEmpty());
+    EXPECT_THAT(points(1), ElementsAre("0-0: 1", "1-1: 2"));
+}
+
+TEST_F(PinnedSeriesTest, TellsWhatOneMessageToldOnce)
+{
+    series.setPins({Pin::of("/Cells/*/Level")});
+    show(PlistDictionary{{"Cells", PlistArray{level("1"), level("2"), level("3")}}});
+    EXPECT_THAT(points(), ElementsAre("0-0: 3"));
+}
+
+TEST_F(PinnedSeriesTest, LeavesOutPinsBeyondItsLimit)
+{
+    std::vector<Pin> pins;
+    for (int i = 0; i < 40; ++i)
+        pins.push_back(Pin::of("/" + std::to_string(i)));
+    series.setPins(pins);
+    EXPECT_EQ(series.series().size(), PinnedSeries::mostPins);
+}
+
+TEST(PinTest, MatchesElementsOfItsListOnly)
+{
+    const Pin pin = Pin::of("/Cells/*/Level");
+    EXPECT_TRUE(pin.matches("/Cells/12/Level"));
+    EXPECT_FALSE(pin.matches("/Cells/12/Other"));
+    EXPECT_FALSE(pin.matches("/Cells/1/2/Level"));
+    EXPECT_FALSE(pin.matches("/Cells/Level"));
+    EXPECT_FALSE(pin.matches("/Other/1/Level"));
+}
+
+TEST(PinTest, IsOfEachTechnologyFromTheStart)
+{
+    for (const char* technology : {"lte", "gsm", "utran", "c2k", "ifx"})
+        EXPECT_FALSE(defaultPins(technology).empty()) << technology;
+    EXPECT_TRUE(defaultPins("other").empty());
+}
+
+TEST(MeasurementTest, IsANumberWithAUnitOfLevels)
+{
+    EXPECT_EQ(measurementIn("-73 dBm")->number, -73);
+    EXPECT_EQ(measurementIn("-73 dBm")->unit, "dBm");
+    EXPECT_EQ(measurementIn("+1.50 dB")->number, 1.5);
+    EXPECT_EQ(measurementIn("+1.50 dB")->unit, "dB");
+    EXPECT_FALSE(measurementIn("dB"));
+    EXPECT_FALSE(measurementIn(" dB"));
+    EXPECT_FALSE(measurementIn("5 sec"));
+    EXPECT_FALSE(measurementIn("5dB"));
+}
+
+} // namespace ventrik

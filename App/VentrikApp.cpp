@@ -5,8 +5,6 @@
 
 #include <QGuiApplication>
 #include <QScreen>
-#include <QShortcut>
-#include <QVBoxLayout>
 
 #include <algorithm>
 #include <filesystem>
@@ -39,7 +37,10 @@ bool exists(const std::string& path)
 } // namespace
 
 VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
-    : _platform(platform), _options(std::move(options)), _channelCounts(_options.records)
+    : _platform(platform),
+      _options(std::move(options)),
+      _channelCounts(_options.records),
+      _store(_options.records)
 {
 }
 
@@ -58,8 +59,10 @@ void VentrikApp::applicationDidFinishLaunching()
         _platform, [this] { updateViewControllerFromModel(); },
         LogGenerator::generatorsReading(_options.records));
     _model->addObserver(_channelCounts);
+    _model->addObserver(_store);
     _model->setChannelCallback([this] { channelChanged(); });
     _tree = std::make_unique<ChannelPane>(*_model, _channelCounts, _platform.clock);
+    _timeLine.setCallback([this] { shownMomentChanged(); });
     setUpdateMessage(connectingStatus);
     createDateFormatter();
     createNavigationStack();
@@ -76,7 +79,9 @@ void VentrikApp::applicationDidFinishLaunching()
 
 void VentrikApp::createWindow()
 {
-    setWindow(std::make_unique<QWidget>());
+    auto window = std::make_unique<ViewerWindow>();
+    _viewerWindow = window.get();
+    setWindow(std::move(window));
     _window->setWindowTitle(QStringLiteral("Ventrik"));
     // The texts and the names on the air are written that way, whatever the desktop's language is.
     _window->setLayoutDirection(Qt::LeftToRight);
@@ -98,6 +103,8 @@ void VentrikApp::createDateFormatter()
 {
     _dateFormatter = std::make_unique<DateFormatter>(_platform.clock);
     _dateFormatter->setDateFormat(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
+    _pauseFormatter = std::make_unique<DateFormatter>(_platform.clock);
+    _pauseFormatter->setDateFormat(QStringLiteral("'Paused at' HH:mm:ss"));
 }
 
 void VentrikApp::createNavigationStack()
@@ -111,14 +118,17 @@ void VentrikApp::createNavigationStack()
 
 void VentrikApp::showWindow()
 {
-    auto* layout = new QVBoxLayout(_window.get());
-    layout->setContentsMargins(0, 0, 0, 0);
-    // What needs more room than there is gives way, not the window.
-    layout->setSizeConstraint(QLayout::SetNoConstraint);
-    layout->addWidget(_navController);
+    _viewerWindow->addPanes(_navController);
+    _viewerWindow->setSpaceCallback([this] {
+        if (!_saveViewController)
+            _timeLine.togglePause();
+    });
     auto* channelKey = new QShortcut(QKeySequence(Qt::Key_F8), _window.get());
     QObject::connect(channelKey, &QShortcut::activated, _window.get(),
                      [this] { toggleChannelPane(); });
+    _liveKey = new QShortcut(QKeySequence(Qt::Key_Home), _window.get());
+    _liveKey->setEnabled(false);
+    QObject::connect(_liveKey, &QShortcut::activated, _window.get(), [this] { goLive(); });
     _window->show();
     _window->activateWindow();
 }
@@ -139,7 +149,10 @@ void VentrikApp::applicationWillTerminate()
     _channelTimer.reset();
     _savedMessage.reset();
     setUpdateMessage(std::nullopt);
+    _timeLine.setCallback({});
+    _timeLine.goLive();
     _dateFormatter.reset();
+    _pauseFormatter.reset();
     setSaveViewController(nullptr);
     if (_window)
         _window->hide();
@@ -187,10 +200,17 @@ void VentrikApp::snapshotSaved(const std::string& fileName)
 
 void VentrikApp::updateStatusForViewController(Screen& screen)
 {
-    if (_model->isConnected())
+    if (showsPast())
+        screen.setStatus(pausedStatus(), false);
+    else if (_model->isConnected())
         screen.setStatus(_updateMessage.value_or(std::string()), false);
     else
         screen.setStatus(connectingStatus, true);
+}
+
+std::string VentrikApp::pausedStatus() const
+{
+    return _pauseFormatter->stringFromDate(*_timeLine.pausedAt()) + " · Live";
 }
 
 // From the bottom up to the first screen above the root that has nothing left to show.
@@ -209,8 +229,10 @@ void VentrikApp::updateViewControllerFromModel()
     if (!_navController)
         return;
     _hasRefreshed = true;
-    _tree->takeDisplay();
-    reloadScreens();
+    _tree->takeDisplay(); // which records it in the history, whatever is shown
+    _timeLine.update();
+    if (!showsPast())
+        reloadScreens();
     if (_model->isConnected()) {
         _lastUpdate = _platform.clock.now();
         setUpdateMessage(_dateFormatter->stringFromDate(*_lastUpdate));
@@ -219,11 +241,22 @@ void VentrikApp::updateViewControllerFromModel()
     updateWindowTitle();
 }
 
+void VentrikApp::shownMomentChanged()
+{
+    if (!_navController)
+        return;
+    _liveKey->setEnabled(showsPast());
+    reloadScreens();
+    updateStatusForViewController(_navController->topScreen());
+}
+
 // Until the first refresh the root pane keeps its first status.
 void VentrikApp::channelChanged()
 {
     if (!_navController)
         return;
+    _store.channelChanged(_platform.clock.now(), _model->isConnected(),
+                          channelFaultText(_model->channelFault()));
     if (_hasRefreshed)
         updateStatusForViewController(_navController->topScreen());
     else
@@ -241,6 +274,7 @@ void VentrikApp::toggleChannelPane()
 {
     if (!_navController || _saveViewController)
         return;
+    _timeLine.goLive();
     const bool leadsThere = _tree->toggle(topPath());
     _navController->popTo(*_navController->screens().front(), false);
     reloadScreens();
@@ -262,30 +296,35 @@ std::string VentrikApp::topPath() const
 // Also while nothing comes; then above all.
 void VentrikApp::updateChannelPane()
 {
-    if (!_navController || !_tree->holds(topPath()))
+    if (!_navController || showsPast() || !_tree->holds(topPath()))
         return;
     _tree->update();
     reloadScreens();
 }
 
+DisplayTree* VentrikApp::shownTree() const
+{
+    return showsPast() ? static_cast<DisplayTree*>(_timeLine.past()) : _tree.get();
+}
+
 ModelNodePointer VentrikApp::topLevelNodes()
 {
-    return _tree ? _tree->topLevelNodes() : nullptr;
+    return shownTree() ? shownTree()->topLevelNodes() : nullptr;
 }
 
 ModelNodePointer VentrikApp::nodeAtPath(const std::string& path)
 {
-    return _tree ? _tree->nodeAtPath(path) : nullptr;
+    return shownTree() ? shownTree()->nodeAtPath(path) : nullptr;
 }
 
 std::string_view VentrikApp::doubtAt(const std::string& path) const
 {
-    return _tree ? _tree->doubtAt(path) : std::string_view();
+    return shownTree() ? shownTree()->doubtAt(path) : std::string_view();
 }
 
 std::vector<std::string> VentrikApp::layoutWarningsAt(const std::string& path) const
 {
-    return _tree ? _tree->layoutWarningsAt(path) : std::vector<std::string>();
+    return shownTree() ? shownTree()->layoutWarningsAt(path) : std::vector<std::string>();
 }
 
 StatusNote VentrikApp::statusNote() const
@@ -298,6 +337,8 @@ StatusNote VentrikApp::statusNote() const
 
 std::string VentrikApp::reasonForNoData() const
 {
+    if (showsPast())
+        return "Nothing was here then";
     return _model ? ventrik::reasonForNoData(ChannelState::of(*_model)) : std::string();
 }
 

@@ -1,13 +1,16 @@
 #pragma once
 
 #include "App/DateFormatter.h"
+#include "App/TimeLine.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "App/VentrikPaneController.h"
 #include "App/VentrikSaveViewController.h"
+#include "App/ViewerWindow.h"
 #include "Model/ChannelPane.h"
 #include "Platform/Platform.h"
 
 #include <QPointer>
+#include <QShortcut>
 #include <QSize>
 #include <QWidget>
 
@@ -51,6 +54,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
 
     /// Opens the channel's pane; where that shows, goes back to the root.
     void toggleChannelPane();
+    /// Shows the present, or what stood at some moment; messages are taken all the while.
+    TimeLine& timeLine() { return _timeLine; }
 
     void showSaveView() override;
     void closeSaveView() override;
@@ -87,7 +92,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::string_view doubtAt(const std::string& path) const override;
     std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
     bool allowSaveButton() const override { return _allowSaveButton; }
-    bool tintsChanges() const override { return _options.tintsChanges; }
+    bool tintsChanges() const override { return _options.tintsChanges && !showsPast(); }
+    bool showsPast() const override { return _timeLine.isPaused(); }
+    void goLive() override { _timeLine.goLive(); }
     StatusNote statusNote() const override;
     std::string reasonForNoData() const override;
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
@@ -104,14 +111,22 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void updateChannelPane();
     void updateWindowTitle();
     void reloadScreens();
+    void shownMomentChanged();
+    std::string pausedStatus() const;
+    DisplayTree* shownTree() const;
 
     Platform _platform;
     VentrikAppOptions _options;
 
     std::unique_ptr<QWidget> _window;
+    QPointer<ViewerWindow> _viewerWindow; // while the window is one of ours
     QPointer<NavigationStack> _navController;
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
     ChannelCounts _channelCounts;
+    ChangeStore _store;
+    TimeLine _timeLine{_store};
+    std::unique_ptr<DateFormatter> _pauseFormatter;
+    QPointer<QShortcut> _liveKey; // Home, while that leads anywhere
     std::shared_ptr<VentrikModel> _model;
     std::unique_ptr<ChannelPane> _tree; // the model's, with a row for the channel
     bool _allowSaveButton = false;

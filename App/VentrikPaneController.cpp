@@ -41,12 +41,14 @@ void showNote(const StatusNote& note, StatusLabel& label)
     label.setNote(oneLine(QString::fromStdString(note.text)), note.kind);
 }
 
-std::unique_ptr<QWidget> makeStatusLabel(const std::string& status, const StatusNote& note)
+std::unique_ptr<QWidget> makeStatusLabel(const std::string& status, VentrikPaneHost& host)
 {
     auto label = std::make_unique<StatusLabel>();
     label->setFont(systemFont(statusPoints, FontWeight::Regular));
     label->setText(QString::fromStdString(status));
-    showNote(note, *label);
+    showNote(host.statusNote(), *label);
+    if (host.showsPast())
+        label->setAction([&host] { host.goLive(); });
     label->resize(label->sizeHint());
     return label;
 }
@@ -126,7 +128,7 @@ void VentrikPaneController::createToolbarItems()
 {
     std::vector<ToolBarItem> items;
     items.push_back(ToolBarItem::widget(makeIndicator(_isLoading)));
-    items.push_back(ToolBarItem::widget(makeStatusLabel(_status, _host.statusNote())));
+    items.push_back(ToolBarItem::widget(makeStatusLabel(_status, _host)));
     items.push_back(ToolBarItem::flexibleSpace());
     if (_host.allowSaveButton())
         items.push_back(ToolBarItem::widget(makeSaveButton(_host)));
@@ -159,9 +161,9 @@ bool VentrikPaneController::reload()
 {
     ModelNodePointer node = isRoot() ? _host.topLevelNodes() : _host.nodeAtPath(_keyPath);
     const bool isThere = isRoot() || node;
-    if (isThere)
+    if (isThere || _host.showsPast())
         reloadWithNode(std::move(node));
-    return isThere;
+    return isThere || _host.showsPast();
 }
 
 void VentrikPaneController::reloadWithNode(ModelNodePointer node)
@@ -176,7 +178,9 @@ void VentrikPaneController::reloadWithNode(ModelNodePointer node)
 
 void VentrikPaneController::updateTitle()
 {
-    setTitle(_nodes ? QString::fromStdString(_nodes->displayName()) : QStringLiteral("Ventrik"));
+    if (_nodes || isRoot() || title().isEmpty())
+        setTitle(_nodes ? QString::fromStdString(_nodes->displayName())
+                        : QStringLiteral("Ventrik"));
 }
 
 void VentrikPaneController::updateLayoutWarnings()

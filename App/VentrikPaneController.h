@@ -21,6 +21,11 @@ class VentrikPaneHost : public DisplayTree
     virtual bool tintsChanges() const = 0;
     /// What is said beside the status.
     virtual StatusNote statusNote() const { return {}; }
+    /// Whether the panes show a moment of the past. Their places stay then, also where nothing
+    /// stood.
+    virtual bool showsPast() const { return false; }
+    /// Back to the present.
+    virtual void goLive() {}
     /// Why there is nothing to show, where a pane has no node that could have rows.
     virtual std::string reasonForNoData() const { return {}; }
 };

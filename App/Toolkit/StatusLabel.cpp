@@ -3,6 +3,7 @@
 #include "App/Toolkit/Fonts.h"
 
 #include <QEvent>
+#include <QMouseEvent>
 #include <QPainter>
 
 #include <algorithm>
@@ -28,6 +29,21 @@ void StatusLabel::setNote(const QString& note, NoteKind kind)
     _kind = kind;
     setAccessibleDescription(note);
     layOutAgain();
+}
+
+void StatusLabel::setAction(std::function<void()> action)
+{
+    _action = std::move(action);
+    setCursor(_action ? Qt::PointingHandCursor : Qt::ArrowCursor);
+}
+
+// What is done may replace the label.
+void StatusLabel::mouseReleaseEvent(QMouseEvent* event)
+{
+    if (!_action || event->button() != Qt::LeftButton || !rect().contains(event->pos()))
+        return ElidingLabel::mouseReleaseEvent(event);
+    const auto action = _action;
+    action();
 }
 
 void StatusLabel::layOutAgain()

@@ -2,6 +2,8 @@
 
 #include "App/Toolkit/ElidingLabel.h"
 
+#include <functional>
+
 namespace ventrik
 {
 
@@ -21,6 +23,8 @@ class StatusLabel : public ElidingLabel
     using ElidingLabel::ElidingLabel;
 
     void setNote(const QString& note, NoteKind kind);
+    /// A click on the label does that.
+    void setAction(std::function<void()> action);
     const QString& note() const { return _note; }
     bool showsNoteBelow() const;
     bool showsNoteInstead() const;
@@ -33,12 +37,14 @@ class StatusLabel : public ElidingLabel
     bool event(QEvent* event) override;
     bool eventFilter(QObject* receiver, QEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
+    void mouseReleaseEvent(QMouseEvent* event) override;
 
   private:
     void layOutAgain();
 
     QString _note;
     NoteKind _kind = NoteKind::Lasting;
+    std::function<void()> _action;
 };
 
 } // namespace ventrik

@@ -24,9 +24,8 @@ class LinuxPreferences : public Preferences
     ~LinuxPreferences() override;
 
     void set(std::string_view domain, std::string_view key, bool value) override;
-    void setText(std::string_view domain, std::string_view key, std::string_view value);
-    /// None where there is no such preference.
-    std::optional<std::string> text(std::string_view domain, std::string_view key);
+    void setText(std::string_view domain, std::string_view key, std::string_view value) override;
+    std::optional<std::string> text(std::string_view domain, std::string_view key) override;
     /// Leaves alone what has the file's name and is none.
     bool synchronize(std::string_view domain) override;
     /// Returns when the bus has the notice, after less than a second in any case; does nothing

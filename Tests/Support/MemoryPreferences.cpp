@@ -11,6 +11,18 @@ void MemoryPreferences::set(std::string_view domain, std::string_view key, bool 
     _values[{std::string(domain), std::string(key)}] = value;
 }
 
+void MemoryPreferences::setText(std::string_view domain, std::string_view key,
+                                std::string_view value)
+{
+    _texts[{std::string(domain), std::string(key)}] = value;
+}
+
+std::optional<std::string> MemoryPreferences::text(std::string_view domain, std::string_view key)
+{
+    const auto found = _texts.find({std::string(domain), std::string(key)});
+    return found == _texts.end() ? std::nullopt : std::optional(found->second);
+}
+
 bool MemoryPreferences::synchronize(std::string_view domain)
 {
     _calls.push_back(fmt::format("synchronize {}", domain));

@@ -17,6 +17,9 @@ class MemoryPreferences : public Preferences
 {
   public:
     void set(std::string_view domain, std::string_view key, bool value) override;
+    /// Leaves no record.
+    void setText(std::string_view domain, std::string_view key, std::string_view value) override;
+    std::optional<std::string> text(std::string_view domain, std::string_view key) override;
     bool synchronize(std::string_view domain) override;
     void postChanged(std::string_view domain, std::string_view key) override;
 
@@ -27,6 +30,7 @@ class MemoryPreferences : public Preferences
 
   private:
     std::map<std::pair<std::string, std::string>, bool> _values;
+    std::map<std::pair<std::string, std::string>, std::string> _texts;
     std::vector<std::string> _calls;
     bool _synchronizeSucceeds = true;
 };

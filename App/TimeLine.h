@@ -1,0 +1,60 @@
+#pragma once
+
+#include "Model/ChangeStore.h"
+#include "Model/DisplayMoment.h"
+#include "Model/PinnedSeries.h"
+#include "Platform/Clock.h"
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace ventrik
+{
+
+/// Which moment the screens show: the present, or one of the past while data run on. It follows a
+/// store; whoever shows something asks it for the display as it stands at that moment.
+class TimeLine
+{
+  public:
+    /// The store outlives it.
+    explicit TimeLine(const ChangeStore& store) : _store(store), _series(store) {}
+
+    /// Called when another moment is to be shown.
+    void setCallback(std::function<void()> momentChanged)
+    {
+        _momentChanged = std::move(momentChanged);
+    }
+
+    bool isPaused() const { return _past != nullptr; }
+    /// At the present; does nothing where there is nothing to show, or while it is paused.
+    void pause();
+    void togglePause();
+    void showTime(Clock::TimePoint time);
+    void goLive();
+    /// What is shown while it is paused; null otherwise.
+    DisplayMoment* past() const { return _past.get(); }
+    /// The moment to which the user has gone, which may lie between two changes.
+    std::optional<Clock::TimePoint> pausedAt() const { return _pausedAt; }
+
+    /// Takes what is new in the store.
+    void update();
+    /// The display as it is shown: that of the pause, or as it was at the last update.
+    DisplayMoment& shown();
+    const ChangeStore& store() const { return _store; }
+    PinnedSeries& series() { return _series; }
+
+  private:
+    void showMoment(std::uint64_t moment, Clock::TimePoint time);
+
+    const ChangeStore& _store;
+    PinnedSeries _series;
+    std::function<void()> _momentChanged;
+    std::unique_ptr<DisplayMoment> _past;
+    std::unique_ptr<DisplayMoment> _newest; // made when it is asked for
+    std::optional<Clock::TimePoint> _pausedAt;
+};
+
+} // namespace ventrik

@@ -24,6 +24,7 @@ constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
 constexpr auto noteInterval = 1s;
 constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
+constexpr auto readingInterval = 500ms;
 
 constexpr const char* firstStatus = "Connecting";
 constexpr const char* connectingStatus = "Connecting...";
@@ -40,7 +41,7 @@ VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
     : _platform(platform),
       _options(std::move(options)),
       _channelCounts(_options.records),
-      _store(_options.records)
+      _store(_options.records, _options.historyLimits)
 {
 }
 
@@ -74,7 +75,42 @@ void VentrikApp::applicationDidFinishLaunching()
         _tree->keep();
         reloadScreens();
     }
-    startModelLater();
+    if (_options.opened)
+        openSource();
+    else
+        startModelLater();
+}
+
+void VentrikApp::openSource()
+{
+    _options.opened->setObserver(_store);
+    _isReading = true;
+    _hasRefreshed = true;
+    readOnLater();
+    updateStatusForViewController(_navController->topScreen());
+    updateWindowTitle();
+}
+
+void VentrikApp::readOnLater()
+{
+    _platform.mainQueue.async([this, started = std::weak_ptr(_model)] {
+        if (!started.expired())
+            readOn();
+    });
+}
+
+void VentrikApp::readOn()
+{
+    _isReading = _options.opened->readOn();
+    if (_isReading)
+        readOnLater();
+    const Clock::TimePoint now = _platform.clock.now();
+    if (_isReading && _lastReadingUpdate && now - *_lastReadingUpdate < readingInterval)
+        return;
+    _lastReadingUpdate = now;
+    _timeLine.update();
+    goLive();
+    updateStatusForViewController(_navController->topScreen());
 }
 
 void VentrikApp::createWindow()
@@ -104,7 +140,8 @@ void VentrikApp::createDateFormatter()
     _dateFormatter = std::make_unique<DateFormatter>(_platform.clock);
     _dateFormatter->setDateFormat(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
     _pauseFormatter = std::make_unique<DateFormatter>(_platform.clock);
-    _pauseFormatter->setDateFormat(QStringLiteral("'Paused at' HH:mm:ss"));
+    _pauseFormatter->setDateFormat(_options.opened ? QStringLiteral("'at' yyyy-MM-dd HH:mm:ss")
+                                                   : QStringLiteral("'Paused at' HH:mm:ss"));
 }
 
 void VentrikApp::createNavigationStack()
@@ -170,7 +207,7 @@ void VentrikApp::_setGSMRSSI(bool value)
 
 void VentrikApp::showSaveView()
 {
-    if (_saveViewController || !_navController)
+    if (_saveViewController || !_navController || _options.opened)
         return;
     setSaveViewController(VentrikSaveViewController::initWithSaveHistory(
         *this, _platform, _options.snapshotDirectory, _model->getSaveContents()));
@@ -200,12 +237,33 @@ void VentrikApp::snapshotSaved(const std::string& fileName)
 
 void VentrikApp::updateStatusForViewController(Screen& screen)
 {
-    if (showsPast())
+    if (_options.opened)
+        screen.setStatus(openedStatus(), _isReading);
+    else if (showsPast())
         screen.setStatus(pausedStatus(), false);
     else if (_model->isConnected())
         screen.setStatus(_updateMessage.value_or(std::string()), false);
     else
         screen.setStatus(connectingStatus, true);
+}
+
+// A capture's present is its end.
+void VentrikApp::goLive()
+{
+    if (_options.opened)
+        _timeLine.showTime(_store.lastTime());
+    else
+        _timeLine.goLive();
+}
+
+std::string VentrikApp::openedStatus() const
+{
+    const std::string name = _options.opened->name();
+    if (_isReading)
+        return "Reading " + name + ": " + _options.opened->progress();
+    if (!_timeLine.pausedAt())
+        return name;
+    return name + " " + _pauseFormatter->stringFromDate(*_timeLine.pausedAt());
 }
 
 std::string VentrikApp::pausedStatus() const
@@ -274,6 +332,8 @@ void VentrikApp::toggleChannelPane()
 {
     if (!_navController || _saveViewController)
         return;
+    if (_options.opened)
+        return; // there is no channel
     _timeLine.goLive();
     const bool leadsThere = _tree->toggle(topPath());
     _navController->popTo(*_navController->screens().front(), false);
@@ -331,12 +391,16 @@ StatusNote VentrikApp::statusNote() const
 {
     if (_savedMessage)
         return {*_savedMessage, StatusLabel::NoteKind::Passing};
+    if (_options.opened)
+        return {_isReading ? std::string() : _options.opened->fault()};
     return {_model ? channelNote(ChannelState::of(*_model), _platform.clock, _lastUpdate)
                    : std::string()};
 }
 
 std::string VentrikApp::reasonForNoData() const
 {
+    if (_options.opened && _store.isEmpty())
+        return _isReading ? std::string() : "Nothing in the capture can be shown";
     if (showsPast())
         return "Nothing was here then";
     return _model ? ventrik::reasonForNoData(ChannelState::of(*_model)) : std::string();
@@ -349,6 +413,8 @@ void VentrikApp::updateWindowTitle()
         if (!part.isEmpty())
             title += QStringLiteral(" – ") + oneLine(part);
     };
+    if (_options.opened)
+        add(QString::fromStdString(_options.opened->name()));
     const std::string_view technology = _model->technologyName();
     add(QString::fromUtf8(technology.data(), static_cast<qsizetype>(technology.size())));
     if (_navController->screens().size() > 1)

@@ -7,6 +7,7 @@
 #include "App/VentrikSaveViewController.h"
 #include "App/ViewerWindow.h"
 #include "Model/ChannelPane.h"
+#include "Model/OpenedSource.h"
 #include "Platform/Platform.h"
 
 #include <QPointer>
@@ -32,6 +33,9 @@ struct VentrikAppOptions {
     RecordsMode records = RecordsMode::Newer; ///< by which layouts records are read
     bool channelPane = false;                 ///< the root ends with a row for the channel
     std::optional<QSize> windowSize;          ///< none: as large as the main screen
+    ChangeStore::Limits historyLimits;        ///< of what the time line keeps
+    /// Shown in the place of what a telephony service tells; null as a rule.
+    std::shared_ptr<OpenedSource> opened;
 };
 
 /// The application: builds the window, the model and the root pane, brings the screens up to
@@ -91,10 +95,10 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     ModelNodePointer nodeAtPath(const std::string& path) override;
     std::string_view doubtAt(const std::string& path) const override;
     std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
-    bool allowSaveButton() const override { return _allowSaveButton; }
+    bool allowSaveButton() const override { return _allowSaveButton && !_options.opened; }
     bool tintsChanges() const override { return _options.tintsChanges && !showsPast(); }
     bool showsPast() const override { return _timeLine.isPaused(); }
-    void goLive() override { _timeLine.goLive(); }
+    void goLive() override;
     StatusNote statusNote() const override;
     std::string reasonForNoData() const override;
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
@@ -113,6 +117,10 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void reloadScreens();
     void shownMomentChanged();
     std::string pausedStatus() const;
+    void readOnLater();
+    void readOn();
+    void openSource();
+    std::string openedStatus() const;
     DisplayTree* shownTree() const;
 
     Platform _platform;
@@ -126,6 +134,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     ChangeStore _store;
     TimeLine _timeLine{_store};
     std::unique_ptr<DateFormatter> _pauseFormatter;
+    bool _isReading = false; // the opened source
+    std::optional<Clock::TimePoint> _lastReadingUpdate;
     QPointer<QShortcut> _liveKey; // Home, while that leads anywhere
     std::shared_ptr<VentrikModel> _model;
     std::unique_ptr<ChannelPane> _tree; // the model's, with a row for the channel

@@ -10,6 +10,7 @@
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/StandardStreams.h"
 #include "PropertyList/Json.h"
+#include "Tools/ChosenTechnology.h"
 #include "Tools/ConsoleSystemLog.h"
 #include "Tools/FileSystemLog.h"
 #include "Tools/OfflineDecoder.h"
@@ -358,28 +359,6 @@ class Decoding
     std::string _failure; // what ended the reading, in one line; empty at the capture's end
 };
 
-// None, with the reason, where nothing tells it.
-std::optional<Technology> chooseTechnology(const DecodeOptions& options, CaptureReader& reader,
-                                           std::string& reason)
-{
-    if (options.technology)
-        return options.technology;
-    if (const auto technology = reader.technology())
-        return technology;
-    if (const auto type = reader.linkType()) {
-        reason = fmt::format("{}: link type {} names no technology; say which with --technology",
-                             options.capture, *type);
-        return std::nullopt;
-    }
-    const auto guess = reader.guessTechnology();
-    if (guess)
-        complain(fmt::format("{}: by its records it is of {}", options.capture, guess->name));
-    else
-        reason = fmt::format("{}: no record tells the technology; say which with --technology",
-                             options.capture);
-    return guess;
-}
-
 // Of a capture that nothing can be read of.
 int refuse(const DecodeOptions& options, const std::string& reason, int status, std::FILE* output)
 {
@@ -401,9 +380,12 @@ int decodeWithLog(const DecodeOptions& options, SystemLog& log, std::FILE* outpu
         return DecodeStatus::interrupted;
     if (!reader)
         return refuse(options, error, DecodeStatus::badInput, output);
-    const auto technology = chooseTechnology(options, *reader, error);
+    const auto [technology, remark] =
+        chooseTechnology(options.capture, options.technology, *reader);
     if (!technology)
-        return refuse(options, error, DecodeStatus::badUsage, output);
+        return refuse(options, remark, DecodeStatus::badUsage, output);
+    if (!remark.empty())
+        complain(remark);
 
     const LinuxResources resources(options.resourceDirectories.empty()
                                        ? LinuxResources::defaultDirectories()

@@ -4,6 +4,7 @@
 #include "Platform/Linux/StandardStreams.h"
 #include "Platform/Linux/TerminationSignals.h"
 #include "Tools/CommandLine.h"
+#include "Tools/OpenedCapture.h"
 #include "Tools/OptionValues.h"
 #include "Tools/OwnDirectory.h"
 #include "Tools/OwnService.h"
@@ -31,6 +32,7 @@ struct ViewerOptions {
     std::string demoTechnology; // empty: no demo
     std::optional<std::string> serialDevice;
     std::optional<std::string> capture; // to be replayed
+    std::optional<std::string> opened;  // a capture, to be shown without a service
     std::string speed = "1";            // of the replay
     std::string technology;             // of the port or the capture
     std::optional<RecordsMode> records; // none: the preference's
@@ -84,6 +86,8 @@ void addServiceOptions(CommandLine& line, ViewerOptions& result)
                        speedValue(text); // which refuses what is none
                        return text;
                    });
+    line.addOption("--open CAPTURE", "shows a whole capture at once, without a service",
+                   result.opened, textValue);
     line.addOption(
         "--technology NAME",
         "what the port speaks, or the capture where it does not tell: " + technologyNames(),
@@ -123,12 +127,15 @@ void addOptions(CommandLine& line, ViewerOptions& result)
 
 void refuseWrongTogether(const CommandLine& line)
 {
-    if (line.has("--demo") + line.has("--serial") + line.has("--replay") > 1)
-        line.refuse("either --demo, --serial or --replay");
+    if (line.has("--demo") + line.has("--serial") + line.has("--replay") + line.has("--open") > 1)
+        line.refuse("either --demo, --serial, --replay or --open");
+    if (line.has("--open") && line.has("--record"))
+        line.refuse("--open has nothing to record");
     if (line.has("--serial") && !line.has("--technology"))
         line.refuse("--serial goes with --technology");
-    if (line.has("--technology") && !line.has("--serial") && !line.has("--replay"))
-        line.refuse("--technology goes with --serial or --replay");
+    if (line.has("--technology") && !line.has("--serial") && !line.has("--replay") &&
+        !line.has("--open"))
+        line.refuse("--technology goes with --serial, --replay or --open");
     if (line.has("--speed") && !line.has("--replay"))
         line.refuse("--speed goes with --replay");
     if (line.has("--remember-records") && !line.has("--records"))
@@ -222,6 +229,19 @@ RecordsMode chooseRecords(const ViewerOptions& options, LinuxPlatform& platform)
     return records.value_or(RecordsMode::Newer);
 }
 
+bool openCapture(const ViewerOptions& options, const Platform& platform, VentrikAppOptions& app)
+{
+    std::string error;
+    OpenedCaptureOptions capture{*options.opened, technologyNamed(options.technology), app.records};
+    std::shared_ptr<OpenedCapture> opened = OpenedCapture::open(capture, platform, error);
+    if (!opened)
+        complain(error);
+    else if (!opened->remark().empty())
+        complain(opened->remark());
+    app.opened = opened;
+    return opened != nullptr;
+}
+
 int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
 {
     LinuxPlatformOptions platformOptions;
@@ -233,6 +253,8 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     setWindowIcon(platform.platform().resources);
     VentrikAppOptions appOptions = options.app;
     appOptions.records = chooseRecords(options, platform);
+    if (options.opened && !openCapture(options, platform.platform(), appOptions))
+        return EXIT_FAILURE;
     Recording recording("ventrik", platform.platform(), options.recording);
     if (!recording.isPossible())
         return EXIT_FAILURE;

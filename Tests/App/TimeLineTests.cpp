@@ -1,5 +1,7 @@
+#include "LogGenerator/Core/StateKeys.h"
 #include "Packets/PacketBuilder.h"
 #include "Tests/App/AppFixture.h"
+#include "Tests/Support/IdleGenerator.h"
 
 #include <QTest>
 
@@ -171,6 +173,112 @@ TEST_F(PauseTest, TheChannelsPaneIsOfThePresent)
     app.toggleChannelPane();
     EXPECT_FALSE(app.timeLine().isPaused());
     EXPECT_EQ(titles().back(), "Channel");
+}
+
+namespace
+{
+
+/// A capture of a cell's identity, told in two turns.
+class TwoTurns : public OpenedSource
+{
+  public:
+    explicit TwoTurns(const FakePlatform& fake) : _fake(fake) {}
+
+    void setObserver(MessageObserver& observer) override
+    {
+        _observer = &observer;
+        observer.useGenerator(&_generator, "lte");
+    }
+    std::string name() const override { return "drive.pcap"; }
+    bool readOn() override
+    {
+        ++_turn;
+        _state.set(
+            StateKey::display,
+            PlistDictionary{{"Cell", PlistDictionary{{"PCI", std::to_string(300 + _turn)}}}});
+        _observer->messageTaken(_fake.clock.now() + _turn * 60s, {}, _state);
+        return _turn < 2;
+    }
+    std::string progress() const override { return std::to_string(_turn) + " messages"; }
+    std::string fault() const override { return "it ends too early"; }
+
+  private:
+    const FakePlatform& _fake;
+    IdleGenerator _generator;
+    PlistDictionary _state;
+    MessageObserver* _observer = nullptr;
+    int _turn = 0;
+};
+
+class OpenedWindowTest : public AppFixture
+{
+  protected:
+    static VentrikAppOptions optionsOf(std::shared_ptr<OpenedSource> opened)
+    {
+        VentrikAppOptions options;
+        options.animation = false;
+        options.saveButton = true;
+        options.windowSize = QSize(480, 640);
+        options.opened = std::move(opened);
+        return options;
+    }
+    VentrikPaneController& root()
+    {
+        return static_cast<VentrikPaneController&>(*window.navController()->screens().front());
+    }
+
+    VentrikApp window{fake.platform(), optionsOf(std::make_shared<TwoTurns>(fake))};
+};
+
+} // namespace
+
+TEST_F(OpenedWindowTest, TellsHowFarTheReadingIs)
+{
+    window.applicationDidFinishLaunching();
+    EXPECT_EQ(statusText(root()), "Reading drive.pcap: 0 messages");
+    EXPECT_TRUE(isSpinning(root()));
+    EXPECT_EQ(window.window()->windowTitle().toStdString(), "Ventrik – drive.pcap");
+}
+
+TEST_F(OpenedWindowTest, ShowsTheCapturesEndWithoutAService)
+{
+    window.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    EXPECT_EQ(statusText(root()), "drive.pcap at 2026-11-16 06:12:28");
+    EXPECT_FALSE(isSpinning(root()));
+    EXPECT_EQ(note(root()), "it ends too early");
+    EXPECT_EQ(*window.nodeAtPath("/Cell/PCI")->value(), "302");
+    EXPECT_TRUE(fake.record->operations().empty());
+}
+
+TEST_F(OpenedWindowTest, GoesBackInTheCaptureAndToItsEnd)
+{
+    window.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    window.timeLine().showTime(fake.clock.now() + 60s);
+    EXPECT_EQ(*window.nodeAtPath("/Cell/PCI")->value(), "301");
+    EXPECT_EQ(statusText(root()), "drive.pcap at 2026-11-16 06:11:28");
+    window.goLive();
+    EXPECT_EQ(*window.nodeAtPath("/Cell/PCI")->value(), "302");
+}
+
+TEST_F(OpenedWindowTest, SavesNothingAndHasNoChannel)
+{
+    window.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    window.showSaveView();
+    EXPECT_EQ(window.saveViewController(), nullptr);
+    window.toggleChannelPane();
+    EXPECT_EQ(window.navController()->screens().size(), 1U);
+    EXPECT_FALSE(window.allowSaveButton());
+}
+
+TEST_F(OpenedWindowTest, EndsWhileItReads)
+{
+    window.applicationDidFinishLaunching();
+    window.applicationWillTerminate();
+    fake.mainQueue.run();
+    EXPECT_EQ(window.window(), nullptr);
 }
 
 } // namespace ventrik

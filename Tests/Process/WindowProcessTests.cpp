@@ -295,6 +295,8 @@ TEST_F(WindowProcess, RefusesWhatIsWrong)
                               {"--demo", "5g"},
                               {"--log-level"},
                               {"--demo", "lte", "--replay", "x"},
+                              {"--demo", "lte", "--open", "x"},
+                              {"--open", "x", "--record", "y"},
                               {"--serial", "/dev/null"},
                               {"--technology", "lte"},
                               {"--speed", "2"},

@@ -1,10 +1,11 @@
 #include "Packets/Plausibility.h"
 
+#include "Packets/ChannelNumbers.h"
+
 #include <algorithm>
 #include <array>
 #include <charconv>
 #include <optional>
-#include <span>
 
 namespace ventrik
 {
@@ -12,46 +13,25 @@ namespace ventrik
 namespace
 {
 
-struct Range {
-    double first;
-    double last;
-};
-
-/// A number in none of the ranges cannot be.
+/// A number of that quantity that is not possible is in doubt.
 struct Limits {
     Quantity quantity;
-    std::span<const Range> ranges;
+    bool (*isPossible)(double number);
     std::string_view doubt;
 };
 
-constexpr std::array<Range, 1> rsrpRange{{{-144, -44}}};
-constexpr std::array<Range, 1> rsrqRange{{{-30, 3}}};
-constexpr std::array<Range, 1> identityRange{{{0, 503}}};
-
-// Bands whose numbers follow on each other stand in one range (3GPP TS 36.101, table 5.7.3-1).
-constexpr std::array<Range, 6> downlinkRanges{{
-    {0, 4949},
-    {5010, 5379},
-    {5730, 7399},
-    {7500, 10359},
-    {36000, 60304},
-    {65536, 73335},
-}};
-constexpr std::array<Range, 6> uplinkRanges{{
-    {18000, 22949},
-    {23010, 23379},
-    {23730, 25399},
-    {25500, 27809},
-    {36000, 60304},
-    {131072, 134341},
-}};
+template <int first, int last>
+bool isWithin(double number)
+{
+    return first <= number && number <= last;
+}
 
 constexpr std::array<Limits, 5> limits{{
-    {Quantity::RSRP, rsrpRange, "RSRP is outside -144 to -44 dBm"},
-    {Quantity::RSRQ, rsrqRange, "RSRQ is outside -30 to 3 dB"},
-    {Quantity::PhysicalCellIdentity, identityRange, "Physical cell identity is above 503"},
-    {Quantity::DownlinkEARFCN, downlinkRanges, "Downlink EARFCN is in no band"},
-    {Quantity::UplinkEARFCN, uplinkRanges, "Uplink EARFCN is in no band"},
+    {Quantity::RSRP, isWithin<-144, -44>, "RSRP is outside -144 to -44 dBm"},
+    {Quantity::RSRQ, isWithin<-30, 3>, "RSRQ is outside -30 to 3 dB"},
+    {Quantity::PhysicalCellIdentity, isWithin<0, 503>, "Physical cell identity is above 503"},
+    {Quantity::DownlinkEARFCN, isDownlinkEARFCN, "Downlink EARFCN is in no band"},
+    {Quantity::UplinkEARFCN, isUplinkEARFCN, "Uplink EARFCN is in no band"},
 }};
 
 constexpr double startOf1980 = 315532800; // seconds since 1970
@@ -72,12 +52,7 @@ std::optional<double> numberIn(std::string_view text, std::string_view unit)
 std::string_view doubtOf(Quantity quantity, double number)
 {
     const auto known = std::ranges::find(limits, quantity, &Limits::quantity);
-    const auto holdsNumber = [number](const Range& range) {
-        return range.first <= number && number <= range.last;
-    };
-    return known == limits.end() || std::ranges::any_of(known->ranges, holdsNumber)
-               ? std::string_view()
-               : known->doubt;
+    return known == limits.end() || known->isPossible(number) ? std::string_view() : known->doubt;
 }
 
 std::string_view doubtOf(const Field& field, std::int64_t raw)

@@ -1,5 +1,6 @@
 #include "Model/CellTable.h"
 
+#include "Model/CellPlaces.h"
 #include "Model/DisplayNames.h"
 #include "Model/NodeRows.h"
 #include "Model/PathIndex.h"
@@ -9,7 +10,6 @@
 #include <array>
 #include <chrono>
 #include <cmath>
-#include <span>
 #include <tuple>
 
 #include <fmt/format.h>
@@ -19,237 +19,6 @@ namespace ventrik
 
 namespace
 {
-
-// ---- Where the cells stand in the displays
-
-/// The names under which a cell's values stand; empty where there are none. Those that begin with
-/// "/" stand elsewhere, the same for all cells of a list.
-struct CellNames {
-    std::string_view channel = {};
-    std::string_view identity = {};
-    std::string_view level = {};
-    std::string_view quality = {};
-    /// Decides the kind.
-    std::string_view kind = {};
-    std::string_view band = {};
-};
-
-enum class Shape : std::uint8_t {
-    Group,     ///< one cell
-    List,      ///< a cell is an element
-    Strengths, ///< a cell is a value: its name the identity, its number the second level
-};
-
-struct KindOfText {
-    std::string_view text; ///< or its beginning
-    CellKind kind;
-};
-
-struct CellPlaces {
-    std::string_view technology; ///< on the command line
-    CellSystem system;
-    CellKind kind; ///< where the cell's own text decides none
-    Shape shape;
-    std::string_view path;
-    CellNames names;
-    std::span<const KindOfText> kinds = {};
-};
-
-constexpr std::array<KindOfText, 2> servingTexts{
-    {{"True", CellKind::Serving}, {"False", CellKind::Measured}}};
-constexpr std::array<KindOfText, 3> setTexts{
-    {{"ASET", CellKind::Active}, {"MSET", CellKind::Monitored}, {"DSET", CellKind::Detected}}};
-constexpr std::array<KindOfText, 1> pilotTexts{{{"(ref pilot)", CellKind::Serving}}};
-
-constexpr std::string_view connectedMode = "/Connected mode LTE Intra-frequency Measurement";
-constexpr std::string_view connectedEARFCN =
-    "/Connected mode LTE Intra-frequency Measurement/E-ARFCN";
-constexpr std::string_view candidates = "/Reselection/Reselection Candidates List";
-constexpr std::string_view umtsServing = "/Serving Cell/UMTS RR Info";
-
-// Of several serving cells of a system the one that was told last is the one.
-constexpr auto places = std::to_array<CellPlaces>({
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell Measurements",
-     {"E-ARFCN", "Physical Cell ID", "Measured RSRP", "Measured RSRQ"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Serving,
-     Shape::Group,
-     connectedMode,
-     {"E-ARFCN", "Serving Physical Cell ID", "Serving Filtered RSRP", "Serving Filtered RSRQ"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell Info",
-     {"Download Frequency", "Physical Cell ID"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Serving,
-     Shape::Group,
-     "/More/Serving Cell Signal",
-     {"E-ARFCN", "Physical Cell ID", "RSRP", "RSRQ"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Measured,
-     Shape::List,
-     "/More/Signal by Cell",
-     {"E-ARFCN", "Physical Cell ID", "RSRP", "RSRQ", "Serving"},
-     servingTexts},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Measured,
-     Shape::List,
-     "/Neighbors/Measured Neighbor Cells",
-     {connectedEARFCN, "Physical Cell ID", "Filtered RSRP", "Filtered RSRQ"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Measured,
-     Shape::List,
-     "/More/Neighbors/Connected Neighbor Cells",
-     {"/More/Neighbors/Connected Neighbors/E-ARFCN", "Physical Cell ID", "Measured RSRP",
-      "Measured RSRQ"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Detected,
-     Shape::List,
-     "/Neighbors/Detected Cells",
-     {connectedEARFCN, "Physical Cell ID"}},
-    {"lte",
-     CellSystem::LTE,
-     CellKind::Neighbor,
-     Shape::List,
-     "/Neighbors/Neighbor Cells List",
-     {"/Neighbors/Neighbor Measurements/E-ARFCN", "Physical Cell ID", "Measured RSRP",
-      "Measured RSRQ"}},
-    {"lte", CellSystem::LTE, CellKind::Candidate, Shape::List, candidates, {"E ARFCN", "Cell ID"}},
-    {"lte", CellSystem::UMTS, CellKind::Candidate, Shape::List, candidates, {"U ARFCN", "PSC"}},
-    {"lte", CellSystem::GSM, CellKind::Candidate, Shape::List, candidates, {"ARFCN", "BSIC ID"}},
-    {"lte",
-     CellSystem::OneX,
-     CellKind::Candidate,
-     Shape::List,
-     candidates,
-     {.channel = "Channel", .identity = "Pilot", .band = "Band"}},
-
-    {"gsm",
-     CellSystem::GSM,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell/GSM Serving Cell",
-     {"ARFCN", "BSIC", "RSSI"}},
-    {"gsm",
-     CellSystem::UMTS,
-     CellKind::Serving,
-     Shape::Group,
-     umtsServing,
-     {"Downlink Frequency", "Scrambling Code"}},
-    {"gsm",
-     CellSystem::UMTS,
-     CellKind::Serving,
-     Shape::Group,
-     umtsServing,
-     {"UARFCN", "Scrambling Code"}},
-    {"gsm",
-     CellSystem::UMTS,
-     CellKind::Active,
-     Shape::List,
-     "/Serving Cell/Active Set",
-     {"/Serving Cell/UMTS RR Info/Downlink Frequency", "Scrambling Code", "RSCP",
-      "Energy Per Chip"}},
-    {"gsm",
-     CellSystem::GSM,
-     CellKind::Neighbor,
-     Shape::List,
-     "/Neighbors/Neighboring Cells",
-     {"ARFCN", "BSIC", "RSSI"}},
-    {"gsm",
-     CellSystem::UMTS,
-     CellKind::Ranked,
-     Shape::List,
-     "/Neighbors/UMTS Set",
-     {"Downlink Frequency", "Scrambling Code", "RSCP", "Energy Per Chip"}},
-    {"gsm",
-     CellSystem::UMTS,
-     CellKind::Neighbor,
-     Shape::List,
-     "/Neighbors/UMTS Set",
-     {"UARFCN", "Scrambling Code", "RSCP", "Energy Per Chip"}},
-    {"gsm",
-     CellSystem::GSM,
-     CellKind::Ranked,
-     Shape::List,
-     "/Neighbors/GSM Set",
-     {"ARFCN", "BSIC", "RSSI"}},
-
-    {"utran",
-     CellSystem::TimeDividedUMTS,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell Info",
-     {"Downlink UARFCN", "Cell Scrambling Code"}},
-    {"utran",
-     CellSystem::TimeDividedUMTS,
-     CellKind::Neighbor,
-     Shape::List,
-     "/Neighbor Cell List",
-     {.channel = "UARFCN", .identity = "Cell ID", .level = "Filter RSCP", .kind = "Status"},
-     setTexts},
-
-    {"c2k",
-     CellSystem::OneX,
-     CellKind::Active,
-     Shape::Strengths,
-     "/1x/Active Set",
-     {.channel = "/1x/Radio/Rx 0 Channel", .band = "/1x/Radio/Rx 0 Band Class"},
-     pilotTexts},
-    {"c2k",
-     CellSystem::EVDO,
-     CellKind::Active,
-     Shape::Strengths,
-     "/EV-DO/Active Set Pilots",
-     {.channel = "/EV-DO/Radio/Channel", .band = "/EV-DO/Radio/Band Class"}},
-
-    {"ifx",
-     CellSystem::GSM,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell",
-     {"ARFCN", "BSIC", "RxLev"}},
-    {"ifx",
-     CellSystem::UMTS,
-     CellKind::Serving,
-     Shape::Group,
-     "/Serving Cell",
-     {"UARFCN", "Scrambling Code", "RSCP"}},
-    {"ifx",
-     CellSystem::GSM,
-     CellKind::Neighbor,
-     Shape::List,
-     "/GSM Neighbor Cells",
-     {"ARFCN", "BSIC", "RxLev"}},
-    {"ifx",
-     CellSystem::UMTS,
-     CellKind::Neighbor,
-     Shape::List,
-     "/UMTS Neighbor Cells",
-     {"UARFCN", "Scrambling Code", "RSCP"}},
-});
-
-/// Where the country stands, which tells which of two GSM bands is used there.
-struct CountryPlace {
-    std::string_view technology;
-    std::string_view path;
-};
-constexpr auto countryPlaces = std::to_array<CountryPlace>({
-    {"lte", "/More/EPS Registration/Mobile Country Code"},
-    {"gsm", "/Registration/Serving PLMN/Mobile Country Code"},
-    {"ifx", "/Serving Cell/MCC"},
-});
 
 constexpr std::string_view carrierIndex = "Carrier Index";
 constexpr std::string_view servingPilotPath = "/EV-DO/Radio/Serving PN Offset";
@@ -280,7 +49,7 @@ constexpr const SystemNames& namesOf(CellSystem system)
 // bands are used.
 GSMBandHint hintOfCountry(std::string_view code)
 {
-    if (code.size() != 3 || code.front() == '7')
+    if (code.size() != 3)
         return GSMBandHint::None;
     if (code.front() == '3')
         return GSMBandHint::PCS1900;
@@ -371,27 +140,24 @@ std::string_view textAt(const DisplayMoment& display, std::string_view path)
 
 void CellReader::findHint()
 {
-    for (const auto& [technology, path] : countryPlaces)
-        if (technology == _display.technology())
-            _hint = hintOfCountry(textAt(_display, path));
+    _hint = hintOfCountry(textAt(_display, countryPlaceOf(_display.technology())));
 }
 
 std::vector<FoundCell> CellReader::read()
 {
-    for (const CellPlaces& place : places)
-        if (place.technology == _display.technology())
-            readPlaces(place);
+    for (const CellPlaces& place : cellPlacesOf(_display.technology()))
+        readPlaces(place);
     return std::move(_cells);
 }
 
 void CellReader::readPlaces(const CellPlaces& place)
 {
     const std::string path(place.path);
-    if (place.shape == Shape::Group)
+    if (place.shape == CellShape::Group)
         return readCell(place, path);
     for (const ModelNodePointer& node : rowsOf(_display.nodeAtPath(path))) {
         const std::string below = pathJoining(path, node->displayName());
-        if (place.shape == Shape::List)
+        if (place.shape == CellShape::List)
             readCell(place, below);
         else
             readStrength(place, below);

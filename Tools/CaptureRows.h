@@ -4,9 +4,9 @@
 #include "Capture/RowWriter.h"
 #include "LogGenerator/Core/LogGenerator.h"
 #include "Model/DisplayChanges.h"
+#include "Model/PathSelection.h"
 #include "Packets/WantedCodes.h"
 #include "Platform/Technology.h"
-#include "Tools/PathSelection.h"
 
 #include <chrono>
 #include <optional>

@@ -1,4 +1,4 @@
-#include "Tools/PathSelection.h"
+#include "Model/PathSelection.h"
 
 #include <algorithm>
 #include <span>

@@ -1,4 +1,4 @@
-#include "Tools/PathSelection.h"
+#include "Model/PathSelection.h"
 
 #include <gmock/gmock.h>
 

@@ -59,7 +59,9 @@ std::optional<ValueRange> valuesWithin(std::span<const SeriesPoint> points, Cloc
     for (std::size_t place = 0; place < near.size(); ++place) {
         const SeriesPoint& point = near[place];
         const bool hasNext = place + 1 < near.size();
-        const bool leadsIn = hasNext ? leadsOn(point, near[place + 1]) : isHeld(point, first);
+        const bool leadsIn = hasNext
+                                 ? leadsOn(point, near[place + 1]) && near[place + 1].from > first
+                                 : isHeld(point, first);
         const bool isSeen = point.from <= last && (point.until >= first || leadsIn);
         if (!isSeen || !std::isfinite(point.value))
             continue;

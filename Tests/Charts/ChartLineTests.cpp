@@ -68,6 +68,7 @@ TEST(ChartLineTest, AValueThatIsHeldIntoTheRangeShows)
     ASSERT_TRUE(range);
     EXPECT_EQ(range->least, -90);
     EXPECT_FALSE(valuesWithin(series, at(22), at(28)));
+    EXPECT_EQ(valuesWithin(series, at(3), at(4))->greatest, -90) << "the step is at the edge";
 }
 
 TEST(ChartLineTest, OnlyThePointsAroundAreLookedAt)

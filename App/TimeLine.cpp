@@ -1,9 +1,23 @@
 #include "App/TimeLine.h"
 
 #include <algorithm>
+#include <sstream>
+#include <utility>
 
 namespace ventrik
 {
+
+namespace
+{
+
+constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
+
+std::string pinsKey(const std::string& technology)
+{
+    return "Pins." + technology;
+}
+
+} // namespace
 
 void TimeLine::pause()
 {
@@ -48,8 +62,62 @@ void TimeLine::goLive()
 
 void TimeLine::update()
 {
+    usePins();
     _series.update();
     _newest = nullptr;
+}
+
+// Those of the preferences, where there are any; a line each.
+void TimeLine::usePins()
+{
+    const std::string_view technology = _store.technologyAt(_store.present());
+    if (technology == _technology)
+        return;
+    _technology = technology;
+    _pins = defaultPins(technology);
+    if (const auto kept = _preferences.text(preferenceDomain, pinsKey(_technology))) {
+        const std::vector<Pin> defaults = std::exchange(_pins, {});
+        std::istringstream lines(*kept);
+        for (std::string path; std::getline(lines, path);) {
+            const auto known = std::ranges::find(defaults, path, &Pin::path);
+            _pins.push_back(known == defaults.end() ? Pin::of(path) : *known);
+        }
+    }
+    _series.setPins(_pins);
+}
+
+void TimeLine::keepPins() const
+{
+    std::string lines;
+    for (const Pin& pin : _pins)
+        lines += pin.path + "\n";
+    _preferences.setText(preferenceDomain, pinsKey(_technology), lines);
+    _preferences.synchronize(preferenceDomain);
+}
+
+bool TimeLine::canPin(const std::string& path)
+{
+    const DisplayMoment::Value* value = shown().valueAt(path);
+    return isPinned(path) ||
+           (value && value->shown.number && _pins.size() < PinnedSeries::mostPins &&
+            path.find('\n') == path.npos);
+}
+
+bool TimeLine::isPinned(const std::string& path) const
+{
+    return std::ranges::find(_pins, path, &Pin::path) != _pins.end();
+}
+
+void TimeLine::togglePin(const std::string& path)
+{
+    if (isPinned(path))
+        std::erase_if(_pins, [&](const Pin& pin) { return pin.path == path; });
+    else if (canPin(path))
+        _pins.push_back(Pin::of(path));
+    else
+        return;
+    _series.setPins(_pins);
+    keepPins();
 }
 
 DisplayMoment& TimeLine::shown()

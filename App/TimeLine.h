@@ -4,12 +4,14 @@
 #include "Model/DisplayMoment.h"
 #include "Model/PinnedSeries.h"
 #include "Platform/Clock.h"
+#include "Platform/Preferences.h"
 
 #include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace ventrik
 {
@@ -19,8 +21,11 @@ namespace ventrik
 class TimeLine
 {
   public:
-    /// The store outlives it.
-    explicit TimeLine(const ChangeStore& store) : _store(store), _series(store) {}
+    /// Both outlive it.
+    TimeLine(const ChangeStore& store, Preferences& preferences)
+        : _store(store), _preferences(preferences), _series(store)
+    {
+    }
 
     /// Called when another moment is to be shown.
     void setCallback(std::function<void()> momentChanged)
@@ -44,13 +49,25 @@ class TimeLine
     /// The display as it is shown: that of the pause, or as it was at the last update.
     DisplayMoment& shown();
     const ChangeStore& store() const { return _store; }
-    PinnedSeries& series() { return _series; }
+    const PinnedSeries& series() const { return _series; }
+
+    /// Whether a number stands at a path that can be drawn over time.
+    bool canPin(const std::string& path);
+    bool isPinned(const std::string& path) const;
+    /// Draws the value there from now on, or no more. Kept as a preference of the technology.
+    void togglePin(const std::string& path);
 
   private:
     void showMoment(std::uint64_t moment, Clock::TimePoint time);
 
+    void usePins();
+    void keepPins() const;
+
     const ChangeStore& _store;
+    Preferences& _preferences;
     PinnedSeries _series;
+    std::vector<Pin> _pins;
+    std::string _technology; // whose pins these are
     std::function<void()> _momentChanged;
     std::unique_ptr<DisplayMoment> _past;
     std::unique_ptr<DisplayMoment> _newest; // made when it is asked for

@@ -26,6 +26,11 @@ constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
 constexpr auto readingInterval = 500ms;
 
+constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
+constexpr std::string_view timeLineKey = "TimeLine";
+constexpr std::string_view timeLineShown = "shown";
+constexpr std::string_view timeLineHidden = "hidden";
+
 constexpr const char* firstStatus = "Connecting";
 constexpr const char* connectingStatus = "Connecting...";
 
@@ -156,10 +161,7 @@ void VentrikApp::createNavigationStack()
 void VentrikApp::showWindow()
 {
     _viewerWindow->addPanes(_navController);
-    _viewerWindow->setSpaceCallback([this] {
-        if (!_saveViewController)
-            _timeLine.togglePause();
-    });
+    createTimeLine();
     auto* channelKey = new QShortcut(QKeySequence(Qt::Key_F8), _window.get());
     QObject::connect(channelKey, &QShortcut::activated, _window.get(),
                      [this] { toggleChannelPane(); });
@@ -168,6 +170,73 @@ void VentrikApp::showWindow()
     QObject::connect(_liveKey, &QShortcut::activated, _window.get(), [this] { goLive(); });
     _window->show();
     _window->activateWindow();
+}
+
+void VentrikApp::createTimeLine()
+{
+    _timeLineView = new TimeLineView(_timeLine, _platform.clock);
+    _timeLineView->setListener({[this] { goLive(); }, [this] { _timeLine.togglePause(); }});
+    _viewerWindow->addTimeLine(_timeLineView);
+    const auto kept = _platform.preferences.text(preferenceDomain, timeLineKey);
+    _viewerWindow->setTimeLineWanted(_options.timeLine && kept != timeLineHidden);
+    _viewerWindow->setWidthCallback([this] { leaveTimeLineScreen(); });
+    _viewerWindow->setSpaceCallback([this] {
+        if (!_saveViewController)
+            _timeLine.togglePause();
+    });
+    auto* key = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_T), _window.get());
+    QObject::connect(key, &QShortcut::activated, _window.get(), [this] { toggleTimeLine(); });
+    updateTimeLine();
+}
+
+void VentrikApp::toggleTimeLine()
+{
+    if (!_navController || _saveViewController)
+        return;
+    if (_viewerWindow->isWide()) {
+        const bool isWanted = !_viewerWindow->isTimeLineWanted();
+        _viewerWindow->setTimeLineWanted(isWanted);
+        _platform.preferences.setText(preferenceDomain, timeLineKey,
+                                      isWanted ? timeLineShown : timeLineHidden);
+        _platform.preferences.synchronize(preferenceDomain);
+        updateTimeLine();
+    } else if (_timeLineScreen && &_navController->topScreen() == _timeLineScreen) {
+        leaveTimeLineScreen();
+    } else {
+        leaveTimeLineScreen(); // where a pane was opened from it, which then lies on top
+        auto screen = std::make_unique<TimeLineScreen>(*this, *_viewerWindow, *_timeLineView);
+        _timeLineScreen = screen.get();
+        _navController->push(std::move(screen), true);
+        updateTimeLine();
+    }
+}
+
+void VentrikApp::togglePin(const std::string& path)
+{
+    _timeLine.togglePin(path);
+    updateTimeLine();
+}
+
+void VentrikApp::leaveTimeLineScreen()
+{
+    if (!_timeLineScreen || !_navController)
+        return;
+    const std::vector<Screen*> screens = _navController->screens();
+    const auto screen = std::ranges::find(screens, _timeLineScreen.data());
+    _timeLineScreen = nullptr;
+    if (screen != screens.end() && screen != screens.begin())
+        _navController->popTo(**std::prev(screen), false);
+}
+
+void VentrikApp::updateTimeLine()
+{
+    if (!_timeLineView || _timeLineView->isHidden())
+        return;
+    const std::optional<Clock::TimePoint> at = _timeLine.pausedAt();
+    _timeLineView->setStatus(
+        at ? QString::fromStdString(_pauseFormatter->stringFromDate(*at)) : QStringLiteral("Live"),
+        at.has_value(), _options.opened ? QStringLiteral("End") : QStringLiteral("Live"));
+    _timeLineView->update();
 }
 
 // Not before the launch has returned; by then the application may have ended again.
@@ -289,6 +358,7 @@ void VentrikApp::updateViewControllerFromModel()
     _hasRefreshed = true;
     _tree->takeDisplay(); // which records it in the history, whatever is shown
     _timeLine.update();
+    updateTimeLine();
     if (!showsPast())
         reloadScreens();
     if (_model->isConnected()) {
@@ -304,6 +374,7 @@ void VentrikApp::shownMomentChanged()
     if (!_navController)
         return;
     _liveKey->setEnabled(showsPast());
+    updateTimeLine();
     reloadScreens();
     updateStatusForViewController(_navController->topScreen());
 }

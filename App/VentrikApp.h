@@ -2,6 +2,8 @@
 
 #include "App/DateFormatter.h"
 #include "App/TimeLine.h"
+#include "App/TimeLineScreen.h"
+#include "App/TimeLineView.h"
 #include "App/Toolkit/NavigationStack.h"
 #include "App/VentrikPaneController.h"
 #include "App/VentrikSaveViewController.h"
@@ -34,6 +36,7 @@ struct VentrikAppOptions {
     bool channelPane = false;                 ///< the root ends with a row for the channel
     std::optional<QSize> windowSize;          ///< none: as large as the main screen
     ChangeStore::Limits historyLimits;        ///< of what the time line keeps
+    bool timeLine = true; ///< stands beside the panes from the start, unless it was hidden before
     /// Shown in the place of what a telephony service tells; null as a rule.
     std::shared_ptr<OpenedSource> opened;
 };
@@ -60,6 +63,11 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void toggleChannelPane();
     /// Shows the present, or what stood at some moment; messages are taken all the while.
     TimeLine& timeLine() { return _timeLine; }
+    /// Shows the time line beside the panes or hides it there; in a narrow window opens its screen,
+    /// or leaves that.
+    void toggleTimeLine();
+    /// Null before launch and after termination.
+    TimeLineView* timeLineView() const { return _timeLineView; }
 
     void showSaveView() override;
     void closeSaveView() override;
@@ -99,6 +107,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     bool tintsChanges() const override { return _options.tintsChanges && !showsPast(); }
     bool showsPast() const override { return _timeLine.isPaused(); }
     void goLive() override;
+    bool canPin(const std::string& path) override { return _timeLine.canPin(path); }
+    bool isPinned(const std::string& path) const override { return _timeLine.isPinned(path); }
+    void togglePin(const std::string& path) override;
     StatusNote statusNote() const override;
     std::string reasonForNoData() const override;
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
@@ -115,7 +126,10 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void updateChannelPane();
     void updateWindowTitle();
     void reloadScreens();
+    void createTimeLine();
     void shownMomentChanged();
+    void updateTimeLine();
+    void leaveTimeLineScreen();
     std::string pausedStatus() const;
     void readOnLater();
     void readOn();
@@ -132,9 +146,11 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
     ChannelCounts _channelCounts;
     ChangeStore _store;
-    TimeLine _timeLine{_store};
+    TimeLine _timeLine{_store, _platform.preferences};
     std::unique_ptr<DateFormatter> _pauseFormatter;
-    bool _isReading = false; // the opened source
+    QPointer<TimeLineView> _timeLineView;     // the window's
+    QPointer<TimeLineScreen> _timeLineScreen; // while the stack has one
+    bool _isReading = false;                  // the opened source
     std::optional<Clock::TimePoint> _lastReadingUpdate;
     QPointer<QShortcut> _liveKey; // Home, while that leads anywhere
     std::shared_ptr<VentrikModel> _model;

@@ -1,12 +1,9 @@
 #include "App/VentrikPaneController.h"
 
-#include "App/Toolkit/ActivityIndicator.h"
-#include "App/Toolkit/Fonts.h"
+#include "App/StatusItems.h"
 #include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/NavigationStack.h"
-#include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/PushButton.h"
-#include "App/Toolkit/StatusLabel.h"
 #include "App/VentrikCell.h"
 #include "Model/NodeRows.h"
 
@@ -18,39 +15,11 @@ namespace ventrik
 namespace
 {
 
-constexpr int statusPoints = 14;
 constexpr auto rowStyle = TableRow::Style::Value;
 
 QString identifier()
 {
     return QStringLiteral("VentrikPaneControllerCell");
-}
-
-std::unique_ptr<QWidget> makeIndicator(bool isLoading)
-{
-    auto indicator = std::make_unique<ActivityIndicator>();
-    if (isLoading)
-        indicator->startAnimating();
-    else
-        indicator->stopAnimating();
-    return indicator;
-}
-
-void showNote(const StatusNote& note, StatusLabel& label)
-{
-    label.setNote(oneLine(QString::fromStdString(note.text)), note.kind);
-}
-
-std::unique_ptr<QWidget> makeStatusLabel(const std::string& status, VentrikPaneHost& host)
-{
-    auto label = std::make_unique<StatusLabel>();
-    label->setFont(systemFont(statusPoints, FontWeight::Regular));
-    label->setText(QString::fromStdString(status));
-    showNote(host.statusNote(), *label);
-    if (host.showsPast())
-        label->setAction([&host] { host.goLive(); });
-    label->resize(label->sizeHint());
-    return label;
 }
 
 std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
@@ -126,10 +95,7 @@ VentrikPaneController::initWithNode(VentrikPaneHost& host, ModelNodePointer node
 
 void VentrikPaneController::createToolbarItems()
 {
-    std::vector<ToolBarItem> items;
-    items.push_back(ToolBarItem::widget(makeIndicator(_isLoading)));
-    items.push_back(ToolBarItem::widget(makeStatusLabel(_status, _host)));
-    items.push_back(ToolBarItem::flexibleSpace());
+    std::vector<ToolBarItem> items = statusItems(_status, _isLoading, _host);
     if (_host.allowSaveButton())
         items.push_back(ToolBarItem::widget(makeSaveButton(_host)));
     setToolbarItems(std::move(items), true);
@@ -138,9 +104,7 @@ void VentrikPaneController::createToolbarItems()
 
 void VentrikPaneController::updateNotes()
 {
-    for (QWidget* item : toolbar().items())
-        if (auto* label = dynamic_cast<StatusLabel*>(item))
-            showNote(_host.statusNote(), *label);
+    updateStatusNote(toolbar(), _host.statusNote());
     table().setPlaceholder(reasonForNoRows());
 }
 
@@ -259,6 +223,17 @@ QString VentrikPaneController::textForCopying(IndexPath indexPath)
     const std::string text =
         child.value() ? child.displayName() + ": " + *child.value() : child.displayName();
     return QString::fromStdString(text);
+}
+
+std::vector<RowAction> VentrikPaneController::actionsForRow(IndexPath indexPath)
+{
+    const VentrikModelNode& child = *childAt(indexPath);
+    const std::string path = pathJoining(_keyPath, child.displayName());
+    if (!child.value() || !_host.canPin(path))
+        return {};
+    return {{_host.isPinned(path) ? QStringLiteral("Unpin from the Time Line")
+                                  : QStringLiteral("Pin to the Time Line"),
+             QKeySequence(Qt::Key_P), [this, path] { _host.togglePin(path); }}};
 }
 
 void VentrikPaneController::rowSelected(TableView& table, std::optional<IndexPath> indexPath)

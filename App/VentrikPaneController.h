@@ -26,6 +26,10 @@ class VentrikPaneHost : public DisplayTree
     virtual bool showsPast() const { return false; }
     /// Back to the present.
     virtual void goLive() {}
+    /// Whether the number at a path can be drawn over time, and is.
+    virtual bool canPin(const std::string&) { return false; }
+    virtual bool isPinned(const std::string&) const { return false; }
+    virtual void togglePin(const std::string&) {}
     /// Why there is nothing to show, where a pane has no node that could have rows.
     virtual std::string reasonForNoData() const { return {}; }
 };
@@ -59,6 +63,7 @@ class VentrikPaneController : public TableScreen
     void rowWillBeReused(TableRow& row) override;
     /// "name: value", or the name of an inner node.
     QString textForCopying(IndexPath indexPath) override;
+    std::vector<RowAction> actionsForRow(IndexPath indexPath) override;
 
   private:
     VentrikPaneController(VentrikPaneHost& host, ModelNodePointer node, std::string path);

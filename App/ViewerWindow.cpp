@@ -75,6 +75,7 @@ void ViewerWindow::layOut()
     _separator->setVisible(isBeside);
     if (_timeLine && _timeLine->parentWidget() == this)
         _timeLine->setVisible(isBeside);
+    _layout->activate();
 }
 
 void ViewerWindow::resizeEvent(QResizeEvent*)

@@ -14,7 +14,8 @@ class OpenedSource
   public:
     virtual ~OpenedSource() = default;
 
-    /// Is told what is read, as by a log channel; before anything is. The observer is used in `readOn` alone.
+    /// Is told what is read, as by a log channel; before anything is. The observer is used in
+    /// `readOn` alone.
     virtual void setObserver(MessageObserver& observer) = 0;
     /// For people: that of the file.
     virtual std::string name() const = 0;

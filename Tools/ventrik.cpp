@@ -106,8 +106,8 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                    result.app.windowSize, sizeValue);
     line.addFlag("--no-animation", "every change shows at once",
                  [&app = result.app] { app.animation = false; });
-    line.addFlag("--plain", "no animation, and values that have changed are not tinted",
-                 [&app = result.app] { app.animation = app.tintsChanges = false; });
+    line.addFlag("--plain", "no animation, values that have changed are not tinted, no time line",
+                 [&app = result.app] { app.animation = app.tintsChanges = app.timeLine = false; });
     line.addFlag("--channel-pane",
                  "the root ends with a row for the channel: what came, and what did not; F8 shows "
                  "it, too",

@@ -26,6 +26,7 @@ namespace
 {
 
 constexpr int wheelStep = 20;
+constexpr int longPressTime = 600; // ms
 constexpr int placeholderPoints = 15;
 constexpr int placeholderMargin = 24;
 
@@ -276,19 +277,23 @@ void TableView::mousePressEvent(QMouseEvent* event)
     _showsKeyboardFrame = false;
     _pressPosition = event->pos();
     setHighlighted(rowAtPosition(event->pos()));
+    _longPress.start(longPressTime, this);
 }
 
 void TableView::mouseMoveEvent(QMouseEvent* event)
 {
     // A drag means something else than the row.
-    if ((event->pos() - _pressPosition).manhattanLength() >= QApplication::startDragDistance())
-        setHighlighted(std::nullopt);
+    if ((event->pos() - _pressPosition).manhattanLength() < QApplication::startDragDistance())
+        return;
+    _longPress.stop();
+    setHighlighted(std::nullopt);
 }
 
 void TableView::mouseReleaseEvent(QMouseEvent* event)
 {
     if (event->button() != Qt::LeftButton)
         return;
+    _longPress.stop();
     const std::optional<int> row = std::exchange(_pressed, std::nullopt);
     if (row && row == rowAtPosition(event->pos()))
         activate(*row);
@@ -351,6 +356,8 @@ bool TableView::useRowKey(const QKeyEvent& event, int row)
         copyRow({0, row});
         return true;
     }
+    if (runAction(event, row))
+        return true;
     if ((event.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
         return false;
     if (event.key() == Qt::Key_Return || event.key() == Qt::Key_Enter) {
@@ -358,6 +365,17 @@ bool TableView::useRowKey(const QKeyEvent& event, int row)
         return true;
     }
     return scrollSideways(row, event.key());
+}
+
+bool TableView::runAction(const QKeyEvent& event, int row)
+{
+    const QKeySequence pressed(event.keyCombination());
+    for (const RowAction& action : _dataSource->actionsForRow({0, row}))
+        if (action.key == pressed) {
+            action.run();
+            return true;
+        }
+    return false;
 }
 
 bool TableView::scrollSideways(int row, int key)
@@ -392,18 +410,45 @@ void TableView::contextMenuEvent(QContextMenuEvent* event)
 {
     if (event->reason() == QContextMenuEvent::Mouse)
         _current = rowAtPosition(event->pos());
-    if (!_current || _dataSource->textForCopying({0, *_current}).isEmpty())
+    if (_current)
+        showMenu(*_current, event->globalPos());
+}
+
+void TableView::timerEvent(QTimerEvent* event)
+{
+    if (event->timerId() != _longPress.timerId())
+        return QAbstractScrollArea::timerEvent(event);
+    _longPress.stop();
+    const std::optional<int> row = std::exchange(_pressed, std::nullopt);
+    updateLooks();
+    if (row)
+        showMenu(*row, viewport()->mapToGlobal(_pressPosition));
+}
+
+void TableView::showMenu(int row, const QPoint& globalPosition)
+{
+    _current = row;
+    const std::vector<RowAction> actions = _dataSource->actionsForRow({0, row});
+    const bool canCopy = !_dataSource->textForCopying({0, row}).isEmpty();
+    if (!canCopy && actions.empty())
         return;
     auto* menu = new QMenu(this);
     menu->setAttribute(Qt::WA_DeleteOnClose);
-    QAction* copy = menu->addAction(QStringLiteral("Copy"));
-    copy->setShortcut(QKeySequence::Copy);
-    // The row may have moved by then, and the current one with it.
-    connect(copy, &QAction::triggered, this, [this] {
-        if (_current)
-            copyRow({0, *_current});
-    });
-    menu->popup(event->globalPos());
+    if (canCopy) {
+        QAction* copy = menu->addAction(QStringLiteral("Copy"));
+        copy->setShortcut(QKeySequence::Copy);
+        // The row may have moved by then, and the current one with it.
+        connect(copy, &QAction::triggered, this, [this] {
+            if (_current)
+                copyRow({0, *_current});
+        });
+    }
+    for (const RowAction& action : actions) {
+        QAction* item = menu->addAction(action.text);
+        item->setShortcut(action.key);
+        connect(item, &QAction::triggered, this, action.run);
+    }
+    menu->popup(globalPosition);
 }
 
 void TableView::focusInEvent(QFocusEvent* event)

@@ -3,6 +3,8 @@
 #include "App/Toolkit/TableRow.h"
 
 #include <QAbstractScrollArea>
+#include <QBasicTimer>
+#include <QKeySequence>
 
 #include <deque>
 #include <functional>
@@ -23,6 +25,13 @@ struct IndexPath {
 
 class TableView;
 
+/// What can be done with a row, from its menu or by a key.
+struct RowAction {
+    QString text;
+    QKeySequence key;
+    std::function<void()> run;
+};
+
 /// What a table shows; it outlives the table's use of it.
 class TableViewDataSource
 {
@@ -36,13 +45,16 @@ class TableViewDataSource
     virtual void rowWillBeReused(TableRow&) {}
     /// What copying the row puts on the clipboard; nothing is copied where it is empty.
     virtual QString textForCopying(IndexPath) { return {}; }
+    /// What can be done with the row besides.
+    virtual std::vector<RowAction> actionsForRow(IndexPath) { return {}; }
 };
 
 /// A plain list of rows of one height in one section. Only the rows in view exist; those that leave
 /// it wait to be used again.
 ///
 /// One row is the current one: the row touched last, or the one that the keyboard has gone to.
-/// Ctrl+C and the context menu copy it.
+/// Ctrl+C and the context menu copy it, and do with it what else its data source offers. A long
+/// press opens that menu, too.
 class TableView : public QAbstractScrollArea
 {
   public:
@@ -94,6 +106,7 @@ class TableView : public QAbstractScrollArea
     void focusInEvent(QFocusEvent* event) override;
     void focusOutEvent(QFocusEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
+    void timerEvent(QTimerEvent* event) override;
 
   private:
     struct RowRange {
@@ -121,6 +134,8 @@ class TableView : public QAbstractScrollArea
     bool useKey(const QKeyEvent& event);
     bool useRowKey(const QKeyEvent& event, int row);
     bool scrollSideways(int row, int key);
+    bool runAction(const QKeyEvent& event, int row);
+    void showMenu(int row, const QPoint& globalPosition);
 
     TableViewDataSource* _dataSource = nullptr;
     int _rowCount = 0;
@@ -131,6 +146,7 @@ class TableView : public QAbstractScrollArea
     std::optional<int> _selected;
     std::optional<int> _pressed;
     QPoint _pressPosition;
+    QBasicTimer _longPress;
     // Where the keyboard is; its frame shows once a key has been used.
     std::optional<int> _current;
     bool _showsKeyboardFrame = false;

@@ -145,6 +145,6 @@ TEST_P(DoubtAtWidthTest, OrdinaryRowsAreSetOutAsEver)
     EXPECT_EQ(value.right() + 1, GetParam() - 10);
 }
 
-INSTANTIATE_TEST_SUITE_P(NarrowAndWide, DoubtAtWidthTest, testing::Values(320, 390, 840));
+INSTANTIATE_TEST_SUITE_P(NarrowAndWide, DoubtAtWidthTest, testing::Values(320, 390, 839));
 
 } // namespace ventrik

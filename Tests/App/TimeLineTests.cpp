@@ -1,8 +1,12 @@
+#include "App/Strip/SignalStrip.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/PacketBuilder.h"
 #include "Tests/App/AppFixture.h"
 #include "Tests/Support/IdleGenerator.h"
 
+#include <QApplication>
+#include <QMenu>
+#include <QPushButton>
 #include <QTest>
 
 #include <array>
@@ -279,6 +283,235 @@ TEST_F(OpenedWindowTest, EndsWhileItReads)
     window.applicationWillTerminate();
     fake.mainQueue.run();
     EXPECT_EQ(window.window(), nullptr);
+}
+
+namespace
+{
+
+/// A window of some width, with the values of one cell.
+class TimeLineWindowTest : public AppFixture
+{
+  protected:
+    static VentrikAppOptions optionsOf(int width)
+    {
+        VentrikAppOptions options;
+        options.animation = false;
+        options.windowSize = QSize(width, 640);
+        return options;
+    }
+    VentrikApp& launch(int width, bool withTimeLine = true)
+    {
+        VentrikAppOptions options = optionsOf(width);
+        options.timeLine = withTimeLine;
+        window.emplace(fake.platform(), options);
+        window->applicationDidFinishLaunching();
+        fake.mainQueue.run();
+        EXPECT_TRUE(fake.ports.deliver(logChannelLocalPortName, 0,
+                                       PacketBuilder(0xB0C2).u16(14, 301).size(38).build()));
+        fake.mainQueue.advance(2s);
+        return *window;
+    }
+    void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier)
+    {
+        EXPECT_TRUE(QTest::qWaitForWindowActive(window->window()));
+        QTest::keyClick(window->window()->focusWidget(), key, modifiers);
+    }
+    bool showsTimeLine() { return window->timeLineView()->isVisible(); }
+    int panesWidth() { return window->navController()->width(); }
+    std::vector<std::string> screenTitles()
+    {
+        std::vector<std::string> result;
+        for (const Screen* screen : window->navController()->screens())
+            result.push_back(screen->title().toStdString());
+        return result;
+    }
+    void resize(int width)
+    {
+        window->window()->resize(width, 640);
+        QTest::qWait(0);
+    }
+    VentrikPaneController& top()
+    {
+        return static_cast<VentrikPaneController&>(window->navController()->topScreen());
+    }
+    void openFirstRow() { top().rowSelected(top().table(), IndexPath{0, 0}); }
+    static QWidget* waitForPopup()
+    {
+        EXPECT_TRUE(QTest::qWaitFor([] { return QApplication::activePopupWidget(); }));
+        return QApplication::activePopupWidget();
+    }
+    std::size_t pins() { return window->timeLine().series().series().size(); }
+
+    std::optional<VentrikApp> window;
+};
+
+constexpr const char* cellTemplate = "<plist><dict><key>Serving Cell Info</key><dict>"
+                                     "<key>Physical Cell ID</key><string>-</string>"
+                                     "<key>Name</key><string>of no number</string>"
+                                     "</dict></dict></plist>";
+
+} // namespace
+
+TEST_F(TimeLineWindowTest, StandsBesidePanesOfAPhonesWidthInAWideWindow)
+{
+    launch(840);
+    EXPECT_TRUE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 390);
+    EXPECT_GE(window->timeLineView()->x(), 390);
+    EXPECT_EQ(window->timeLineView()->geometry().right(), 839);
+}
+
+TEST_F(TimeLineWindowTest, LeavesANarrowWindowAsItIs)
+{
+    launch(839);
+    EXPECT_FALSE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 839);
+}
+
+TEST_F(TimeLineWindowTest, ComesAndGoesWithTheWindowsWidth)
+{
+    launch(839);
+    resize(900);
+    EXPECT_TRUE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 390);
+    resize(500);
+    EXPECT_FALSE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 500);
+}
+
+TEST_F(TimeLineWindowTest, IsHiddenAndShownByAKeyWhichIsRemembered)
+{
+    launch(900);
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_FALSE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 900);
+    window->applicationWillTerminate();
+    launch(900);
+    EXPECT_FALSE(showsTimeLine());
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_TRUE(showsTimeLine());
+    window->applicationWillTerminate();
+    launch(900);
+    EXPECT_TRUE(showsTimeLine());
+}
+
+TEST_F(TimeLineWindowTest, IsNotThereFromTheStartWhereThatIsSaid)
+{
+    launch(900, false);
+    EXPECT_FALSE(showsTimeLine());
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_TRUE(showsTimeLine());
+}
+
+TEST_F(TimeLineWindowTest, IsAScreenOfItsOwnInANarrowWindow)
+{
+    launch(480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik", "Time Line"));
+    EXPECT_TRUE(showsTimeLine());
+    EXPECT_EQ(window->timeLineView()->width(), 480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik"));
+    EXPECT_FALSE(showsTimeLine());
+}
+
+TEST_F(TimeLineWindowTest, LeavesItsScreenByTheWayBack)
+{
+    launch(480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    press(Qt::Key_Escape);
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik"));
+    press(Qt::Key_T, Qt::ControlModifier);
+    EXPECT_TRUE(showsTimeLine());
+}
+
+TEST_F(TimeLineWindowTest, GoesBesideThePanesWhenTheWindowBecomesWide)
+{
+    launch(480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    resize(900);
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik"));
+    EXPECT_TRUE(showsTimeLine());
+    EXPECT_EQ(panesWidth(), 390);
+}
+
+TEST_F(TimeLineWindowTest, OutlivesTheEndOfTheApplicationInEitherPlace)
+{
+    launch(480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    window->applicationWillTerminate();
+    EXPECT_EQ(window->timeLineView(), nullptr);
+}
+
+TEST_F(TimeLineWindowTest, ANumberIsPinnedByAKeyAndUnpinnedByIt)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    const std::size_t before = pins();
+    openFirstRow();
+    press(Qt::Key_Down);
+    press(Qt::Key_P);
+    ASSERT_EQ(pins(), before + 1);
+    EXPECT_EQ(window->timeLine().series().series().back().pin.path,
+              "/Serving Cell Info/Physical Cell ID");
+    EXPECT_EQ(window->timeLine().series().series().back().points.size(), 1U);
+    press(Qt::Key_P);
+    EXPECT_EQ(pins(), before);
+}
+
+TEST_F(TimeLineWindowTest, PinsAreKeptForTheNextTime)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    window->togglePin("/Serving Cell Info/Physical Cell ID");
+    window->togglePin("/Serving Cell Measurements/Measured RSSI");
+    const std::size_t count = pins();
+    window->applicationWillTerminate();
+    launch(900);
+    EXPECT_EQ(pins(), count);
+    EXPECT_TRUE(window->isPinned("/Serving Cell Info/Physical Cell ID"));
+    EXPECT_FALSE(window->isPinned("/Serving Cell Measurements/Measured RSSI"));
+    EXPECT_TRUE(window->isPinned("/Serving Cell Measurements/Measured RSRP"));
+}
+
+TEST_F(TimeLineWindowTest, WhatIsNoNumberCannotBePinned)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    EXPECT_FALSE(window->canPin("/Serving Cell Info/Name"));
+    EXPECT_FALSE(window->canPin("/Serving Cell Info"));
+    window->togglePin("/Serving Cell Info/Name");
+    EXPECT_FALSE(window->isPinned("/Serving Cell Info/Name"));
+}
+
+TEST_F(TimeLineWindowTest, ALongPressOffersWhatCanBeDoneWithARow)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(480);
+    openFirstRow();
+    const std::size_t before = pins();
+    QTest::mousePress(top().table().viewport(), Qt::LeftButton, {}, QPoint(50, 20));
+    const auto* menu = qobject_cast<QMenu*>(waitForPopup());
+    ASSERT_NE(menu, nullptr);
+    ASSERT_EQ(menu->actions().size(), 2);
+    EXPECT_EQ(menu->actions()[0]->text(), "Copy");
+    EXPECT_EQ(menu->actions()[1]->text(), "Pin to the Time Line");
+    menu->actions()[1]->trigger();
+    EXPECT_EQ(pins(), before + 1);
+}
+
+TEST_F(TimeLineWindowTest, ThePauseButtonFreezesAndLeadsBack)
+{
+    launch(900);
+    QPushButton& button = *window->timeLineView()->findChild<QPushButton*>();
+    EXPECT_EQ(button.text(), "Pause");
+    button.click();
+    EXPECT_TRUE(window->timeLine().isPaused());
+    EXPECT_EQ(button.text(), "Live");
+    EXPECT_EQ(window->timeLineView()->strip().cursor(), window->timeLine().pausedAt());
+    button.click();
+    EXPECT_FALSE(window->timeLine().isPaused());
+    EXPECT_EQ(window->timeLineView()->strip().cursor(), std::nullopt);
 }
 
 } // namespace ventrik

@@ -1,0 +1,114 @@
+#include "App/TimeLineView.h"
+
+#include "App/Strip/SignalStrip.h"
+#include "App/Toolkit/Fonts.h"
+#include "App/Toolkit/PushButton.h"
+#include "App/Toolkit/Separator.h"
+#include "App/Toolkit/TitleBar.h"
+
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QMenu>
+#include <QPainter>
+#include <QVBoxLayout>
+
+#include <algorithm>
+#include <utility>
+
+namespace ventrik
+{
+
+namespace
+{
+
+constexpr int barMargin = 10;
+constexpr int statusPoints = 14;
+
+/// The bar along the top, as that of the panes beside it.
+class TimeLineBar : public QWidget
+{
+  public:
+    explicit TimeLineBar(QWidget* parent) : QWidget(parent)
+    {
+        setFixedHeight(TitleBar::barHeight);
+        setAutoFillBackground(true);
+    }
+
+  protected:
+    void paintEvent(QPaintEvent*) override
+    {
+        QPainter(this).fillRect(0, height() - 1, width(), 1, separatorColor(palette()));
+    }
+};
+
+} // namespace
+
+TimeLineView::TimeLineView(TimeLine& timeLine, const Clock& clock)
+    : _timeLine(timeLine),
+      _clock(clock),
+      _status(makeLabel(systemFont(statusPoints, FontWeight::Regular), nullptr)),
+      _pause(new PushButton),
+      _menu(new PushButton(QStringLiteral("More"))),
+      _strip(new SignalStrip(this))
+{
+    setAccessibleName(QStringLiteral("Time line"));
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(makeBar());
+    layout->addWidget(_strip, 1);
+    setFocusProxy(_strip);
+    _status->setAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+}
+
+QWidget* TimeLineView::makeBar()
+{
+    auto* bar = new TimeLineBar(this);
+    auto* layout = new QHBoxLayout(bar);
+    layout->setContentsMargins(barMargin, 0, barMargin, 0);
+    layout->addWidget(_status, 1);
+    layout->addWidget(_pause);
+    layout->addWidget(_menu);
+    connect(_pause, &QPushButton::clicked, this, [this] {
+        if (_listener.onPause)
+            _listener.onPause();
+    });
+    return bar;
+}
+
+void TimeLineView::setListener(TimeLineListener listener)
+{
+    _listener = std::move(listener);
+    _strip->setListener({[this](Clock::TimePoint time) { _timeLine.showTime(time); },
+                         [this] {
+                             if (_listener.onLive)
+                                 _listener.onLive();
+                         }});
+}
+
+void TimeLineView::setStatus(const QString& text, bool isPaused, const QString& live)
+{
+    _status->setText(text);
+    _pause->setText(isPaused ? live : QStringLiteral("Pause"));
+}
+
+void TimeLineView::update()
+{
+    updateStrip();
+}
+
+void TimeLineView::updateStrip()
+{
+    StripData shown;
+    for (const PinnedSeries::Series& series : _timeLine.series().series())
+        shown.lines.push_back({series.pin.name, series.unit, series.points});
+    shown.first = _timeLine.store().firstTime();
+    // Where nothing comes the present goes on.
+    shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()
+                                      : std::max(_timeLine.store().lastTime(), _clock.now());
+    _strip->setSecondsFromUtc(_clock.timeZone(shown.last).secondsFromUtc);
+    _strip->setData(std::move(shown));
+    _strip->setCursor(_timeLine.pausedAt());
+}
+
+} // namespace ventrik

@@ -4,6 +4,7 @@
 #include "Model/DisplayNames.h"
 #include "Model/NodeRows.h"
 #include "Model/PathIndex.h"
+#include "Model/StoredNumber.h"
 #include "Packets/ChannelNumbers.h"
 
 #include <algorithm>
@@ -75,25 +76,6 @@ ChannelFrequency frequencyOf(CellSystem system, std::int64_t channel, GSMBandHin
 }
 
 // ---- Values
-
-struct ShownNumber {
-    double number;
-    std::string_view unit;
-};
-
-// Where no field shows, the text is all there is: a number, a blank, a unit.
-std::optional<ShownNumber> numberOf(const StoredValue& shown)
-{
-    if (shown.number)
-        return ShownNumber{*shown.number, shown.unit};
-    if (shown.field)
-        return std::nullopt;
-    const std::size_t end = std::min(shown.text.find(' '), shown.text.size());
-    const auto number = plainNumber(shown.text.substr(0, end));
-    if (!number)
-        return std::nullopt;
-    return ShownNumber{*number, shown.text.substr(std::min(end + 1, shown.text.size()))};
-}
 
 // Repetitions are noted so often; what is older than that by less may be as new.
 constexpr std::chrono::seconds timeGrain{1};
@@ -178,7 +160,7 @@ Clock::TimePoint CellReader::readChannel(const CellPlaces& place, const std::str
                                          CellRow& row)
 {
     const auto* value = valueOf(place.names.channel, path);
-    const auto number = value ? numberOf(value->shown) : std::nullopt;
+    const auto number = value ? storedNumber(value->shown) : std::nullopt;
     if (!number)
         return {};
     row.channel = static_cast<std::int64_t>(number->number);
@@ -201,7 +183,7 @@ void CellReader::readBand(const CellPlaces& place, const std::string& path, Cell
 std::optional<CellLevel> CellReader::levelOf(const DisplayMoment::Value& value,
                                              std::string_view name, CellRow& row) const
 {
-    const auto shown = numberOf(value.shown);
+    const auto shown = storedNumber(value.shown);
     if (!shown || !std::isfinite(shown->number))
         return std::nullopt;
     row.told = value.written;

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "Model/ChangeStore.h"
+#include "Model/PathSelection.h"
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace ventrik
+{
+
+/// A threshold for the numbers at some paths.
+struct Alert {
+    enum class Comparison : std::uint8_t { Below, AtMost, Above, AtLeast };
+
+    PathSelection paths;
+    Comparison comparison;
+    double threshold;
+    std::string condition; ///< as it was written, "< -110"
+
+    bool isBeyond(double number) const;
+};
+
+/// An alert, or one line that says what is wrong with its text.
+struct AlertReading {
+    std::optional<Alert> alert;
+    std::string error;
+};
+
+/// Of "PATH < NUMBER", "<=", ">" or ">=". Paths hold "*" and "**" as those of a PathSelection do.
+/// What the comparison is stands last: names may hold one as well.
+AlertReading parseAlert(std::string_view text);
+
+/// Follows the numbers at an alert's paths and fires when one crosses its threshold: not for one
+/// that was beyond from the start or stays so, and again only when it has come back in between.
+class AlertWatch
+{
+  public:
+    explicit AlertWatch(Alert alert) : _alert(std::move(alert)) {}
+
+    const Alert& alert() const { return _alert; }
+    /// True when it fires. Places are those of the store that shows the value.
+    bool take(PlaceId place, const PlaceTable& places, const StoredValue& shown);
+    /// The places have new numbers.
+    void forgetPlaces() { _states.clear(); }
+
+  private:
+    enum class State : std::uint8_t { Unknown, NotWatched, Within, Beyond };
+
+    State& stateOf(PlaceId place, const PlaceTable& places);
+
+    Alert _alert;
+    std::vector<State> _states; // by place
+};
+
+} // namespace ventrik

@@ -39,6 +39,12 @@ void TimeLine::showTime(Clock::TimePoint time)
         showMoment(_store.momentAt(time), std::clamp(time, _store.firstTime(), _store.lastTime()));
 }
 
+void TimeLine::showEvent(const Event& event)
+{
+    if (!_store.isEmpty())
+        showMoment(std::min(event.moment, _store.present()), event.time);
+}
+
 void TimeLine::showMoment(std::uint64_t moment, Clock::TimePoint time)
 {
     // Nothing stands before the first change.
@@ -60,11 +66,12 @@ void TimeLine::goLive()
         _momentChanged();
 }
 
-void TimeLine::update()
+std::vector<Event> TimeLine::update()
 {
     usePins();
     _series.update();
     _newest = nullptr;
+    return _events.update();
 }
 
 // Those of the preferences, where there are any; a line each.

@@ -2,6 +2,7 @@
 
 #include "Model/ChangeStore.h"
 #include "Model/DisplayMoment.h"
+#include "Model/EventLog.h"
 #include "Model/PinnedSeries.h"
 #include "Platform/Clock.h"
 #include "Platform/Preferences.h"
@@ -22,8 +23,11 @@ class TimeLine
 {
   public:
     /// Both outlive it.
-    TimeLine(const ChangeStore& store, Preferences& preferences)
-        : _store(store), _preferences(preferences), _series(store)
+    TimeLine(const ChangeStore& store, Preferences& preferences, std::vector<Alert> alerts = {})
+        : _store(store),
+          _preferences(preferences),
+          _series(store),
+          _events(store, std::move(alerts))
     {
     }
 
@@ -38,18 +42,21 @@ class TimeLine
     void pause();
     void togglePause();
     void showTime(Clock::TimePoint time);
+    /// After what happened there.
+    void showEvent(const Event& event);
     void goLive();
     /// What is shown while it is paused; null otherwise.
     DisplayMoment* past() const { return _past.get(); }
     /// The moment to which the user has gone, which may lie between two changes.
     std::optional<Clock::TimePoint> pausedAt() const { return _pausedAt; }
 
-    /// Takes what is new in the store.
-    void update();
+    /// Takes what is new in the store, and tells what happened.
+    std::vector<Event> update();
     /// The display as it is shown: that of the pause, or as it was at the last update.
     DisplayMoment& shown();
     const ChangeStore& store() const { return _store; }
     const PinnedSeries& series() const { return _series; }
+    const EventLog& events() const { return _events; }
 
     /// Whether a number stands at a path that can be drawn over time.
     bool canPin(const std::string& path);
@@ -66,6 +73,7 @@ class TimeLine
     const ChangeStore& _store;
     Preferences& _preferences;
     PinnedSeries _series;
+    EventLog _events;
     std::vector<Pin> _pins;
     std::string _technology; // whose pins these are
     std::function<void()> _momentChanged;

@@ -102,6 +102,9 @@ void TimeLineView::updateStrip()
     StripData shown;
     for (const PinnedSeries::Series& series : _timeLine.series().series())
         shown.lines.push_back({series.pin.name, series.unit, series.points});
+    for (const Event& event : _timeLine.events().events())
+        if (event.isMark)
+            shown.marks.push_back({event.time, event.text});
     shown.first = _timeLine.store().firstTime();
     // Where nothing comes the present goes on.
     shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()

@@ -125,8 +125,15 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
         return hear(logCode);
     if (_chunks.empty())
         beginChunk();
-    beginMessage(message, logCode);
-    takeChanges(changes, state);
+    if (std::exchange(_isFirstDisplay, false)) {
+        takeFirst(changes, message, logCode, state);
+    } else {
+        beginMessage(message, logCode);
+        for (const DisplayChange& change : changes)
+            take(change, state);
+        if (_changes->takeReordered())
+            writeKeyState(state);
+    }
     hear(logCode);
     endChunkIfFull(state);
     keepWithin();
@@ -172,15 +179,24 @@ void ChangeStore::beginMessage(ByteView message, std::uint32_t logCode)
     chunk.lastTime = _lastTime;
 }
 
-void ChangeStore::takeChanges(std::span<const DisplayChange> changes, const PlistDictionary& state)
+// A display that is new also shows what no record told. The cell monitor's messages tell it all.
+void ChangeStore::takeFirst(std::span<const DisplayChange> changes, ByteView message,
+                            std::uint32_t logCode, const PlistDictionary& state)
 {
+    const auto isTold = [&](const DisplayChange& change) {
+        return _wanted.wantsAll() || _changes->cellAt(*change.place, state).has_value();
+    };
+    beginMessage({}, 0);
     for (const DisplayChange& change : changes)
-        take(change, state);
-    const bool isFirst = std::exchange(_isFirstDisplay, false);
-    if (isFirst)
-        removeWhatIsNotShown(state);
-    if (_changes->takeReordered() || isFirst)
-        writeKeyState(state);
+        if (!isTold(change))
+            take(change, state);
+    removeWhatIsNotShown(state);
+    beginMessage(message, logCode);
+    for (const DisplayChange& change : changes)
+        if (isTold(change))
+            take(change, state);
+    _changes->takeReordered();
+    writeKeyState(state);
 }
 
 // What the generator before showed stands no more where this one has nothing.

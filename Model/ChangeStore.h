@@ -186,7 +186,8 @@ class ChangeStore : public MessageObserver
 
     std::uint32_t codeOf(ByteView message) const;
     void hear(std::uint32_t logCode);
-    void takeChanges(std::span<const DisplayChange> changes, const PlistDictionary& state);
+    void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
+                   const PlistDictionary& state);
     void beginMessage(ByteView message, std::uint32_t logCode);
     void take(const DisplayChange& change, const PlistDictionary& state);
     void show(const DisplayPlace& place, const PlistDictionary& state);

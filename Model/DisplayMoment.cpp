@@ -221,6 +221,12 @@ std::string_view DisplayMoment::doubtAt(const std::string& path) const
                : std::string_view();
 }
 
+std::vector<std::string_view> DisplayMoment::keysAt(const std::string& path) const
+{
+    build();
+    return _content->index.keysOf(path);
+}
+
 const DisplayMoment::Value* DisplayMoment::valueAt(const std::string& path) const
 {
     build();

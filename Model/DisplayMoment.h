@@ -7,6 +7,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace ventrik
 {
@@ -39,6 +40,10 @@ class DisplayMoment : public DisplayTree
     std::string_view doubtAt(const std::string& path) const override;
     /// Null where no value stands.
     const Value* valueAt(const std::string& path) const;
+
+    /// The keys and row numbers on the way there, from the outside in; empty where nothing stands.
+    /// They last as long as this does.
+    std::vector<std::string_view> keysAt(const std::string& path) const;
 
   private:
     void build() const;

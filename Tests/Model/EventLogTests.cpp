@@ -156,6 +156,31 @@ TEST_F(EventLogTest, TellsTheStatesOfGSMByTheirPanes)
     EXPECT_EQ(log.events()[3].path, "/Registration/Process PS");
 }
 
+TEST_F(EventLogTest, KeepsKindsApartThatOnePaneShows)
+{
+    use("gsm");
+    const auto display = [](std::string_view rr, std::string_view mode) {
+        return PlistDictionary{
+            {"Serving Cell", PlistDictionary{{"GSM RR Info", PlistDictionary{{"RR State", rr},
+                                                                             {"RR Mode", mode}}}}}};
+    };
+    show(display("RR_IDLE", "Data"));
+    EXPECT_THAT(
+        eventsOf(display("RR_DATA_TRANSFER", "Voice")),
+        ElementsAre("RRC: RR State RR_IDLE → RR_DATA_TRANSFER", "Call: RR Mode Data → Voice"));
+}
+
+TEST_F(EventLogTest, RemembersTheServingCellWhereAnotherPlaceDoesNotTellIt)
+{
+    use("lte");
+    PlistDictionary display = lteCell("301", "1300");
+    show(display);
+    display.set("Serving Cell Measurements", PlistDictionary{{"E-ARFCN", "1300"}});
+    EXPECT_THAT(eventsOf(display), IsEmpty());
+    display.set("Serving Cell Info", *lteCell("302", "1300").find("Serving Cell Info"));
+    EXPECT_THAT(eventsOf(display), ElementsAre("Cell: PCI 301 → 302"));
+}
+
 TEST_F(EventLogTest, TellsWhichServingCellOfTwoSystemsIsAnother)
 {
     use("gsm");
@@ -236,7 +261,8 @@ TEST_F(EventLogTest, TellsTheDataSessionsTogether)
     EXPECT_THAT(eventsOf(sessions({"internet"})),
                 ElementsAre("Data: Contexts ims, internet → internet"));
     EXPECT_THAT(eventsOf(sessions({})), ElementsAre("Data: Contexts internet → none"));
-    EXPECT_THAT(eventsOf(PlistDictionary{{"a", "b"}}), IsEmpty());
+    EXPECT_THAT(eventsOf(sessions({"ims"})), ElementsAre("Data: Contexts none → ims"));
+    EXPECT_THAT(eventsOf(PlistDictionary{{"a", "b"}}), ElementsAre("Data: Contexts ims → none"));
     EXPECT_THAT(eventsOf(sessions({"ims"})), ElementsAre("Data: Contexts none → ims"));
 }
 
@@ -390,11 +416,13 @@ TEST_F(SmallStoreEventLogTest, TellsTheTechnologyThatCameUnseen)
 
 TEST_F(SmallStoreEventLogTest, FollowsAStoreThatBeganAnew)
 {
-    EventLog log(store);
+    EventLog log(store, {*parseAlert("/**/Physical Cell ID > 400").alert});
     store.useGenerator(&generator, "lte");
-    PlistDictionary display = lteCell("301", "1300");
+    PlistDictionary display{{"First", "1"}};
+    display.set("Serving Cell Info", *lteCell("301", "1300").find("Serving Cell Info"));
     show(display);
     log.update();
+    display.remove("First"); // places after it get other numbers
     for (int i = 0; store.generation() == 0 && i < 20000; ++i) {
         display.set(fmt::format("Name {}", i), "1");
         show(display);
@@ -403,9 +431,26 @@ TEST_F(SmallStoreEventLogTest, FollowsAStoreThatBeganAnew)
     ASSERT_EQ(store.generation(), 1U);
     show(display);
     EXPECT_THAT(linesOf(log.update()), IsEmpty());
-    display.set("Serving Cell Info", *lteCell("302", "1300").find("Serving Cell Info"));
+    display.set("Serving Cell Info", *lteCell("402", "1300").find("Serving Cell Info"));
     show(display);
-    EXPECT_THAT(linesOf(log.update()), ElementsAre("Cell: PCI 301 → 302"));
+    EXPECT_THAT(linesOf(log.update()),
+                ElementsAre("Cell: PCI 301 → 402", "Alert: Physical Cell ID is 402 (> 400)"));
+}
+
+TEST_F(SmallStoreEventLogTest, LooksForTheValuesOfAnotherTechnology)
+{
+    EventLog log(store);
+    const PlistDictionary info{{"Physical Cell ID", "301"}, {"Cell Scrambling Code", "31"}};
+    store.useGenerator(&generator, "lte");
+    show(PlistDictionary{{"Serving Cell Info", info}});
+    log.update();
+    store.useGenerator(&generator, "utran");
+    show(PlistDictionary{{"Serving Cell Info", info}, {"a", "b"}});
+    log.update();
+    const PlistDictionary other{{"Physical Cell ID", "302"}, {"Cell Scrambling Code", "47"}};
+    show(PlistDictionary{{"Serving Cell Info", other}, {"a", "b"}});
+    show(PlistDictionary{{"Serving Cell Info", info}, {"a", "b"}});
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Cell: CPI 47 → 31"));
 }
 
 } // namespace ventrik

@@ -1,5 +1,6 @@
 #include "App/VentrikApp.h"
 
+#include "App/OriginScreen.h"
 #include "App/Toolkit/PlainText.h"
 #include "Model/ChannelNote.h"
 
@@ -24,6 +25,7 @@ constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
 constexpr auto noteInterval = 1s;
 constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
+constexpr auto staleAge = 10s;
 constexpr auto readingInterval = 500ms;
 
 constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
@@ -46,7 +48,8 @@ VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
     : _platform(platform),
       _options(std::move(options)),
       _channelCounts(_options.records),
-      _store(_options.records, _options.historyLimits)
+      _store(_options.records, _options.historyLimits),
+      _sources(platform.resources, platform.clock, _options.records)
 {
 }
 
@@ -215,6 +218,37 @@ void VentrikApp::togglePin(const std::string& path)
 {
     _timeLine.togglePin(path);
     updateTimeLine();
+}
+
+// What no record told is told by nobody again.
+bool VentrikApp::isStale(const std::string& path)
+{
+    if (_store.isEmpty())
+        return false;
+    const DisplayMoment::Value* value = _timeLine.shown().valueAt(path);
+    const Clock::TimePoint now = _timeLine.pausedAt().value_or(_platform.clock.now());
+    return value && value->logCode != 0 && now - value->written > staleAge;
+}
+
+std::string VentrikApp::briefSourceOf(const std::string& path)
+{
+    const auto source =
+        _store.isEmpty() ? std::nullopt : _sources.find(_timeLine.shown(), _store, path);
+    return source ? source->brief() : std::string();
+}
+
+void VentrikApp::showSourceOf(const std::string& path)
+{
+    if (!_navController)
+        return;
+    _navController->push(
+        std::make_unique<OriginScreen>(*this, _platform.clock,
+                                       [this, path]() -> std::optional<ValueSource> {
+                                           if (_store.isEmpty())
+                                               return std::nullopt;
+                                           return _sources.find(_timeLine.shown(), _store, path);
+                                       }),
+        true);
 }
 
 void VentrikApp::leaveTimeLineScreen()

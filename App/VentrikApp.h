@@ -10,6 +10,7 @@
 #include "App/ViewerWindow.h"
 #include "Model/ChannelPane.h"
 #include "Model/OpenedSource.h"
+#include "Model/ValueSource.h"
 #include "Platform/Platform.h"
 
 #include <QPointer>
@@ -110,6 +111,9 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     bool canPin(const std::string& path) override { return _timeLine.canPin(path); }
     bool isPinned(const std::string& path) const override { return _timeLine.isPinned(path); }
     void togglePin(const std::string& path) override;
+    bool isStale(const std::string& path) override;
+    std::string briefSourceOf(const std::string& path) override;
+    void showSourceOf(const std::string& path) override;
     StatusNote statusNote() const override;
     std::string reasonForNoData() const override;
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
@@ -147,6 +151,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     ChannelCounts _channelCounts;
     ChangeStore _store;
     TimeLine _timeLine{_store, _platform.preferences};
+    ValueSources _sources;
     std::unique_ptr<DateFormatter> _pauseFormatter;
     QPointer<TimeLineView> _timeLineView;     // the window's
     QPointer<TimeLineScreen> _timeLineScreen; // while the stack has one

@@ -6,11 +6,14 @@
 #include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/Transition.h"
 
+#include <QHelpEvent>
 #include <QLabel>
 #include <QPainter>
 #include <QTimerEvent>
+#include <QToolTip>
 
 #include <algorithm>
+#include <utility>
 
 namespace ventrik
 {
@@ -25,6 +28,7 @@ constexpr int scrolledHeight = 50;
 constexpr int sidewaysStep = 40;
 constexpr int tintMilliseconds = 900;
 constexpr int tintMargin = 5;
+constexpr float faintness = 0.6F;
 
 QFont boldFont()
 {
@@ -83,6 +87,31 @@ void VentrikCell::setDoubt(const QString& line)
         return;
     setToolTip(plainToolTip(line));
     setAccessibleDescription(line);
+}
+
+void VentrikCell::setFaint(bool isFaint)
+{
+    if (!_value || std::exchange(_isFaint, isFaint) == isFaint)
+        return;
+    QPalette colors;
+    if (isFaint) {
+        QColor color = palette().color(QPalette::WindowText);
+        color.setAlphaF(faintness);
+        colors.setColor(QPalette::WindowText, color);
+    }
+    _value->setPalette(isFaint ? colors : QPalette());
+}
+
+bool VentrikCell::event(QEvent* event)
+{
+    if (event->type() != QEvent::ToolTip || !_tipSource)
+        return TableRow::event(event);
+    const QString source = _tipSource();
+    if (source.isEmpty())
+        return TableRow::event(event);
+    const QString tip = toolTip().isEmpty() ? source : toolTip() + u'\n' + source;
+    QToolTip::showText(static_cast<QHelpEvent*>(event)->globalPos(), tip, this);
+    return true;
 }
 
 void VentrikCell::tintValue()

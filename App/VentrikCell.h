@@ -4,6 +4,7 @@
 
 #include <QBasicTimer>
 
+#include <functional>
 #include <memory>
 
 class QLabel;
@@ -36,6 +37,11 @@ class VentrikCell : public TableRow
     /// What is wrong with the value, told by the tool tip and to assistive technology; empty when
     /// nothing is. Does nothing in a row that has no value.
     void setDoubt(const QString& line);
+    /// What the tool tip says besides, asked for when it opens; nothing where it is empty.
+    void setTipSource(std::function<QString()> source) { _tipSource = std::move(source); }
+    /// A value that was not told for long is a little fainter.
+    void setFaint(bool isFaint);
+    bool isFaint() const { return _isFaint; }
     bool isInDoubt() const { return _value && !accessibleDescription().isEmpty(); }
     /// Tints the value for a moment, unless the platform asks for less motion.
     void tintValue();
@@ -53,6 +59,7 @@ class VentrikCell : public TableRow
     void layoutSubviews() override;
 
   protected:
+    bool event(QEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
     void timerEvent(QTimerEvent* event) override;
 
@@ -75,6 +82,8 @@ class VentrikCell : public TableRow
     EdgeFade* _fade;
     Layout _layout = Layout::None;
     QBasicTimer _tintTimer;
+    std::function<QString()> _tipSource;
+    bool _isFaint = false;
 };
 
 } // namespace ventrik

@@ -3,6 +3,7 @@
 #include "App/StatusItems.h"
 #include "App/Toolkit/HorizontalScrollView.h"
 #include "App/Toolkit/NavigationStack.h"
+#include "App/Toolkit/PlainText.h"
 #include "App/Toolkit/PushButton.h"
 #include "App/VentrikCell.h"
 #include "Model/NodeRows.h"
@@ -105,6 +106,7 @@ void VentrikPaneController::createToolbarItems()
 void VentrikPaneController::updateNotes()
 {
     updateStatusNote(toolbar(), _host.statusNote());
+    updateStaleness();
     table().setPlaceholder(reasonForNoRows());
 }
 
@@ -155,9 +157,23 @@ void VentrikPaneController::updateLayoutWarnings()
     setNotice(lines.join(u'\n'));
 }
 
+// Values grow old while nothing comes.
+void VentrikPaneController::updateStaleness()
+{
+    table().forEachRowInView([this](int row, TableRow& cell) {
+        const VentrikModelNode& child = *childAt({0, row});
+        static_cast<VentrikCell&>(cell).setFaint(child.value() && _host.isStale(pathOf(child)));
+    });
+}
+
+std::string VentrikPaneController::pathOf(const VentrikModelNode& child) const
+{
+    return pathJoining(_keyPath, child.displayName());
+}
+
 QString VentrikPaneController::doubtOf(const VentrikModelNode& leaf) const
 {
-    const std::string_view doubt = _host.doubtAt(pathJoining(_keyPath, leaf.displayName()));
+    const std::string_view doubt = _host.doubtAt(pathOf(leaf));
     return QString::fromUtf8(doubt.data(), static_cast<qsizetype>(doubt.size()));
 }
 
@@ -201,6 +217,11 @@ std::unique_ptr<TableRow> VentrikPaneController::rowForIndexPath(TableView& tabl
         const auto offset = _contentOffsets.find(cell->key().text());
         view->setContentOffset(offset == _contentOffsets.end() ? 0 : offset->second);
     }
+    const std::string path = pathOf(child);
+    cell->setFaint(child.value() && _host.isStale(path));
+    cell->setTipSource([&host = _host, path, isLeaf = child.value() != nullptr] {
+        return isLeaf ? plainToolTip(QString::fromStdString(host.briefSourceOf(path))) : QString();
+    });
     if (_host.tintsChanges() && hasChanged(rowsOf(_formerNodes), child, indexPath.row))
         cell->tintValue();
     return cell;
@@ -228,12 +249,17 @@ QString VentrikPaneController::textForCopying(IndexPath indexPath)
 std::vector<RowAction> VentrikPaneController::actionsForRow(IndexPath indexPath)
 {
     const VentrikModelNode& child = *childAt(indexPath);
-    const std::string path = pathJoining(_keyPath, child.displayName());
-    if (!child.value() || !_host.canPin(path))
-        return {};
-    return {{_host.isPinned(path) ? QStringLiteral("Unpin from the Time Line")
-                                  : QStringLiteral("Pin to the Time Line"),
-             QKeySequence(Qt::Key_P), [this, path] { _host.togglePin(path); }}};
+    const std::string path = pathOf(child);
+    std::vector<RowAction> actions;
+    if (child.value() && !_host.briefSourceOf(path).empty())
+        actions.push_back({QStringLiteral("Where It Comes From"),
+                           QKeySequence(Qt::CTRL | Qt::Key_I),
+                           [this, path] { _host.showSourceOf(path); }});
+    if (child.value() && _host.canPin(path))
+        actions.push_back({_host.isPinned(path) ? QStringLiteral("Unpin from the Time Line")
+                                                : QStringLiteral("Pin to the Time Line"),
+                           QKeySequence(Qt::Key_P), [this, path] { _host.togglePin(path); }});
+    return actions;
 }
 
 void VentrikPaneController::rowSelected(TableView& table, std::optional<IndexPath> indexPath)
@@ -245,7 +271,7 @@ void VentrikPaneController::rowSelected(TableView& table, std::optional<IndexPat
         table.deselectRow(*indexPath);
         return;
     }
-    auto pane = initWithNode(_host, child, pathJoining(_keyPath, child->displayName()));
+    auto pane = initWithNode(_host, child, pathOf(*child));
     pane->setStatus(_status, _isLoading);
     navigationStack()->push(std::move(pane), true);
 }

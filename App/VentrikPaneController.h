@@ -30,6 +30,12 @@ class VentrikPaneHost : public DisplayTree
     virtual bool canPin(const std::string&) { return false; }
     virtual bool isPinned(const std::string&) const { return false; }
     virtual void togglePin(const std::string&) {}
+    /// Whether the value there was not told for long.
+    virtual bool isStale(const std::string&) { return false; }
+    /// In one line where the value there comes from; empty where nothing is known of that.
+    virtual std::string briefSourceOf(const std::string&) { return {}; }
+    /// Opens what tells all of it.
+    virtual void showSourceOf(const std::string&) {}
     /// Why there is nothing to show, where a pane has no node that could have rows.
     virtual std::string reasonForNoData() const { return {}; }
 };
@@ -70,6 +76,8 @@ class VentrikPaneController : public TableScreen
 
     void updateTitle();
     void updateLayoutWarnings();
+    void updateStaleness();
+    std::string pathOf(const VentrikModelNode& child) const;
     QString doubtOf(const VentrikModelNode& leaf) const;
     QString reasonForNoRows() const;
     const VentrikModelNode::Children& children() const;

@@ -11,6 +11,7 @@
 
 #include <fmt/chrono.h>
 #include <fmt/format.h>
+#include <fmt/ranges.h>
 
 namespace ventrik
 {
@@ -83,6 +84,25 @@ std::vector<std::pair<std::string, std::string>> ValueSource::lines(const Clock&
     lines.emplace_back("Packet", packet.empty() ? std::string("not kept any more")
                                                 : fmt::format("{} bytes", packet.size()));
     return lines;
+}
+
+std::string ValueSource::brief() const
+{
+    std::vector<std::string> parts;
+    if (record) {
+        parts.push_back(codeText(record->logCode));
+        if (!recordName.empty())
+            parts.back() += " " + recordName;
+        if (record->version)
+            parts.push_back(fmt::format("version {}", *record->version));
+        if (record->layout)
+            parts.push_back(fmt::format("layout {}", nameOf(*record->layout)));
+    }
+    if (raw)
+        parts.push_back("raw " + rawText(*raw));
+    if (bits)
+        parts.push_back(placeText(*bits));
+    return fmt::format("{}", fmt::join(parts, ", "));
 }
 
 bool ValueSource::isMarked(std::size_t byte) const

@@ -36,6 +36,8 @@ struct ValueSource {
     /// The whole packet, so many bytes a line, each behind its offset; those that hold the value
     /// stand in brackets.
     std::string packetText(std::size_t bytesOfLine) const;
+    /// In one line: log code, version, layout, raw number and place; empty where nothing is known.
+    std::string brief() const;
     /// All of it.
     std::string allText(const Clock& clock) const;
     /// Whether a byte of the packet holds some of the value.

@@ -262,6 +262,12 @@ std::optional<int> TableView::rowAtPosition(const QPoint& position) const
     return position.y() >= 0 && row < _rowCount ? std::optional(row) : std::nullopt;
 }
 
+void TableView::forEachRowInView(const std::function<void(int, TableRow&)>& use) const
+{
+    for (const auto& [row, widget] : _rows)
+        use(row, *widget);
+}
+
 void TableView::setHighlighted(std::optional<int> row)
 {
     _pressed = row;

@@ -90,6 +90,7 @@ class TableView : public QAbstractScrollArea
     TableRow* rowAt(IndexPath indexPath) const;
     /// From the top down.
     std::vector<TableRow*> visibleRows() const;
+    void forEachRowInView(const std::function<void(int row, TableRow& widget)>& use) const;
     std::optional<IndexPath> indexPathForCurrentRow() const;
     /// Puts the row's text on the clipboard.
     void copyRow(IndexPath indexPath) const;

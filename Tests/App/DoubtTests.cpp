@@ -56,6 +56,12 @@ class DoubtTest : public AppFixture
         QCoreApplication::sendEvent(&widget, &rests);
         return rests.isAccepted() ? QToolTip::text() : QString();
     }
+    // Of that, what stands before where the value comes from.
+    static QString doubtOver(QWidget& widget)
+    {
+        const QString tip = tipOver(widget);
+        return tip.left(std::max<qsizetype>(0, tip.indexOf("\n0xB0C2")));
+    }
 };
 
 class DoubtAtWidthTest : public DoubtTest, public testing::WithParamInterface<int>
@@ -83,10 +89,10 @@ TEST_F(DoubtTest, OtherRowsHaveNoSign)
 TEST_F(DoubtTest, ThePointerIsToldWhatIsWrongOnAnyPartOfTheRow)
 {
     openCell(504);
-    EXPECT_EQ(tipOver(cell(0)), identityDoubt);
-    EXPECT_EQ(tipOver(*cell(0).value()), identityDoubt);
-    EXPECT_EQ(tipOver(cell(0).key()), identityDoubt);
-    EXPECT_EQ(tipOver(cell(1)), "");
+    EXPECT_EQ(doubtOver(cell(0)), identityDoubt);
+    EXPECT_EQ(doubtOver(*cell(0).value()), identityDoubt);
+    EXPECT_EQ(doubtOver(cell(0).key()), identityDoubt);
+    EXPECT_EQ(doubtOver(cell(1)), "");
 }
 
 TEST_F(DoubtTest, AssistiveTechnologyIsToldWhatIsWrong)
@@ -104,7 +110,7 @@ TEST_F(DoubtTest, TheSignComesAndGoesWithTheValue)
     EXPECT_EQ(cell(0).accessory(), TableRowAccessory::Warning);
     update(503);
     EXPECT_EQ(cell(0).accessory(), TableRowAccessory::None);
-    EXPECT_EQ(tipOver(cell(0)), "");
+    EXPECT_EQ(doubtOver(cell(0)), "");
     EXPECT_EQ(cell(0).accessibleDescription(), "");
 }
 

@@ -493,10 +493,11 @@ TEST_F(TimeLineWindowTest, ALongPressOffersWhatCanBeDoneWithARow)
     QTest::mousePress(top().table().viewport(), Qt::LeftButton, {}, QPoint(50, 20));
     const auto* menu = qobject_cast<QMenu*>(waitForPopup());
     ASSERT_NE(menu, nullptr);
-    ASSERT_EQ(menu->actions().size(), 2);
+    ASSERT_EQ(menu->actions().size(), 3);
     EXPECT_EQ(menu->actions()[0]->text(), "Copy");
-    EXPECT_EQ(menu->actions()[1]->text(), "Pin to the Time Line");
-    menu->actions()[1]->trigger();
+    EXPECT_EQ(menu->actions()[1]->text(), "Where It Comes From");
+    EXPECT_EQ(menu->actions()[2]->text(), "Pin to the Time Line");
+    menu->actions()[2]->trigger();
     EXPECT_EQ(pins(), before + 1);
 }
 

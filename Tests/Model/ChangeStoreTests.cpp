@@ -193,7 +193,7 @@ TEST_F(ChangeStoreTest, TellsWhatTheNextGeneratorDoesNotShow)
     IdleGenerator next;
     store.useGenerator(&next, "gsm");
     show(PlistDictionary{{"a", "1"}, {"c", "3"}});
-    EXPECT_THAT(linesFrom(2), ElementsAre("/c=3", "/b gone"));
+    EXPECT_THAT(linesFrom(2), ElementsAre("/b gone", "/c=3"));
     EXPECT_EQ(treeAt(1s), "Ventrik\n  a: 1\n  c: 3\n");
     EXPECT_EQ(store.technologyAt(2), "lte");
     EXPECT_EQ(store.technologyAt(3), "gsm");

@@ -133,9 +133,9 @@ std::vector<SignalChart::Difference> SignalChart::differences() const
     return rows;
 }
 
-// To the left of both cursors and their readings, between them or to the right, where there is most
-// room; else over the labels of the current values.
-double SignalChart::differenceX(double width, const TextMeasure& measure) const
+// The part of the plot for the box: beside the cursors and their readings, or between them where
+// only that is wide enough.
+Rect SignalChart::roomBesideCursors(double enough, const TextMeasure& measure) const
 {
     const double readings = measure.textWidth("-000.00", _looks.textSize, true) + 16;
     const auto [from, to] = std::minmax(*_content.cursor, *_content.secondCursor);
@@ -143,47 +143,58 @@ double SignalChart::differenceX(double width, const TextMeasure& measure) const
     const double end = std::clamp(_times.x(to), _plot.x, _plot.right());
     const double left = start - readings - _plot.x;
     const double right = _plot.right() - end - readings;
-    const double between = end - start;
-    if (std::max({left, right, between}) < width + 8)
-        return std::max(0.0, _width - width - 2);
-    if (left >= std::max(right, between))
-        return _plot.x + 4;
-    return right >= between ? _plot.right() - width - 4 : (start + end - width) / 2;
+    if (std::max(left, right) < std::min(enough, end - start))
+        return {start, _plot.y, end - start, _plot.height};
+    return left >= right ? Rect{_plot.x, _plot.y, left, _plot.height}
+                         : Rect{_plot.right() - right, _plot.y, right, _plot.height};
 }
 
-// A narrow chart leaves the names out: the rows have the order and the colors of the lines.
+// Where there is no room beside the cursors, the box stands over the labels of the current values.
+// A narrow one leaves the names out: the rows have the order and the colors of the lines.
+SignalChart::DifferenceBox SignalChart::differenceBox(const TextMeasure& measure) const
+{
+    const double size = _looks.textSize;
+    DifferenceBox box{{}, differences(), 0};
+    const auto mostRows = static_cast<std::size_t>(std::max(1.0, (_plot.height - 14) / (size + 4)));
+    box.rows.resize(std::min(box.rows.size(), mostRows));
+    double values = 0;
+    double names = 0;
+    for (const Difference& row : box.rows) {
+        values = std::max(values, measure.textWidth(row.value, size, true));
+        names = std::max(names, measure.textWidth(row.name.substr(0, 80), size));
+    }
+    const double least = values + 12;
+    Rect room = roomBesideCursors(least + 80, measure);
+    if (room.width < least + 8)
+        room = {_plot.right(), _plot.y, std::max(least + 8, _width - _plot.right()), _plot.height};
+    const double left = std::min(names, room.width - least - 18);
+    box.namesWidth = left >= std::min(names, 60.0) ? left : 0;
+    const double width = least + (box.namesWidth > 0 ? box.namesWidth + 10 : 0);
+    const double share = room.x == _plot.x ? 0 : room.right() >= _plot.right() ? 1 : 0.5;
+    const double x = std::clamp(room.x + 4 + (room.width - 8 - width) * share, 0.0,
+                                std::max(0.0, _width - width - 2));
+    box.area = {x, _plot.y + 4, width, static_cast<double>(box.rows.size()) * (size + 4) + 6};
+    return box;
+}
+
 void SignalChart::drawDifference(Canvas& canvas) const
 {
     if (!_content.cursor || !_content.secondCursor)
         return;
     const double size = _looks.textSize;
-    const double row = size + 4;
-    auto rows = differences();
-    const auto room = static_cast<std::size_t>(std::max(1.0, (_plot.height - 14) / row));
-    rows.resize(std::min(rows.size(), room));
-    double values = 0;
-    double names = 0;
-    for (const Difference& difference : rows) {
-        values = std::max(values, canvas.textWidth(difference.value, size, true));
-        names = std::max(names, canvas.textWidth(difference.name.substr(0, 80), size));
-    }
-    const double left = std::min(names, _plot.width * 0.5 - values - 22);
-    const bool hasNames = left >= std::min(names, 60.0);
-    const double width = values + 12 + (hasNames ? left + 10 : 0);
-    const Rect box{differenceX(width, canvas), _plot.y + 4, width,
-                   static_cast<double>(rows.size()) * row + 6};
-    canvas.fillRect(box, _looks.palette.background);
-    canvas.strokeRect(box, {_looks.palette.frame});
-    double baseline = box.y + row;
-    for (const Difference& difference : rows) {
-        TextStyle style{.color = difference.color, .size = size};
-        if (hasNames)
-            canvas.text({box.x + 6, baseline}, elided(difference.name, left, size, false, canvas),
-                        style);
+    const DifferenceBox box = differenceBox(canvas);
+    canvas.fillRect(box.area, _looks.palette.background);
+    canvas.strokeRect(box.area, {_looks.palette.frame});
+    double baseline = box.area.y + size + 4;
+    for (const Difference& row : box.rows) {
+        TextStyle style{.color = row.color, .size = size};
+        if (box.namesWidth > 0)
+            canvas.text({box.area.x + 6, baseline},
+                        elided(row.name, box.namesWidth, size, false, canvas), style);
         style.anchor = Anchor::End;
         style.isBold = true;
-        canvas.text({box.right() - 6, baseline}, difference.value, style);
-        baseline += row;
+        canvas.text({box.area.right() - 6, baseline}, row.value, style);
+        baseline += size + 4;
     }
 }
 

@@ -89,7 +89,13 @@ class SignalChart
         Color color;
     };
     std::vector<Difference> differences() const;
-    double differenceX(double width, const TextMeasure& measure) const;
+    struct DifferenceBox {
+        Rect area;
+        std::vector<Difference> rows;
+        double namesWidth; ///< 0: without names
+    };
+    Rect roomBesideCursors(double enough, const TextMeasure& measure) const;
+    DifferenceBox differenceBox(const TextMeasure& measure) const;
     void drawDifference(Canvas& canvas) const;
 
     ChartContent _content;

@@ -56,13 +56,14 @@ std::optional<ValueRange> valuesWithin(std::span<const SeriesPoint> points, Cloc
 {
     std::optional<ValueRange> range;
     const auto near = pointsWithin(points, first, last);
+    const auto leadsIn = [&](std::size_t place) {
+        if (place + 1 == near.size())
+            return isHeld(near[place], first);
+        return near[place + 1].from > first && leadsOn(near[place], near[place + 1]);
+    };
     for (std::size_t place = 0; place < near.size(); ++place) {
         const SeriesPoint& point = near[place];
-        const bool hasNext = place + 1 < near.size();
-        const bool leadsIn = hasNext
-                                 ? leadsOn(point, near[place + 1]) && near[place + 1].from > first
-                                 : isHeld(point, first);
-        const bool isSeen = point.from <= last && (point.until >= first || leadsIn);
+        const bool isSeen = point.from <= last && (point.until >= first || leadsIn(place));
         if (!isSeen || !std::isfinite(point.value))
             continue;
         if (!range)

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
-#include <optional>
+#include <limits>
 #include <utility>
 
 namespace ventrik
@@ -79,36 +79,107 @@ class ColumnRun
     Point _last;
 };
 
+/// The column of pixels that the newest corner is in, as times and values. Most points of a dense
+/// line are within, and tell nothing new.
+class OpenColumn
+{
+  public:
+    bool holds(const SeriesPoint& point) const
+    {
+        return point.until < _end && point.value >= _least && point.value <= _greatest;
+    }
+    void add(double x, double value, const TimeScale& times)
+    {
+        const double column = std::floor(x);
+        if (column != _column) {
+            _column = column;
+            _end = times.time(column + 1);
+            _least = _greatest = value;
+        }
+        _least = std::min(_least, value);
+        _greatest = std::max(_greatest, value);
+    }
+
+  private:
+    double _column = std::numeric_limits<double>::quiet_NaN();
+    Clock::TimePoint _end = Clock::TimePoint::min();
+    double _least = 0;
+    double _greatest = 0;
+};
+
+/// Makes the runs of one line.
+class Thinning
+{
+  public:
+    Thinning(const TimeScale& times, const ValueScale& values) : _times(times), _values(values) {}
+
+    void add(const SeriesPoint& point)
+    {
+        if (_column.holds(point)) {
+            _before = _within = &point;
+            return;
+        }
+        if (std::isfinite(point.value))
+            addCorners(point);
+    }
+
+    LineRuns finish()
+    {
+        addWithin();
+        if (_before)
+            _runs.push_back(_run.finish());
+        return std::move(_runs);
+    }
+
+  private:
+    // What is outside ends just behind the edges.
+    double xOf(Clock::TimePoint time) const
+    {
+        return std::clamp(_times.x(time), _times.left() - 1, _times.right() + 1);
+    }
+
+    void addCorners(const SeriesPoint& point)
+    {
+        addWithin();
+        const double from = xOf(point.from);
+        if (_before && leadsOn(*_before, point))
+            _run.add({from, _values.y(_before->value)});
+        else if (_before && !_run.isIn(std::floor(from)))
+            _runs.push_back(_run.finish());
+        const double until = xOf(point.until);
+        _run.add({from, _values.y(point.value)});
+        _run.add({until, _values.y(point.value)});
+        _column.add(until, point.value, _times);
+        _before = &point;
+    }
+
+    // Of the points within a column only the newest is a corner: the line goes on from there.
+    void addWithin()
+    {
+        if (_within)
+            _run.add({xOf(_within->until), _values.y(_within->value)});
+        _within = nullptr;
+    }
+
+    const TimeScale& _times;
+    const ValueScale& _values;
+    LineRuns _runs;
+    ColumnRun _run;
+    OpenColumn _column;
+    const SeriesPoint* _before = nullptr;
+    const SeriesPoint* _within = nullptr;
+};
+
 } // namespace
 
 LineRuns thinnedLine(std::span<const SeriesPoint> points, const TimeScale& times,
                      const ValueScale& values)
 {
-    LineRuns runs;
-    ColumnRun run;
-    // What is outside ends just behind the edges.
-    const auto xOf = [&](Clock::TimePoint time) {
-        return std::clamp(times.x(time), times.left() - 1, times.right() + 1);
-    };
-    const SeriesPoint* before = nullptr;
-    const auto near = pointsWithin(points, times.time(times.left()), times.time(times.right()));
-    for (const SeriesPoint& point : near) {
-        if (!std::isfinite(point.value))
-            continue;
-        const double x = xOf(point.from);
-        const bool follows = before && leadsOn(*before, point);
-        if (follows)
-            run.add({x, values.y(before->value)});
-        else if (before && !run.isIn(std::floor(x)))
-            runs.push_back(run.finish());
-        const double y = values.y(point.value);
-        run.add({x, y});
-        run.add({xOf(point.until), y});
-        before = &point;
-    }
-    if (before)
-        runs.push_back(run.finish());
-    return runs;
+    Thinning thinning(times, values);
+    for (const SeriesPoint& point :
+         pointsWithin(points, times.time(times.left()), times.time(times.right())))
+        thinning.add(point);
+    return thinning.finish();
 }
 
 } // namespace ventrik

@@ -71,6 +71,18 @@ TEST(LineThinningTest, APeakOfAColumnStays)
     EXPECT_THAT(runs[0], testing::Contains(testing::Field(&Point::y, 97)));
 }
 
+TEST(LineThinningTest, TheNextColumnIsReachedFromTheLastValueOfTheOneBefore)
+{
+    const std::vector points{point(10.1, 10.1, -50), point(10.2, 10.2, -60), point(10.3, 10.3, -20),
+                             point(10.4, 10.4, -55), point(10.5, 10.5, -33), point(11.5, 12, -40)};
+    const LineRuns runs = thinned(points);
+    ASSERT_THAT(runs, SizeIs(1));
+    std::vector<double> heights;
+    for (const Point& corner : runs[0])
+        heights.push_back(corner.y);
+    EXPECT_THAT(heights, ElementsAre(50, 60, 20, 33, 33, 40, 40));
+}
+
 TEST(LineThinningTest, WhatIsDrawnGrowsWithThePixelsOnly)
 {
     const LineRuns runs = thinned(dense(100000, 0.001));

@@ -50,7 +50,7 @@ OriginScreen::OriginScreen(VentrikPaneHost& host, const Clock& clock, Finder fin
 
 std::size_t OriginScreen::bytesOfLine() const
 {
-    const int room = _text->viewport()->width() - 2 * textMargin;
+    const int room = width() - 2 * textMargin;
     const int characters = room / std::max(1, _text->fontMetrics().horizontalAdvance(u'0'));
     return characters >= charactersBeside + 16 * charactersOfByte ? 16 : 8;
 }

@@ -80,6 +80,9 @@ ChannelFrequency frequencyOf(CellSystem system, std::int64_t channel, GSMBandHin
 // Repetitions are noted so often; what is older than that by less may be as new.
 constexpr std::chrono::seconds timeGrain{1};
 
+// More cells than that nobody looks at, and each is compared with the others.
+constexpr std::size_t mostCells = 500;
+
 /// A cell as one place of the display tells it.
 struct FoundCell {
     CellRow row;
@@ -138,6 +141,8 @@ void CellReader::readPlaces(const CellPlaces& place)
     if (place.shape == CellShape::Group)
         return readCell(place, path);
     for (const ModelNodePointer& node : rowsOf(_display.nodeAtPath(path))) {
+        if (_cells.size() >= mostCells)
+            return;
         const std::string below = pathJoining(path, node->displayName());
         if (place.shape == CellShape::List)
             readCell(place, below);

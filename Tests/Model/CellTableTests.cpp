@@ -396,6 +396,16 @@ TEST_F(CellTableTest, HasTheCellsOfTheCellMonitor)
                                      "difference -22"));
 }
 
+TEST_F(CellTableTest, EndsWithALengthThatStillComparesQuickly)
+{
+    use("ifx");
+    PlistArray cells;
+    for (int i = 0; i < 5000; ++i)
+        cells.append(PlistDictionary{{"ARFCN", fmt::format("{}", i)}});
+    show(PlistDictionary{{"GSM Neighbor Cells", cells}});
+    EXPECT_EQ(rows().size(), 500U);
+}
+
 TEST_F(CellTableTest, TellsAgesAtTheTimeThatIsAskedFor)
 {
     use("ifx");

@@ -71,6 +71,14 @@ TEST(ChartLineTest, AValueThatIsHeldIntoTheRangeShows)
     EXPECT_EQ(valuesWithin(series, at(3), at(4))->greatest, -90) << "the step is at the edge";
 }
 
+TEST(ChartLineTest, TheNewestValueShowsWhileItIsHeld)
+{
+    const auto range = valuesWithin(series, at(32), at(35));
+    ASSERT_TRUE(range);
+    EXPECT_EQ(range->least, -50);
+    EXPECT_FALSE(valuesWithin(series, at(42), at(45)));
+}
+
 TEST(ChartLineTest, OnlyThePointsAroundAreLookedAt)
 {
     const auto near = pointsWithin(series, at(4), at(4.5));

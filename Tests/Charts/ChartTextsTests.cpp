@@ -47,6 +47,8 @@ TEST(ChartTextsTest, DurationsAreAsExactAsTheirLengthAsks)
 {
     EXPECT_EQ(durationText(450ms), "0.4 s");
     EXPECT_EQ(durationText(59999ms), "59.9 s");
+    EXPECT_EQ(durationText(60s), "1 min 00 s");
+    EXPECT_EQ(durationText(3600s), "1 h 00 min");
     EXPECT_EQ(durationText(185s), "3 min 05 s");
     EXPECT_EQ(durationText(125min), "2 h 05 min");
     EXPECT_EQ(durationText(-1s), "0.0 s");

@@ -270,6 +270,28 @@ TEST_F(SignalChartTest, ACursorHasItsTimeAndTheValues)
                                    testing::Field(&Point::x, testing::DoubleNear(x + 9, 0.01))))));
 }
 
+TEST_F(SignalChartTest, OfTwoCursorsEachHasItsValuesOnItsOuterSide)
+{
+    add("RSRP", "dBm", {point(0, 50, -90), point(51, 90, -86.5)});
+    secondCursor = at(30);
+    cursor = at(60);
+    const auto canvas = drawn();
+    ASSERT_TRUE(canvas.has("-86.5"));
+    EXPECT_GT(canvas.find("-86.5")->place.x, chart().times().x(at(60)));
+    const double x = chart().times().x(at(30));
+    EXPECT_TRUE(std::ranges::any_of(canvas.texts, [&](const DrawnText& text) {
+        return text.text == "-90" && text.style.isBold && text.place.x < x && text.place.x > x - 50;
+    }));
+}
+
+TEST_F(SignalChartTest, ALowChartHasOneRowOfMarks)
+{
+    addConstant("RSRP", "dBm", -90);
+    marks = {{at(50), "first mark"}, {at(50.1), "second mark"}};
+    EXPECT_FALSE(drawn(600, 259).has("second mark"));
+    EXPECT_TRUE(drawn(600, 260).has("second mark"));
+}
+
 TEST_F(SignalChartTest, TwoCursorsTellTheDifference)
 {
     add("RSRP", "dBm", {point(0, 50, -90), point(51, 99, -86.5)});

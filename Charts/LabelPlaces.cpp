@@ -45,6 +45,7 @@ std::vector<std::optional<double>> spreadLabels(std::span<const double> wanted, 
 
     // With the heights of those above taken off, labels that do not overlap are in order.
     std::vector<double> starts;
+    starts.reserve(order.size());
     for (const std::size_t label : order)
         starts.push_back(wanted[label] - static_cast<double>(starts.size()) * height);
     const double farthest = high - height / 2 - height * static_cast<double>(order.size()) + height;

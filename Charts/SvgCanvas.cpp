@@ -123,12 +123,14 @@ void SvgCanvas::text(Point place, std::string_view text, const TextStyle& style)
     _body += "</text>\n";
 }
 
-// An inner picture clips by itself and, other than a clip path, needs no name.
+// The name is made of the place, so that in a page with several pictures equal names mean the same.
 void SvgCanvas::pushClip(const Rect& rect)
 {
-    _body +=
-        fmt::format("<svg{} viewBox=\"{} {} {} {}\" overflow=\"hidden\">\n", rectAttributes(rect),
-                    number(rect.x), number(rect.y), number(rect.width), number(rect.height));
+    const std::string name = fmt::format("clip-{}-{}-{}-{}", number(rect.x), number(rect.y),
+                                         number(rect.width), number(rect.height));
+    _body += fmt::format("<clipPath id=\"{0}\"><rect{1}/></clipPath>\n"
+                         "<g clip-path=\"url(#{0})\">\n",
+                         name, rectAttributes(rect));
     ++_openClips;
 }
 
@@ -136,7 +138,7 @@ void SvgCanvas::popClip()
 {
     if (_openClips == 0)
         return;
-    _body += "</svg>\n";
+    _body += "</g>\n";
     --_openClips;
 }
 
@@ -144,7 +146,7 @@ std::string SvgCanvas::document() const
 {
     std::string text = _head + _body;
     for (int open = 0; open < _openClips; ++open)
-        text += "</svg>\n";
+        text += "</g>\n";
     return text + "</svg>\n";
 }
 

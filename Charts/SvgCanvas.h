@@ -7,8 +7,8 @@
 namespace ventrik
 {
 
-/// Writes what is drawn as a picture in SVG that stands by itself: no scripts, no identifiers, no
-/// links, so that several fit into one page.
+/// Writes what is drawn as a picture in SVG that stands by itself: no scripts, no links to others.
+/// Several fit into one page.
 class SvgCanvas : public Canvas
 {
   public:

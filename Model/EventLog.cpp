@@ -185,9 +185,9 @@ std::string_view nameOf(EventKind kind)
 class EventLog::Follower : public StoreVisitor
 {
   public:
-    Follower(const ChangeStore& store, std::vector<Alert> alerts) : _store(store)
+    Follower(const ChangeStore& store, std::vector<ValueAlert> alerts) : _store(store)
     {
-        for (Alert& alert : alerts)
+        for (ValueAlert& alert : alerts)
             _alerts.emplace_back(std::move(alert));
     }
 
@@ -552,7 +552,7 @@ void EventLog::Follower::add(EventKind kind, const std::string& text, std::strin
 
 // ---- The log
 
-EventLog::EventLog(const ChangeStore& store, std::vector<Alert> alerts)
+EventLog::EventLog(const ChangeStore& store, std::vector<ValueAlert> alerts)
     : _follower(std::make_unique<Follower>(store, std::move(alerts)))
 {
 }

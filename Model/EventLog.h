@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Model/Alert.h"
 #include "Model/ChangeStore.h"
+#include "Model/ValueAlert.h"
 
 #include <cstdint>
 #include <deque>
@@ -44,7 +44,7 @@ class EventLog
     static constexpr std::size_t mostEvents = 10000;
 
     /// The store outlives it.
-    explicit EventLog(const ChangeStore& store, std::vector<Alert> alerts = {});
+    explicit EventLog(const ChangeStore& store, std::vector<ValueAlert> alerts = {});
     ~EventLog();
 
     /// Follows the store from where it stopped, and returns what is new.

@@ -27,7 +27,7 @@ bool isSame(const Event& a, const Event& b)
 
 } // namespace
 
-QString textOf(std::string_view text)
+QString listText(std::string_view text)
 {
     return oneLine(QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size())));
 }
@@ -72,16 +72,18 @@ QVariant EventsModel::data(const QModelIndex& index, int role) const
     if (!index.isValid())
         return {};
     const Event& event = this->event(index.row());
-    const QString kind = textOf(nameOf(event.kind));
+    const QString kind = listText(nameOf(event.kind));
     switch (role) {
     case Qt::DisplayRole:
-        return QStringList{timeTextOf(event), kind, textOf(event.text)}.join(QStringLiteral("  "));
+        return QStringList{timeTextOf(event), kind, listText(event.text)}.join(
+            QStringLiteral("  "));
     case Qt::AccessibleTextRole:
-        return QStringList{kind, textOf(event.text), timeTextOf(event)}.join(QStringLiteral(", "));
+        return QStringList{kind, listText(event.text), timeTextOf(event)}.join(
+            QStringLiteral(", "));
     case Qt::ToolTipRole:
         return plainToolTip(
             localTimeOf(event).toString(QStringLiteral("yyyy-MM-dd HH:mm:ss.zzz ")) +
-            textOf(event.text));
+            listText(event.text));
     default:
         return {};
     }

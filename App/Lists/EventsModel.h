@@ -27,6 +27,6 @@ class EventsModel : public QAbstractListModel
 
 /// HH:MM:SS, of the local time.
 QString timeTextOf(const Event& event);
-QString textOf(std::string_view text);
+QString listText(std::string_view text);
 
 } // namespace ventrik

@@ -81,7 +81,7 @@ class EventLines : public QStyledItemDelegate
         const auto weight = event.kind == EventKind::Alert ? FontWeight::Bold : FontWeight::Regular;
         painter.setFont(systemFont(listFont().pixelSize(), weight));
         painter.setPen(textColor(option));
-        drawText(painter, area, textOf(event.text));
+        drawText(painter, area, listText(event.text));
     }
 
     static void drawLine(QPainter& painter, const QRect& area, const QStyleOptionViewItem& option,
@@ -92,7 +92,7 @@ class EventLines : public QStyledItemDelegate
         painter.setFont(listFont());
         painter.setPen(quiet(option));
         drawText(painter, area, time);
-        drawText(painter, area.adjusted(timeWidth, 0, 0, 0), textOf(nameOf(event.kind)));
+        drawText(painter, area.adjusted(timeWidth, 0, 0, 0), listText(nameOf(event.kind)));
         drawEventText(painter, area.adjusted(timeWidth + kindWidth, 0, 0, 0), option, event);
     }
 
@@ -106,7 +106,7 @@ class EventLines : public QStyledItemDelegate
         painter.setFont(listHeaderFont());
         painter.setPen(quiet(option));
         drawText(painter, upper,
-                 timeTextOf(event) + QStringLiteral("   ") + textOf(nameOf(event.kind)));
+                 timeTextOf(event) + QStringLiteral("   ") + listText(nameOf(event.kind)));
         drawEventText(painter, lower, option, event);
     }
 };

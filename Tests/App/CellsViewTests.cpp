@@ -243,6 +243,21 @@ TEST_F(CellsViewTest, KeepsTheSelectionAtItsCellAcrossRefreshes)
     EXPECT_THAT(identities(), ElementsAre("301", "200", "47"));
 }
 
+TEST_F(CellsViewTest, TellsItsTableOfCellsThatComeAndGo)
+{
+    view.setCells(lteCells());
+    QSignalSpy came(&view.model(), &QAbstractItemModel::rowsInserted);
+    QSignalSpy gone(&view.model(), &QAbstractItemModel::rowsRemoved);
+    std::vector<CellRow> cells = lteCells();
+    cells.erase(cells.begin());
+    view.setCells(cells);
+    EXPECT_EQ(gone.count(), 1);
+    EXPECT_EQ(came.count(), 0);
+    view.setCells(lteCells());
+    EXPECT_EQ(gone.count(), 1);
+    EXPECT_EQ(came.count(), 1);
+}
+
 TEST_F(CellsViewTest, OpensTheCellThatWasPressedThoughARefreshMovedIt)
 {
     view.setCells(lteCells());

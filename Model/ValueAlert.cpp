@@ -1,4 +1,4 @@
-#include "Model/Alert.h"
+#include "Model/ValueAlert.h"
 
 #include "Model/StoredNumber.h"
 
@@ -30,11 +30,11 @@ std::optional<double> finiteNumber(std::string_view text)
     return isNumber ? std::optional(number) : std::nullopt;
 }
 
-Alert::Comparison comparisonOf(char sign, bool isWithEqual)
+ValueAlert::Comparison comparisonOf(char sign, bool isWithEqual)
 {
     if (sign == '<')
-        return isWithEqual ? Alert::Comparison::AtMost : Alert::Comparison::Below;
-    return isWithEqual ? Alert::Comparison::AtLeast : Alert::Comparison::Above;
+        return isWithEqual ? ValueAlert::Comparison::AtMost : ValueAlert::Comparison::Below;
+    return isWithEqual ? ValueAlert::Comparison::AtLeast : ValueAlert::Comparison::Above;
 }
 
 AlertReading failed(std::string_view text, std::string_view what)
@@ -44,7 +44,7 @@ AlertReading failed(std::string_view text, std::string_view what)
 
 } // namespace
 
-bool Alert::isBeyond(double number) const
+bool ValueAlert::isBeyond(double number) const
 {
     switch (comparison) {
     case Comparison::Below:
@@ -73,8 +73,9 @@ AlertReading parseAlert(std::string_view text)
     const auto threshold = finiteNumber(rest);
     if (!threshold)
         return failed(text, fmt::format("\"{}\" is no number", rest));
-    return {Alert{PathSelection({std::string(path)}), comparisonOf(text[sign], isWithEqual),
-                  *threshold, fmt::format("{}{} {}", text[sign], isWithEqual ? "=" : "", rest)},
+    return {ValueAlert{PathSelection({std::string(path)}), comparisonOf(text[sign], isWithEqual),
+                       *threshold,
+                       fmt::format("{}{} {}", text[sign], isWithEqual ? "=" : "", rest)},
             {}};
 }
 

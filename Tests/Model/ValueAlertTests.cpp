@@ -1,4 +1,4 @@
-#include "Model/Alert.h"
+#include "Model/ValueAlert.h"
 
 #include <gmock/gmock.h>
 

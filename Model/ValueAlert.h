@@ -13,7 +13,7 @@ namespace ventrik
 {
 
 /// A threshold for the numbers at some paths.
-struct Alert {
+struct ValueAlert {
     enum class Comparison : std::uint8_t { Below, AtMost, Above, AtLeast };
 
     PathSelection paths;
@@ -26,7 +26,7 @@ struct Alert {
 
 /// An alert, or one line that says what is wrong with its text.
 struct AlertReading {
-    std::optional<Alert> alert;
+    std::optional<ValueAlert> alert;
     std::string error;
 };
 
@@ -39,9 +39,9 @@ AlertReading parseAlert(std::string_view text);
 class AlertWatch
 {
   public:
-    explicit AlertWatch(Alert alert) : _alert(std::move(alert)) {}
+    explicit AlertWatch(ValueAlert alert) : _alert(std::move(alert)) {}
 
-    const Alert& alert() const { return _alert; }
+    const ValueAlert& alert() const { return _alert; }
     /// True when it fires. Places are those of the store that shows the value.
     bool take(PlaceId place, const PlaceTable& places, const StoredValue& shown);
     /// The places have new numbers.
@@ -52,7 +52,7 @@ class AlertWatch
 
     State& stateOf(PlaceId place, const PlaceTable& places);
 
-    Alert _alert;
+    ValueAlert _alert;
     std::vector<State> _states; // by place
 };
 

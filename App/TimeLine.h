@@ -23,7 +23,8 @@ class TimeLine
 {
   public:
     /// Both outlive it.
-    TimeLine(const ChangeStore& store, Preferences& preferences, std::vector<Alert> alerts = {})
+    TimeLine(const ChangeStore& store, Preferences& preferences,
+             std::vector<ValueAlert> alerts = {})
         : _store(store),
           _preferences(preferences),
           _series(store),

@@ -1,15 +1,20 @@
 #include "App/TimeLineView.h"
 
+#include "App/Lists/CellsView.h"
+#include "App/Lists/EventsView.h"
 #include "App/Strip/SignalStrip.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/PushButton.h"
 #include "App/Toolkit/Separator.h"
 #include "App/Toolkit/TitleBar.h"
+#include "Model/CellTable.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QMenu>
 #include <QPainter>
+#include <QSplitter>
+#include <QTabBar>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -23,6 +28,7 @@ namespace
 
 constexpr int barMargin = 10;
 constexpr int statusPoints = 14;
+constexpr int handleWidth = 5;
 
 /// The bar along the top, as that of the panes beside it.
 class TimeLineBar : public QWidget
@@ -49,16 +55,61 @@ TimeLineView::TimeLineView(TimeLine& timeLine, const Clock& clock)
       _status(makeLabel(systemFont(statusPoints, FontWeight::Regular), nullptr)),
       _pause(new PushButton),
       _menu(new PushButton(QStringLiteral("More"))),
-      _strip(new SignalStrip(this))
+      _strip(new SignalStrip),
+      _cells(new CellsView),
+      _events(new EventsView),
+      _tabs(new QTabBar)
 {
     setAccessibleName(QStringLiteral("Time line"));
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
     layout->addWidget(makeBar());
-    layout->addWidget(_strip, 1);
+    auto* parts = new QSplitter(Qt::Vertical, this);
+    parts->setChildrenCollapsible(false);
+    parts->setHandleWidth(handleWidth);
+    parts->addWidget(_strip);
+    parts->addWidget(makeLists());
+    parts->setStretchFactor(0, 3);
+    parts->setStretchFactor(1, 2);
+    layout->addWidget(parts, 1);
     setFocusProxy(_strip);
     _status->setAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+}
+
+QWidget* TimeLineView::makeLists()
+{
+    auto* lists = new QWidget;
+    _tabs->addTab(QStringLiteral("Cells"));
+    _tabs->addTab(QStringLiteral("Events"));
+    _tabs->setDrawBase(false);
+    _tabs->setExpanding(true);
+    _tabs->setFont(systemFont(statusPoints, FontWeight::Regular));
+    connect(_tabs, &QTabBar::currentChanged, this, [this] { layOutLists(); });
+    auto* column = new QVBoxLayout(lists);
+    column->setContentsMargins(0, 0, 0, 0);
+    column->setSpacing(0);
+    column->addWidget(_tabs);
+    auto* row = new QHBoxLayout;
+    row->setSpacing(1);
+    row->addWidget(_cells, 3);
+    row->addWidget(_events, 2);
+    column->addLayout(row, 1);
+    layOutLists();
+    return lists;
+}
+
+void TimeLineView::layOutLists()
+{
+    const bool areBoth = width() >= widthForBothLists;
+    _tabs->setVisible(!areBoth);
+    _cells->setVisible(areBoth || _tabs->currentIndex() == 0);
+    _events->setVisible(areBoth || _tabs->currentIndex() == 1);
+}
+
+void TimeLineView::resizeEvent(QResizeEvent*)
+{
+    layOutLists();
 }
 
 QWidget* TimeLineView::makeBar()
@@ -79,6 +130,11 @@ QWidget* TimeLineView::makeBar()
 void TimeLineView::setListener(TimeLineListener listener)
 {
     _listener = std::move(listener);
+    _cells->setOnOpen([this](const std::string& path) {
+        if (_listener.onOpen)
+            _listener.onOpen(path);
+    });
+    _events->setOnEvent([this](const Event& event) { _timeLine.showEvent(event); });
     _strip->setListener({[this](Clock::TimePoint time) { _timeLine.showTime(time); },
                          [this] {
                              if (_listener.onLive)
@@ -95,6 +151,10 @@ void TimeLineView::setStatus(const QString& text, bool isPaused, const QString& 
 void TimeLineView::update()
 {
     updateStrip();
+    _cells->setCells(_timeLine.isPaused() || _timeLine.store().isEmpty()
+                         ? cellsOf(_timeLine.shown())
+                         : cellsOf(_timeLine.shown(), _clock.now()));
+    _events->setEvents(_timeLine.events());
 }
 
 void TimeLineView::updateStrip()

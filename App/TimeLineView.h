@@ -9,22 +9,29 @@
 
 class QLabel;
 class QPushButton;
+class QTabBar;
 
 namespace ventrik
 {
 
+class CellsView;
+class EventsView;
 class SignalStrip;
 
 /// What the time line's view tells its owner.
 struct TimeLineListener {
-    std::function<void()> onLive = {};  ///< back to the present
-    std::function<void()> onPause = {}; ///< the present, or back to it
+    std::function<void()> onLive = {};                        ///< back to the present
+    std::function<void(const std::string& path)> onOpen = {}; ///< the pane there
+    std::function<void()> onPause = {};                       ///< the present, or back to it
 };
 
-/// The time line: signals over time.
+/// The time line: signals over time, the cells of the moment that is shown side by side, and what
+/// happened. Cells and events stand beside each other where there is room, else one at a time.
 class TimeLineView : public QWidget
 {
   public:
+    static constexpr int widthForBothLists = 800;
+
     /// All outlive it.
     TimeLineView(TimeLine& timeLine, const Clock& clock);
 
@@ -35,9 +42,16 @@ class TimeLineView : public QWidget
     void setStatus(const QString& text, bool isPaused, const QString& live);
 
     SignalStrip& strip() const { return *_strip; }
+    CellsView& cells() const { return *_cells; }
+    EventsView& events() const { return *_events; }
+
+  protected:
+    void resizeEvent(QResizeEvent* event) override;
 
   private:
     QWidget* makeBar();
+    QWidget* makeLists();
+    void layOutLists();
     void updateStrip();
     void showMenu();
 
@@ -48,6 +62,9 @@ class TimeLineView : public QWidget
     QPushButton* _pause;
     QPushButton* _menu;
     SignalStrip* _strip;
+    CellsView* _cells;
+    EventsView* _events;
+    QTabBar* _tabs; // where the lists show one at a time
 };
 
 } // namespace ventrik

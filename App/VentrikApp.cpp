@@ -3,6 +3,7 @@
 #include "App/OriginScreen.h"
 #include "App/Toolkit/PlainText.h"
 #include "Model/ChannelNote.h"
+#include "Model/NodeRows.h"
 
 #include <QGuiApplication>
 #include <QScreen>
@@ -178,14 +179,16 @@ void VentrikApp::showWindow()
 void VentrikApp::createTimeLine()
 {
     _timeLineView = new TimeLineView(_timeLine, _platform.clock);
-    _timeLineView->setListener({[this] { goLive(); }, [this] { _timeLine.togglePause(); }});
+    _timeLineView->setListener({.onLive = [this] { goLive(); },
+                                .onOpen = [this](const std::string& path) { openPane(path); },
+                                .onPause = [this] { togglePause(); }});
     _viewerWindow->addTimeLine(_timeLineView);
     const auto kept = _platform.preferences.text(preferenceDomain, timeLineKey);
     _viewerWindow->setTimeLineWanted(_options.timeLine && kept != timeLineHidden);
     _viewerWindow->setWidthCallback([this] { leaveTimeLineScreen(); });
     _viewerWindow->setSpaceCallback([this] {
         if (!_saveViewController)
-            _timeLine.togglePause();
+            togglePause();
     });
     auto* key = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_T), _window.get());
     QObject::connect(key, &QShortcut::activated, _window.get(), [this] { toggleTimeLine(); });
@@ -211,6 +214,38 @@ void VentrikApp::toggleTimeLine()
         _timeLineScreen = screen.get();
         _navController->push(std::move(screen), true);
         updateTimeLine();
+    }
+}
+
+// The end of a capture stands still by itself.
+void VentrikApp::togglePause()
+{
+    if (_options.opened)
+        goLive();
+    else
+        _timeLine.togglePause();
+}
+
+// With the panes on the way there below it, so that the way back is the usual one.
+void VentrikApp::openPane(const std::string& path)
+{
+    if (!_navController || _saveViewController)
+        return;
+    leaveTimeLineScreen();
+    _navController->popTo(*_navController->screens().front(), false);
+    ModelNodePointer node = topLevelNodes();
+    for (std::string way = "/"; node;) {
+        const auto leadsThere = [&](const ModelNodePointer& child) {
+            const std::string step = pathJoining(way, child->displayName());
+            return child->childNodes() && (path == step || path.starts_with(step + "/"));
+        };
+        const VentrikModelNode::Children& children = rowsOf(node);
+        const auto next = std::ranges::find_if(children, leadsThere);
+        if (next == children.end())
+            break;
+        way = pathJoining(way, (*next)->displayName());
+        _navController->push(VentrikPaneController::initWithNode(*this, *next, way), false);
+        node = ModelNodePointer(*next);
     }
 }
 

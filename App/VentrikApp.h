@@ -134,6 +134,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void shownMomentChanged();
     void updateTimeLine();
     void leaveTimeLineScreen();
+    void openPane(const std::string& path);
+    void togglePause();
     std::string pausedStatus() const;
     void readOnLater();
     void readOn();

@@ -202,9 +202,12 @@ void ChangeStore::takeFirst(std::span<const DisplayChange> changes, ByteView mes
 // What the generator before showed stands no more where this one has nothing.
 void ChangeStore::removeWhatIsNotShown(const PlistDictionary& state)
 {
-    std::vector<bool> isShown(_places->size());
+    std::vector<PlaceId> shown;
     for (const DisplayGroup::Entry* entry : _changes->entries())
-        isShown[idOf(*entry->place, state)] = true;
+        shown.push_back(idOf(*entry->place, state));
+    std::vector<bool> isShown(_places->size());
+    for (const PlaceId id : shown)
+        isShown[id] = true;
     for (PlaceId id = 1; id < isShown.size(); ++id)
         if (!isShown[id])
             remove(id);

@@ -63,7 +63,7 @@ std::size_t ChangeStore::Chunk::bytes() const
 {
     return messages.capacity() * sizeof(Message) + changes.capacity() * sizeof(Change) +
            values.capacity() * sizeof(Value) + texts.capacity() + packets.capacity() +
-           heard.capacity() * sizeof(Heard) + keyBytes;
+           heard.capacity() * sizeof(Heard) + layouts.capacity() * sizeof(NotedLayout) + keyBytes;
 }
 
 void ChangeStore::Chunk::add(KeyState state)
@@ -121,6 +121,7 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     _lastTime = std::max(_lastTime, time);
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);
+    noteLayout();
     if (changes.empty())
         return hear(logCode);
     if (_chunks.empty())
@@ -137,6 +138,26 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     hear(logCode);
     endChunkIfFull(state);
     keepWithin();
+}
+
+// Only where it is another one than before.
+void ChangeStore::noteLayout()
+{
+    const ReadLayout* read = _generator->lastRead();
+    if (!read)
+        return;
+    const auto [known, isFirst] = _layouts.emplace(read->logCode, *read);
+    if (!isFirst && known->second.kind == read->kind && known->second.version == read->version)
+        return;
+    known->second = *read;
+    std::vector<std::string>& sections = _sections[read->logCode];
+    if (sections.empty())
+        for (const std::string_view section : _generator->sectionsOfCode(read->logCode))
+            sections.emplace_back(section);
+    if (_chunks.empty())
+        return;
+    Chunk& chunk = *_chunks.back();
+    chunk.layouts.push_back({static_cast<std::uint32_t>(chunk.changes.size()), *read});
 }
 
 // The generator knows it as a rule. What nobody reads is nobody's.
@@ -349,6 +370,7 @@ void ChangeStore::beginChunk()
     auto chunk = std::make_unique<Chunk>();
     chunk->first = _present;
     chunk->heardBefore = _lastHeard;
+    chunk->layoutsBefore = _layouts;
     chunk->lastTime = _lastTime;
     _chunks.push_back(std::move(chunk));
 }

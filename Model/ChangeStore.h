@@ -143,6 +143,10 @@ class ChangeStore : public MessageObserver
         std::uint32_t logCode;
         std::uint32_t change; // so many of the chunk's came before
     };
+    struct NotedLayout {
+        std::uint32_t change; // so many of the chunk's came before
+        ReadLayout layout;
+    };
     struct Standing {
         std::uint32_t value = nothing;
         std::uint32_t logCode = 0;
@@ -163,6 +167,8 @@ class ChangeStore : public MessageObserver
         std::vector<KeyState> keyStates;
         std::vector<Heard> heard;
         std::map<std::uint32_t, Clock::TimePoint> heardBefore;
+        std::vector<NotedLayout> layouts;
+        std::map<std::uint32_t, ReadLayout> layoutsBefore;
         Clock::TimePoint lastTime = {};
         std::size_t keyBytes = 0;
         std::size_t bytesAtStart = 0; // what it took over
@@ -186,6 +192,7 @@ class ChangeStore : public MessageObserver
 
     std::uint32_t codeOf(ByteView message) const;
     void hear(std::uint32_t logCode);
+    void noteLayout();
     void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
                    const PlistDictionary& state);
     void beginMessage(ByteView message, std::uint32_t logCode);
@@ -227,6 +234,8 @@ class ChangeStore : public MessageObserver
     std::vector<KnownValue> _knownValues;
     std::map<std::uint32_t, Clock::TimePoint> _lastHeard;
     std::map<std::uint32_t, Clock::TimePoint> _lastNoted;
+    std::map<std::uint32_t, ReadLayout> _layouts; // how the last record of each code was read
+    std::map<std::uint32_t, std::vector<std::string>> _sections; // that are given a code's records
     std::deque<ChannelEvent> _channelEvents;
     std::deque<Technology> _technologies;
 };

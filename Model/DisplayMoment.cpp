@@ -1,6 +1,7 @@
 #include "Model/DisplayMoment.h"
 
 #include "Model/DisplayNames.h"
+#include "Model/LayoutWarnings.h"
 #include "Model/PathIndex.h"
 #include "Packets/Plausibility.h"
 
@@ -30,6 +31,7 @@ struct DisplayMoment::Content {
     void remove(PlaceId id);
     void takeValues(const ChangeStore::Chunk& chunk);
     void hear(const ChangeStore::Chunk& chunk, std::uint32_t changes);
+    void takeLayouts(const ChangeStore::Chunk& chunk, std::uint32_t changes);
     PlistValue displayOf(PlaceId id) const;
     std::optional<PlaceId> idAt(const std::string& path) const;
 
@@ -40,6 +42,8 @@ struct DisplayMoment::Content {
     std::string technology;
     std::map<std::uint32_t, Clock::TimePoint> heard;
     std::map<PlaceId, Value> values;
+    std::map<std::uint32_t, ReadLayout> layouts;
+    std::map<std::uint32_t, std::vector<std::string>> sections; // of those codes
     std::deque<std::string> texts;
     PathIndex index;
     ModelNodePointer root;
@@ -117,6 +121,17 @@ void DisplayMoment::Content::hear(const ChangeStore::Chunk& chunk, std::uint32_t
             heard[again.logCode] = again.time;
 }
 
+// The layout of the message that told the last change belongs to the moment, too.
+void DisplayMoment::Content::takeLayouts(const ChangeStore::Chunk& chunk, std::uint32_t changes)
+{
+    layouts = chunk.layoutsBefore;
+    for (const ChangeStore::NotedLayout& noted : chunk.layouts)
+        if (noted.change < changes)
+            layouts[noted.layout.logCode] = noted.layout;
+    std::erase_if(layouts,
+                  [](const auto& layout) { return layout.second.kind != LayoutKind::NotKnown; });
+}
+
 PlistValue DisplayMoment::Content::displayOf(PlaceId id) const
 {
     const Node& node = nodes[id];
@@ -164,10 +179,14 @@ DisplayMoment::DisplayMoment(const ChangeStore& store, std::uint64_t moment)
         return;
     const auto changes = static_cast<std::uint32_t>(moment - chunk->first);
     content.goThrough(*chunk, changes);
-    if (moment == store.present())
+    if (moment == store.present()) {
         content.heard = store._lastHeard;
-    else
+        content.layouts = store._layouts;
+    } else {
         content.hear(*chunk, changes);
+        content.takeLayouts(*chunk, changes);
+    }
+    content.sections = store._sections;
     content.takeValues(*chunk);
 }
 
@@ -225,6 +244,21 @@ std::vector<std::string_view> DisplayMoment::keysAt(const std::string& path) con
 {
     build();
     return _content->index.keysOf(path);
+}
+
+std::vector<std::string> DisplayMoment::layoutWarningsAt(const std::string& path) const
+{
+    build();
+    const auto id = _content->idAt(path);
+    std::vector<ReadLayout> layouts;
+    for (const auto& [code, layout] : _content->layouts) {
+        const auto sections = _content->sections.find(code);
+        if (id && *id != PlaceTable::root && sections != _content->sections.end() &&
+            std::ranges::find(sections->second, (*_content->places)[*id].section) !=
+                sections->second.end())
+            layouts.push_back(layout);
+    }
+    return layoutWarnings(layouts);
 }
 
 const DisplayMoment::Value* DisplayMoment::valueAt(const std::string& path) const

@@ -38,6 +38,7 @@ class DisplayMoment : public DisplayTree
     ModelNodePointer topLevelNodes() override;
     ModelNodePointer nodeAtPath(const std::string& path) override;
     std::string_view doubtAt(const std::string& path) const override;
+    std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
     /// Null where no value stands.
     const Value* valueAt(const std::string& path) const;
 

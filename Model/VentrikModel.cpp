@@ -1,5 +1,6 @@
 #include "Model/VentrikModel.h"
 
+#include "Model/LayoutWarnings.h"
 #include "Packets/Plausibility.h"
 #include "Platform/Technology.h"
 #include "Platform/TelephonyProtocol.h"
@@ -37,18 +38,6 @@ ChannelFault faultOfRequest(const TelephonyError& error)
         return ChannelFault::Refused;
     return error.code == ClientError::answerNotUnderstood ? ChannelFault::BadAnswer
                                                           : ChannelFault::NoAnswer;
-}
-
-constexpr std::size_t mostLayoutWarnings = 2;
-
-// So many lines and one that counts the rest.
-void shorten(std::vector<std::string>& lines, std::size_t most)
-{
-    if (lines.size() <= most)
-        return;
-    const std::size_t rest = lines.size() - most;
-    lines.resize(most);
-    lines.push_back(fmt::format("and {} more", rest));
 }
 
 } // namespace
@@ -382,14 +371,9 @@ std::string_view VentrikModel::doubtAt(const std::string& path) const
 
 std::vector<std::string> VentrikModel::layoutWarningsAt(const std::string& path) const
 {
-    std::vector<std::string> lines;
     if (!_nodesByPath || !_logGenerator)
-        return lines;
-    for (const ReadLayout& layout : _logGenerator->layoutsAt(_state, _nodesByPath->keysOf(path)))
-        if (layout.kind == LayoutKind::NotKnown)
-            lines.push_back(warningOf(layout));
-    shorten(lines, mostLayoutWarnings);
-    return lines;
+        return {};
+    return layoutWarnings(_logGenerator->layoutsAt(_state, _nodesByPath->keysOf(path)));
 }
 
 void VentrikModel::updateWithData(ByteView data)

@@ -1,3 +1,6 @@
+#include "App/Lists/CellsModel.h"
+#include "App/Lists/CellsView.h"
+#include "App/Lists/EventsView.h"
 #include "App/Strip/SignalStrip.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/PacketBuilder.h"
@@ -5,8 +8,11 @@
 #include "Tests/Support/IdleGenerator.h"
 
 #include <QApplication>
+#include <QListView>
 #include <QMenu>
 #include <QPushButton>
+#include <QTabBar>
+#include <QTableView>
 #include <QTest>
 
 #include <array>
@@ -306,10 +312,15 @@ class TimeLineWindowTest : public AppFixture
         window.emplace(fake.platform(), options);
         window->applicationDidFinishLaunching();
         fake.mainQueue.run();
-        EXPECT_TRUE(fake.ports.deliver(logChannelLocalPortName, 0,
-                                       PacketBuilder(0xB0C2).u16(14, 301).size(38).build()));
-        fake.mainQueue.advance(2s);
+        tell(301);
         return *window;
+    }
+    void tell(std::uint16_t identity)
+    {
+        EXPECT_TRUE(fake.ports.deliver(logChannelLocalPortName, 0,
+                                       PacketBuilder(0xB0C2).u16(14, identity).size(38).build()));
+        fake.mainQueue.run();
+        fake.mainQueue.advance(2s);
     }
     void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier)
     {
@@ -513,6 +524,82 @@ TEST_F(TimeLineWindowTest, ThePauseButtonFreezesAndLeadsBack)
     button.click();
     EXPECT_FALSE(window->timeLine().isPaused());
     EXPECT_EQ(window->timeLineView()->strip().cursor(), std::nullopt);
+}
+
+TEST_F(TimeLineWindowTest, AClickOnACellOpensItsPaneWithTheWayBackBelowIt)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    QTableView& cells = window->timeLineView()->cells().table();
+    ASSERT_EQ(cells.model()->rowCount(), 1);
+    QTest::mouseClick(cells.viewport(), Qt::LeftButton, {},
+                      cells.visualRect(cells.model()->index(0, 0)).center());
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik", "Serving Cell Info"));
+}
+
+TEST_F(TimeLineWindowTest, AClickOnACellLeavesTheTimeLinesScreen)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(480);
+    press(Qt::Key_T, Qt::ControlModifier);
+    QTableView& cells = window->timeLineView()->cells().table();
+    QTest::mouseClick(cells.viewport(), Qt::LeftButton, {},
+                      cells.visualRect(cells.model()->index(0, 0)).center());
+    EXPECT_THAT(screenTitles(), ElementsAre("Ventrik", "Serving Cell Info"));
+    EXPECT_FALSE(showsTimeLine());
+}
+
+TEST_F(TimeLineWindowTest, AClickOnAnEventGoesToItsMoment)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(1280);
+    const Clock::TimePoint first = fake.clock.now();
+    fake.clock.advance(10s);
+    tell(302);
+    fake.clock.advance(10s);
+    tell(303);
+    QListView& events = window->timeLineView()->events().list();
+    ASSERT_GE(events.model()->rowCount(), 2); // the newest on top
+    QTest::mouseClick(events.viewport(), Qt::LeftButton, {},
+                      events.visualRect(events.model()->index(1, 0)).center());
+    EXPECT_EQ(window->timeLine().pausedAt(), first + 10s);
+    EXPECT_EQ(*window->nodeAtPath("/Serving Cell Info/Physical Cell ID")->value(), "302");
+}
+
+TEST_F(TimeLineWindowTest, AClickOnTheStripShowsThatMomentEverywhere)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(1280);
+    window->togglePin("/Serving Cell Info/Physical Cell ID");
+    const Clock::TimePoint first = fake.clock.now();
+    fake.clock.advance(100s);
+    tell(302);
+    SignalStrip& strip = window->timeLineView()->strip();
+    QTest::mouseClick(&strip, Qt::LeftButton, {},
+                      QPoint(static_cast<int>(strip.xOf(first + 50s)), strip.height() / 3));
+    ASSERT_TRUE(window->timeLine().isPaused());
+    EXPECT_NEAR(std::chrono::duration<double>(*window->timeLine().pausedAt() - first).count(), 50,
+                2);
+    EXPECT_EQ(*window->nodeAtPath("/Serving Cell Info/Physical Cell ID")->value(), "301");
+    ASSERT_EQ(window->timeLineView()->cells().model().rowCount(), 1);
+    EXPECT_EQ(window->timeLineView()->cells().model().cell(0).identity, "301");
+    press(Qt::Key_Home);
+    EXPECT_EQ(window->timeLineView()->cells().model().cell(0).identity, "302");
+}
+
+TEST_F(TimeLineWindowTest, ListsStandUnderTabsWhereThereIsNoRoomForBoth)
+{
+    launch(900);
+    EXPECT_TRUE(window->timeLineView()->cells().isVisible());
+    EXPECT_FALSE(window->timeLineView()->events().isVisible());
+    QTabBar& tabs = *window->timeLineView()->findChild<QTabBar*>();
+    tabs.setCurrentIndex(1);
+    EXPECT_FALSE(window->timeLineView()->cells().isVisible());
+    EXPECT_TRUE(window->timeLineView()->events().isVisible());
+    resize(1280);
+    EXPECT_TRUE(window->timeLineView()->cells().isVisible());
+    EXPECT_TRUE(window->timeLineView()->events().isVisible());
+    EXPECT_FALSE(tabs.isVisible());
 }
 
 } // namespace ventrik

@@ -337,6 +337,86 @@ TEST_F(SmallChangeStoreTest, BeginsAnewWhereTheNamesAreEverNewOnes)
 namespace
 {
 
+/// Says how the records of its one section were read.
+class ReadingGenerator : public IdleGenerator
+{
+  public:
+    const ReadLayout* lastRead() const override { return &read; }
+    std::vector<std::string_view> sectionsOfCode(std::uint32_t) const override
+    {
+        return {"Section"};
+    }
+    std::string_view sectionAt(const PlistDictionary&,
+                               std::span<const std::string_view> path) const override
+    {
+        return path.front() == "Section" ? "Section" : "";
+    }
+
+    ReadLayout read{0xB0C2, 7, 40, LayoutKind::Base};
+};
+
+class ChangeStoreNotesTest : public ChangeStoreTest
+{
+  protected:
+    ChangeStoreNotesTest() { store.useGenerator(&reading, "lte"); }
+    void show(std::string_view value)
+    {
+        state.set(StateKey::display,
+                  PlistDictionary{{"Section", PlistDictionary{{"a", value}}}, {"Other", value}});
+        take();
+    }
+    std::vector<std::string> warningsAt(std::uint64_t moment, const std::string& path)
+    {
+        return store.at(moment).layoutWarningsAt(path);
+    }
+
+    ReadingGenerator reading;
+};
+
+} // namespace
+
+TEST_F(ChangeStoreNotesTest, TellsWhichRecordsOfASectionWereReadWithoutTheirLayoutBeingKnown)
+{
+    show("1");
+    reading.read.kind = LayoutKind::NotKnown;
+    show("2");
+    reading.read.kind = LayoutKind::Base;
+    show("3");
+    const std::string warning = "0xB0C2 version 7: layout not known, values may be wrong";
+    EXPECT_THAT(warningsAt(2, "/Section"), IsEmpty());
+    EXPECT_THAT(warningsAt(4, "/Section"), ElementsAre(warning));
+    EXPECT_THAT(warningsAt(4, "/Section/a"), ElementsAre(warning));
+    EXPECT_THAT(warningsAt(4, "/Other"), IsEmpty());
+    EXPECT_THAT(warningsAt(4, "/"), IsEmpty());
+    EXPECT_THAT(warningsAt(6, "/Section"), IsEmpty());
+}
+
+TEST_F(ChangeStoreNotesTest, TellsItOfThePresentAsWell)
+{
+    show("1");
+    reading.read.kind = LayoutKind::NotKnown;
+    take(); // which changes nothing
+    EXPECT_EQ(warningsAt(store.present(), "/Section").size(), 1U);
+}
+
+TEST_F(ChangeStoreNotesTest, KnowsTheWarningsOfAnEarlierPart)
+{
+    ChangeStore small(RecordsMode::Newer, smallLimits);
+    small.useGenerator(&reading, "lte");
+    reading.read.kind = LayoutKind::NotKnown;
+    PlistDictionary counter{{"a", "0"}};
+    state.set(StateKey::display, PlistDictionary{{"Section", counter}});
+    for (int i = 0; i < 20000; ++i) {
+        counter.set("a", std::to_string(i));
+        small.messageTaken(start + i * 1s, message, state);
+    }
+    ASSERT_GT(small.firstMoment(), 0U);
+    EXPECT_EQ(small.at(small.firstMoment() + 1).layoutWarningsAt("/Section").size(), 1U);
+}
+
+namespace
+{
+
 /// A technology's scenario through its generator, and a store beside it.
 class ChangeStoreOfTechnologyTest : public testing::TestWithParam<std::string_view>
 {

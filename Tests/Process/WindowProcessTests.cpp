@@ -222,6 +222,27 @@ TEST_F(WindowProcess, KeepsTheSizeThatItIsGiven)
         << window->errors();
 }
 
+TEST_F(WindowProcess, OpensACaptureWithoutAService)
+{
+    const std::string capture = path("drive.pcap");
+    const auto writer =
+        start("ventrik-telephony", {"--technology", "lte", "--write", capture, "--count", "500"});
+    EXPECT_EQ(writer->waitForEnd(), 0) << writer->errors();
+    const auto window = startReadWindow({"--open", capture});
+    EXPECT_TRUE(waitUntil([&] { return window->says("drive.pcap at 20"); })) << window->errors();
+    EXPECT_TRUE(window->says("Ventrik – drive.pcap | "));
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+}
+
+TEST_F(WindowProcess, RefusesToOpenWhatIsNoCapture)
+{
+    const std::string file = writeFile("no.pcap", "this is none");
+    const auto window = start("ventrik", {"--open", file});
+    EXPECT_EQ(window->waitForEnd(), 1);
+    EXPECT_TRUE(window->says("ventrik: " + file + ": ")) << window->errors();
+}
+
 TEST_F(WindowProcess, TellsTheSessionBusThatThePreferenceHasChanged)
 {
     const auto bus = startBus();

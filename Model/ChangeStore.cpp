@@ -167,8 +167,7 @@ std::uint32_t ChangeStore::codeOf(ByteView message) const
         return read->logCode;
     if (_wanted.wantsAll() || !_wanted.wants(message))
         return 0;
-    const auto kind = recordKindOf(message, _records);
-    return kind ? kind->logCode : 0;
+    return effectiveLogCode(LogPacket(stripPrefix(message)));
 }
 
 // What no record tells is not told again by another message; but that of the cell monitor, whose

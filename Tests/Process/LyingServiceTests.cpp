@@ -54,7 +54,8 @@ class LyingService : public ProcessFixture
         everything.start(5ms);
         startViewer(lie);
         EXPECT_TRUE(comesToShow("302"));
-        EXPECT_LT(longest, isSanitized ? 2000ms : 1200ms);
+        // A silent one holds it for 1 s; the rest is for machines that have much else to do.
+        EXPECT_LT(longest, 3000ms);
     }
     Time::duration timeSinceLie() const { return std::chrono::steady_clock::now() - liedAt; }
 

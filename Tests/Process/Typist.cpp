@@ -89,7 +89,8 @@ class WindowReader : public QObject
     {
         for (QLabel* label : window.findChildren<QLabel*>())
             if (label->isVisible() &&
-                (label->text().startsWith("Connecting") || label->text().startsWith("Updated ")))
+                (label->text().startsWith("Connecting") || label->text().startsWith("Updated ") ||
+                 label->text().contains(" at 20")))
                 return label;
         return nullptr;
     }

@@ -229,8 +229,8 @@ TEST_F(WindowProcess, OpensACaptureWithoutAService)
         start("ventrik-telephony", {"--technology", "lte", "--write", capture, "--count", "500"});
     EXPECT_EQ(writer->waitForEnd(), 0) << writer->errors();
     const auto window = startReadWindow({"--open", capture});
-    EXPECT_TRUE(waitUntil([&] { return window->says("drive.pcap at 20"); })) << window->errors();
-    EXPECT_TRUE(window->says("Ventrik – drive.pcap | "));
+    EXPECT_TRUE(waitUntil([&] { return window->says("Ventrik – drive.pcap | drive.pcap at 20"); }))
+        << window->errors();
     window->send(SIGTERM);
     EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
 }

@@ -143,33 +143,21 @@ void PinnedSeries::take(std::size_t pin, const StoredChange& change)
     else
         follower.numbers.erase(change.place);
     follower.logCode = change.logCode;
-    SeriesPoint* last = series.points.empty() ? nullptr : &series.points.back();
-    if (follower.numbers.empty()) {
-        if (last && !last->isEnd) {
-            last->isEnd = true;
-            last->until = change.time;
-        }
-        return;
-    }
+    if (follower.numbers.empty())
+        return takeNumber(series.points, change.time, std::nullopt);
     if (!change.value.unit.empty())
         series.unit = change.value.unit;
     const double value = std::ranges::max_element(follower.numbers, {}, [](const auto& number) {
                              return number.second;
                          })->second;
-    // What one message tells, it tells at once. What stays is heard again.
-    if (last && last->from == change.time)
-        *last = {change.time, change.time, value};
-    else if (!last || last->isEnd || last->value != value)
-        series.points.push_back({change.time, change.time, value});
+    takeNumber(series.points, change.time, value);
 }
 
 void PinnedSeries::heard(Clock::TimePoint time, std::uint32_t logCode)
 {
-    for (std::size_t pin = 0; pin < _series.size(); ++pin) {
-        auto& points = _series[pin].points;
-        if (!points.empty() && !points.back().isEnd && _followers[pin].logCode == logCode)
-            points.back().until = std::max(points.back().until, time);
-    }
+    for (std::size_t pin = 0; pin < _series.size(); ++pin)
+        if (_followers[pin].logCode == logCode)
+            hearAgain(_series[pin].points, time);
 }
 
 void PinnedSeries::dropOld()

@@ -2,6 +2,9 @@
 
 #include "Platform/Clock.h"
 
+#include <optional>
+#include <vector>
+
 namespace ventrik
 {
 
@@ -12,5 +15,12 @@ struct SeriesPoint {
     double value;
     bool isEnd = false; ///< it went away then: no line leads to the next one
 };
+
+/// From that time on the number stands, or none does. What one message tells, it tells at once: of
+/// several numbers at one time the last one stays.
+void takeNumber(std::vector<SeriesPoint>& points, Clock::TimePoint time,
+                std::optional<double> number);
+/// What stands was told again then.
+void hearAgain(std::vector<SeriesPoint>& points, Clock::TimePoint time);
 
 } // namespace ventrik

@@ -10,6 +10,7 @@
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/StandardStreams.h"
 #include "PropertyList/Json.h"
+#include "Report/CaptureReport.h"
 #include "Tools/ChosenTechnology.h"
 #include "Tools/ConsoleSystemLog.h"
 #include "Tools/FileSystemLog.h"
@@ -73,11 +74,12 @@ class Progress
     bool _shown = false;
 };
 
-// Rows tell all that changes by themselves. The log tells of the history, too.
+// Rows and reports tell all that changes by themselves. The log tells of the history, too.
 bool wantsHistory(const DecodeOptions& options)
 {
-    return options.format != DecodeFormat::Rows || options.snapshotFile || options.systemLogFile ||
-           options.verbose;
+    const bool tellsChanges =
+        options.format == DecodeFormat::Rows || options.format == DecodeFormat::Html;
+    return !tellsChanges || options.snapshotFile || options.systemLogFile || options.verbose;
 }
 
 class Decoding
@@ -97,6 +99,8 @@ class Decoding
     {
         if (options.format == DecodeFormat::Rows)
             _rows.emplace(options.rows, options.capture, technology, generator, options.records);
+        if (options.format == DecodeFormat::Html)
+            _report.emplace(generator, technology, options.records);
     }
 
     int run()
@@ -161,6 +165,8 @@ class Decoding
             count(*message);
             if (_rows)
                 writeRows(*message);
+            else if (_report)
+                _report->take(message->time, message->data, _decoder.state());
             else if (_options.format == DecodeFormat::JsonLines)
                 writeLine(*message);
             progress.count(++_packets);
@@ -187,17 +193,25 @@ class Decoding
             _extensionCount += isExtensionOnly(LogPacket(stripPrefix(message.data))) ? 1 : 0;
     }
 
+    std::vector<std::string> recordRemarks() const
+    {
+        std::vector<std::string> remarks;
+        for (const ReadLayout& layout : _decoder.layouts())
+            if (layout.kind == LayoutKind::NotKnown)
+                remarks.push_back(fmt::format("{}: {}", _options.capture, warningOf(layout)));
+        if (_extensionCount > 0)
+            remarks.push_back(fmt::format("{}: {} records that only --records extended decodes",
+                                          _options.capture, _extensionCount));
+        return remarks;
+    }
+
     // Only where there is something that the result cannot tell.
     void tellAboutRecords()
     {
         for (const std::string& note : _reader.notes())
             complain(note);
-        for (const ReadLayout& layout : _decoder.layouts())
-            if (layout.kind == LayoutKind::NotKnown)
-                complain(fmt::format("{}: {}", _options.capture, warningOf(layout)));
-        if (_extensionCount > 0)
-            complain(fmt::format("{}: {} records that only --records extended decodes",
-                                 _options.capture, _extensionCount));
+        for (const std::string& remark : recordRemarks())
+            complain(remark);
         if (_options.statistics) {
             show(fmt::format("{}: {} messages of {} bytes", _options.capture, _packets, _bytes));
             if (_lastTime)
@@ -282,10 +296,37 @@ class Decoding
         flushRows();
     }
 
+    void writeReport()
+    {
+        ReportFacts facts{.capture = _options.capture,
+                          .technology = {},
+                          .notes = reportNotes(),
+                          .program = "Ventrik " + _options.version};
+        if (const auto first = _report->firstTime())
+            facts.secondsFromUtc = _clock.timeZone(*first).secondsFromUtc;
+        write(_report->page(std::move(facts)));
+    }
+
+    std::vector<std::string> reportNotes() const
+    {
+        std::vector<std::string> notes;
+        if (!_failure.empty() && !interrupted)
+            notes.push_back(_failure);
+        if (interrupted)
+            notes.push_back("Decoding was interrupted: the report tells of what came before.");
+        const auto skipped = _reader.notes();
+        notes.insert(notes.end(), skipped.begin(), skipped.end());
+        const auto remarks = recordRemarks();
+        notes.insert(notes.end(), remarks.begin(), remarks.end());
+        return notes;
+    }
+
     void writeResult()
     {
         if (_rows)
             return closeRows();
+        if (_report)
+            return writeReport();
         if (_options.format == DecodeFormat::Json) {
             fmt::format_to(std::back_inserter(_text),
                            "{{\"technology\": \"{}\", \"packets\": {}, \"display\": ",
@@ -348,6 +389,7 @@ class Decoding
     int _outputError = 0;
     OfflineDecoder _decoder;
     std::optional<CaptureRows> _rows;      // where they are wanted
+    std::optional<CaptureReport> _report;  // likewise
     std::unique_ptr<CaptureFile> _capture; // likewise
     std::size_t _oversizedCount = 0;       // of messages that no capture takes
     RecordCensus _census;

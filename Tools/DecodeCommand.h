@@ -13,7 +13,7 @@
 namespace ventrik
 {
 
-enum class DecodeFormat { Text, Json, JsonLines, Rows };
+enum class DecodeFormat { Text, Json, JsonLines, Rows, Html };
 
 struct DecodeOptions {
     std::string capture; ///< a file, or "-" for standard input

@@ -29,7 +29,8 @@ NamedFormat formatValue(const std::string& text)
         {"jsonl", {DecodeFormat::JsonLines}},
         {"rows", {DecodeFormat::Rows, RowFormat::JsonLines}},
         {"csv", {DecodeFormat::Rows, RowFormat::Csv}},
-        {"influx", {DecodeFormat::Rows, RowFormat::Influx}}};
+        {"influx", {DecodeFormat::Rows, RowFormat::Influx}},
+        {"html", {DecodeFormat::Html}}};
     const auto format = formats.find(text);
     if (format == formats.end())
         throw WrongValue(fmt::format("there is no format '{}'", text));
@@ -61,7 +62,8 @@ void addOptions(CommandLine& line, DecodeOptions& result)
     line.addOption("--format FORMAT",
                    "text: the display tree at the end (default); json: one document; jsonl: a "
                    "line for every message; rows: a line of JSON for every value that changed; "
-                   "csv: the same as a table; influx: the same in InfluxDB's line protocol",
+                   "csv: the same as a table; influx: the same in InfluxDB's line protocol; "
+                   "html: a report as one page, with charts, events and cells",
                    [&](const std::string& text) {
                        const NamedFormat format = formatValue(text);
                        result.format = format.format;

@@ -19,6 +19,9 @@ constexpr std::size_t chunksOfStore = 32;
 // Of the raw packets less is kept: they take the most, and a change can do without.
 constexpr std::size_t packetShare = 4;
 constexpr std::size_t largestPacketKept = 65536;
+// From one key state to the next one there are as many changes as this, and for each of its places.
+constexpr std::size_t fewestChanges = 512;
+constexpr std::size_t changesForPlace = 8;
 constexpr auto hearingInterval = 1s;
 constexpr std::size_t mostEvents = 4096;
 constexpr unsigned knownValueBits = 13;
@@ -132,7 +135,7 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
         beginMessage(message, logCode);
         for (const DisplayChange& change : changes)
             take(change, state);
-        if (_changes->takeReordered())
+        if (_changes->takeReordered() || isFarFromKeyState())
             writeKeyState(state);
     }
     hear(logCode);
@@ -158,6 +161,18 @@ void ChangeStore::noteLayout()
         return;
     Chunk& chunk = *_chunks.back();
     chunk.layouts.push_back({static_cast<std::uint32_t>(chunk.changes.size()), *read});
+}
+
+// A moment is made of the key state before it and the changes since then: of few enough that it
+// costs about what the display itself does.
+bool ChangeStore::isFarFromKeyState() const
+{
+    const Chunk& chunk = *_chunks.back();
+    if (chunk.keyStates.empty())
+        return false;
+    const KeyState& last = chunk.keyStates.back();
+    const std::size_t enough = std::max(fewestChanges, changesForPlace * last.places.size());
+    return chunk.changes.size() - last.change >= enough;
 }
 
 // The generator knows it as a rule. What nobody reads is nobody's.

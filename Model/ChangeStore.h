@@ -193,6 +193,7 @@ class ChangeStore : public MessageObserver
     };
 
     std::uint32_t codeOf(ByteView message) const;
+    bool isFarFromKeyState() const;
     void hear(std::uint32_t logCode);
     void noteLayout();
     void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,

@@ -53,8 +53,10 @@ std::vector<LineGroup> lineGroups(std::span<const NumberLine> lines, const Place
         if (line.changeCount > 0)
             changed.push_back(&line);
     const auto order = treeOrder(places);
-    // Groups stand where their first line does.
-    std::ranges::sort(changed, {}, [&](const NumberLine* line) { return order[line->place]; });
+    // Levels come before what is no measure; groups stand where their first line does.
+    std::ranges::sort(changed, {}, [&](const NumberLine* line) {
+        return std::pair(line->unit.empty(), order[line->place]);
+    });
     std::vector<LineGroup> groups;
     std::map<std::pair<PlaceId, std::string>, std::size_t> last; // group of a holder and a unit
     for (const NumberLine* line : changed) {
@@ -125,7 +127,10 @@ std::string ReportCharts::pictureOf(const LineGroup& group) const
     const double height =
         heightOfAxis + lanes * (group.unit.empty() ? heightOfPlainLane : heightOfLane);
     SvgCanvas canvas(width, height, titleOf(group));
-    const ChartContent content{lines, _marks, _store.firstTime(), _store.lastTime()};
+    // In low pictures marks would hide more than they tell.
+    const std::span<const ChartMark> marks =
+        group.unit.empty() ? std::span<const ChartMark>() : _marks;
+    const ChartContent content{lines, marks, _store.firstTime(), _store.lastTime()};
     SignalChart(content, looks, width, height, canvas).draw(canvas);
     return canvas.document();
 }
@@ -154,7 +159,9 @@ void ReportCharts::write(HtmlWriter& html) const
     writeNotes(html);
     std::string section;
     for (const Chart& chart : _charts) {
-        const std::string next = sectionOf(_groups[chart.group]);
+        const LineGroup& group = _groups[chart.group];
+        const std::string next =
+            sectionOf(group) + (group.unit.empty() ? ": numbers without a unit" : "");
         if (next != section)
             html.element("h3", section = next);
         writeChart(html, chart);

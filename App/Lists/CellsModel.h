@@ -34,7 +34,7 @@ class CellsModel : public QAbstractTableModel
 
     void setCells(std::vector<CellRow> cells);
     const CellRow& cell(int row) const { return _cells[static_cast<std::size_t>(row)]; }
-    /// Whether some cell has something to show there that sets it apart from the others.
+    /// Whether some cell has something to show there; systems, whether there are several.
     bool isTelling(Column column) const;
 
     int rowCount(const QModelIndex& parent = {}) const override;

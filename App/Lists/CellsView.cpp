@@ -25,11 +25,11 @@ namespace
 
 // Where there is not room for all, the last ones go first.
 constexpr std::array<CellsModel::Column, CellsModel::ColumnCount> byImportance{
-    CellsModel::Identity,   CellsModel::Level,  CellsModel::Kind,    CellsModel::Quality,
-    CellsModel::Difference, CellsModel::Age,    CellsModel::Channel, CellsModel::Band,
-    CellsModel::Frequency,  CellsModel::System,
+    CellsModel::Kind,       CellsModel::Identity, CellsModel::Level, CellsModel::Channel,
+    CellsModel::Difference, CellsModel::Quality,  CellsModel::Band,  CellsModel::Frequency,
+    CellsModel::Age,        CellsModel::System,
 };
-constexpr std::size_t alwaysShown = 2;
+constexpr std::size_t alwaysShown = 3;
 constexpr int widestBarColumn = 280;
 
 } // namespace

@@ -10,6 +10,9 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
+#include <iterator>
+
 namespace ventrik
 {
 
@@ -145,10 +148,28 @@ TEST_F(CellsViewTest, DropsTheLeastImportantColumnsWhereThereIsLittleRoom)
     view.setCells(lteCells());
     EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "RSRP dBm"));
     show(450);
-    EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "RSRP dBm", "RSRQ dB", "Age s"));
+    EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "Channel", "Band", "RSRP dBm"));
     show(80);
-    EXPECT_THAT(shownColumns(), ElementsAre("PCI", "RSRP dBm"));
+    EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "RSRP dBm"));
     EXPECT_GT(view.table().horizontalScrollBar()->maximum(), 0);
+}
+
+TEST_F(CellsViewTest, DropsColumnsFromTheLeastImportantOneOn)
+{
+    std::vector<CellRow> cells = lteCells();
+    cells[0].difference = -14.5;
+    view.setCells(cells);
+    std::vector<std::string> dropped;
+    for (int width = 800; width >= 200; --width) {
+        const std::vector<std::string> before = shownColumns();
+        show(width);
+        const std::vector<std::string> now = shownColumns();
+        std::ranges::copy_if(before, std::back_inserter(dropped), [&](const std::string& name) {
+            return std::ranges::find(now, name) == now.end() &&
+                   std::ranges::find(dropped, name) == dropped.end();
+        });
+    }
+    EXPECT_THAT(dropped, ElementsAre("Age s", "MHz", "Band", "RSRQ dB", "Δ dB", "Channel"));
 }
 
 TEST_F(CellsViewTest, FillsItsWidthWithItsColumns)

@@ -165,7 +165,6 @@ void TimeLineView::updateStrip()
     for (const Event& event : _timeLine.events().events())
         if (event.isMark)
             shown.marks.push_back({event.time, event.text});
-    shown.first = _timeLine.store().firstTime();
     // Where nothing comes the present goes on.
     shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()
                                       : std::max(_timeLine.store().lastTime(), _clock.now());
@@ -175,3 +174,4 @@ void TimeLineView::updateStrip()
 }
 
 } // namespace ventrik
+    shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();

@@ -34,8 +34,8 @@ struct StripListener {
     std::function<void()> onLive = {};                   ///< the user wants the present
 };
 
-/// Signals over time in a window. It follows the newest five minutes; wheel, pinch, drags and keys
-/// show others. A click chooses a moment, which the cursor marks; a second cursor tells
+/// Signals over time in a window. It follows the newest, five minutes at most; wheel, pinch, drags
+/// and keys show others. A click chooses a moment, which the cursor marks; a second cursor tells
 /// differences.
 class SignalStrip : public QWidget
 {

@@ -13,9 +13,16 @@ void StripRange::setExtent(Clock::TimePoint first, Clock::TimePoint last)
     if (_fits)
         fitNow();
     else if (_isFollowing)
-        _last = _extentLast;
+        followNow();
     else
         settle();
+}
+
+void StripRange::followNow()
+{
+    _last = _extentLast;
+    if (_grows)
+        _length = std::clamp<Duration>(_extentLast - _extentFirst, shortestAtFirst, longestAtFirst);
 }
 
 void StripRange::setExtent(Clock::TimePoint first, Clock::TimePoint last, Clock::TimePoint kept)
@@ -55,6 +62,7 @@ void StripRange::zoom(double factor, Clock::TimePoint around)
                                      static_cast<double>(longest.count()));
     if (!std::isfinite(length))
         return;
+    _grows = false;
     const auto before = std::clamp(around, first(), _last);
     const double share =
         static_cast<double>((_last - before).count()) / static_cast<double>(_length.count());
@@ -66,6 +74,7 @@ void StripRange::zoom(double factor, Clock::TimePoint around)
 void StripRange::fit()
 {
     _fits = true;
+    _grows = false;
     _isFollowing = true;
     fitNow();
 }
@@ -80,7 +89,7 @@ void StripRange::follow()
 {
     _fits = false;
     _isFollowing = true;
-    _last = _extentLast;
+    followNow();
 }
 
 void StripRange::reveal(Clock::TimePoint time)

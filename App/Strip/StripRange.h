@@ -7,14 +7,17 @@
 namespace ventrik
 {
 
-/// Which times are shown of those that there are: at first the newest five minutes, which follow
-/// what comes. Never outside of what there is, where that is longer than what is shown.
+/// Which times are shown of those that there are: at first the newest, which follow what comes, a
+/// minute and then all that there is up to five. Never outside of what there is, where that is
+/// longer than what is shown.
 class StripRange
 {
   public:
     using Duration = std::chrono::nanoseconds;
     static constexpr Duration shortest = std::chrono::seconds(1);
     static constexpr Duration longest = std::chrono::hours(48);
+    static constexpr Duration shortestAtFirst = std::chrono::minutes(1);
+    static constexpr Duration longestAtFirst = std::chrono::minutes(5);
 
     /// What there is now. `kept` is a time that does not leave the view by following.
     void setExtent(Clock::TimePoint first, Clock::TimePoint last);
@@ -40,14 +43,16 @@ class StripRange
 
   private:
     void fitNow();
+    void followNow();
     void settle();
 
     Clock::TimePoint _extentFirst;
     Clock::TimePoint _extentLast;
     Clock::TimePoint _last;
-    Duration _length = std::chrono::minutes(5);
+    Duration _length = shortestAtFirst;
     bool _isFollowing = true;
     bool _fits = false;
+    bool _grows = true; // while nobody chose a length
 };
 
 } // namespace ventrik

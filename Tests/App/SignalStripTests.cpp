@@ -54,6 +54,28 @@ TEST_F(SignalStripTest, AtFirstTheNewestFiveMinutesShow)
     EXPECT_EQ(last(), 1200);
 }
 
+TEST_F(SignalStripTest, AsLongAsThereIsLittleAllOfItShowsAndAMinuteAtLeast)
+{
+    setDataUntil(20);
+    EXPECT_EQ(first(), -40);
+    EXPECT_EQ(last(), 20);
+    setDataUntil(100);
+    EXPECT_EQ(first(), 0);
+    EXPECT_EQ(last(), 100);
+    setDataUntil(400);
+    EXPECT_EQ(first(), 100);
+}
+
+TEST_F(SignalStripTest, ALengthThatWasChosenStaysThoughMoreComes)
+{
+    setDataUntil(100);
+    wheel({599, 100}, {0, 120});
+    const double chosen = length();
+    ASSERT_LT(chosen, 100);
+    setDataUntil(200);
+    EXPECT_NEAR(length(), chosen, 0.01);
+}
+
 TEST_F(SignalStripTest, TheNewestIsFollowed)
 {
     setDataUntil(1202);

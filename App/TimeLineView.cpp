@@ -3,6 +3,7 @@
 #include "App/Lists/CellsView.h"
 #include "App/Lists/EventsView.h"
 #include "App/Strip/SignalStrip.h"
+#include "App/TimeLineMenu.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/PushButton.h"
 #include "App/Toolkit/Separator.h"
@@ -11,7 +12,6 @@
 
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QMenu>
 #include <QPainter>
 #include <QSplitter>
 #include <QTabBar>
@@ -54,8 +54,9 @@ TimeLineView::TimeLineView(TimeLine& timeLine, const Clock& clock)
       _clock(clock),
       _status(makeLabel(systemFont(statusPoints, FontWeight::Regular), nullptr)),
       _pause(new PushButton),
-      _menu(new PushButton(QStringLiteral("More"))),
+      _menuButton(new PushButton(QStringLiteral("More"))),
       _strip(new SignalStrip),
+      _menu(new TimeLineMenu(timeLine, clock, *_strip, this)),
       _cells(new CellsView),
       _events(new EventsView),
       _tabs(new QTabBar)
@@ -64,6 +65,7 @@ TimeLineView::TimeLineView(TimeLine& timeLine, const Clock& clock)
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
+    _menuButton->setAccessibleDescription(QStringLiteral("Files of the time line, and its keys"));
     layout->addWidget(makeBar());
     auto* parts = new QSplitter(Qt::Vertical, this);
     parts->setChildrenCollapsible(false);
@@ -119,7 +121,8 @@ QWidget* TimeLineView::makeBar()
     layout->setContentsMargins(barMargin, 0, barMargin, 0);
     layout->addWidget(_status, 1);
     layout->addWidget(_pause);
-    layout->addWidget(_menu);
+    layout->addWidget(_menuButton);
+    connect(_menuButton, &QPushButton::clicked, this, [this] { _menu->openBelow(*_menuButton); });
     connect(_pause, &QPushButton::clicked, this, [this] {
         if (_listener.onPause)
             _listener.onPause();
@@ -134,12 +137,21 @@ void TimeLineView::setListener(TimeLineListener listener)
         if (_listener.onOpen)
             _listener.onOpen(path);
     });
+    _menu->setOnSaved([this](const std::string& fileName) {
+        if (_listener.onSaved)
+            _listener.onSaved(fileName);
+    });
     _events->setOnEvent([this](const Event& event) { _timeLine.showEvent(event); });
     _strip->setListener({[this](Clock::TimePoint time) { _timeLine.showTime(time); },
                          [this] {
                              if (_listener.onLive)
                                  _listener.onLive();
                          }});
+}
+
+void TimeLineView::setCaptureName(const std::string& name)
+{
+    _menu->setCaptureName(name);
 }
 
 void TimeLineView::setStatus(const QString& text, bool isPaused, const QString& live)
@@ -168,10 +180,10 @@ void TimeLineView::updateStrip()
     // Where nothing comes the present goes on.
     shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()
                                       : std::max(_timeLine.store().lastTime(), _clock.now());
+    shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();
     _strip->setSecondsFromUtc(_clock.timeZone(shown.last).secondsFromUtc);
     _strip->setData(std::move(shown));
     _strip->setCursor(_timeLine.pausedAt());
 }
 
 } // namespace ventrik
-    shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();

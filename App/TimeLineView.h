@@ -17,12 +17,14 @@ namespace ventrik
 class CellsView;
 class EventsView;
 class SignalStrip;
+class TimeLineMenu;
 
 /// What the time line's view tells its owner.
 struct TimeLineListener {
     std::function<void()> onLive = {};                        ///< back to the present
     std::function<void(const std::string& path)> onOpen = {}; ///< the pane there
     std::function<void()> onPause = {};                       ///< the present, or back to it
+    std::function<void(const std::string& fileName)> onSaved = {};
 };
 
 /// The time line: signals over time, the cells of the moment that is shown side by side, and what
@@ -36,6 +38,8 @@ class TimeLineView : public QWidget
     TimeLineView(TimeLine& timeLine, const Clock& clock);
 
     void setListener(TimeLineListener listener);
+    /// As the files of values name it; "live" as long as nothing else is said.
+    void setCaptureName(const std::string& name);
     /// There are new data, or another moment is shown.
     void update();
     /// What the bar at the top says, and what leads back from a pause.
@@ -44,6 +48,7 @@ class TimeLineView : public QWidget
     SignalStrip& strip() const { return *_strip; }
     CellsView& cells() const { return *_cells; }
     EventsView& events() const { return *_events; }
+    TimeLineMenu& menu() const { return *_menu; }
 
   protected:
     void resizeEvent(QResizeEvent* event) override;
@@ -53,15 +58,15 @@ class TimeLineView : public QWidget
     QWidget* makeLists();
     void layOutLists();
     void updateStrip();
-    void showMenu();
 
     TimeLine& _timeLine;
     const Clock& _clock;
     TimeLineListener _listener;
     QLabel* _status;
     QPushButton* _pause;
-    QPushButton* _menu;
+    QPushButton* _menuButton;
     SignalStrip* _strip;
+    TimeLineMenu* _menu;
     CellsView* _cells;
     EventsView* _events;
     QTabBar* _tabs; // where the lists show one at a time

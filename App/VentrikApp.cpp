@@ -179,9 +179,13 @@ void VentrikApp::showWindow()
 void VentrikApp::createTimeLine()
 {
     _timeLineView = new TimeLineView(_timeLine, _platform.clock);
-    _timeLineView->setListener({.onLive = [this] { goLive(); },
-                                .onOpen = [this](const std::string& path) { openPane(path); },
-                                .onPause = [this] { togglePause(); }});
+    _timeLineView->setListener(
+        {.onLive = [this] { goLive(); },
+         .onOpen = [this](const std::string& path) { openPane(path); },
+         .onPause = [this] { togglePause(); },
+         .onSaved = [this](const std::string& fileName) { snapshotSaved(fileName); }});
+    if (_options.opened)
+        _timeLineView->setCaptureName(_options.opened->name());
     _viewerWindow->addTimeLine(_timeLineView);
     const auto kept = _platform.preferences.text(preferenceDomain, timeLineKey);
     _viewerWindow->setTimeLineWanted(_options.timeLine && kept != timeLineHidden);

@@ -119,6 +119,7 @@ void ChangeStore::channelChanged(Clock::TimePoint time, bool isOpen, std::string
 void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
                                const PlistDictionary& state)
 {
+    ++_messagesTold;
     if (!_changes)
         return;
     _lastTime = std::max(_lastTime, time);
@@ -207,8 +208,9 @@ void ChangeStore::beginMessage(ByteView message, std::uint32_t logCode)
     Chunk& chunk = *_chunks.back();
     const bool isKept = message.size() <= largestPacketKept;
     chunk.messages.push_back({_lastTime, logCode, static_cast<std::uint32_t>(chunk.changes.size()),
-                              chunk.packets.size(),
+                              chunk.packets.size(), _messagesTold - 1,
                               isKept ? static_cast<std::uint32_t>(message.size()) : 0});
+    _message = static_cast<std::uint32_t>(chunk.messages.size() - 1);
     if (isKept)
         chunk.packets.insert(chunk.packets.end(), message.begin(), message.end());
     chunk.lastTime = _lastTime;
@@ -222,14 +224,15 @@ void ChangeStore::takeFirst(std::span<const DisplayChange> changes, ByteView mes
         return _wanted.wantsAll() || _changes->cellAt(*change.place, state).has_value();
     };
     beginMessage({}, 0);
-    for (const DisplayChange& change : changes)
-        if (!isTold(change))
-            take(change, state);
     removeWhatIsNotShown(state);
+    const std::uint32_t untold = _message;
     beginMessage(message, logCode);
-    for (const DisplayChange& change : changes)
-        if (isTold(change))
-            take(change, state);
+    const std::uint32_t told = _message;
+    for (const DisplayChange& change : changes) {
+        _message = isTold(change) ? told : untold;
+        take(change, state);
+    }
+    _message = told;
     _changes->takeReordered();
     writeKeyState(state);
 }
@@ -317,8 +320,8 @@ void ChangeStore::forget(PlaceId id)
 void ChangeStore::addChange(PlaceId id, std::uint32_t value)
 {
     Chunk& chunk = *_chunks.back();
-    chunk.changes.push_back({static_cast<std::uint32_t>(chunk.messages.size() - 1), id, value});
-    standing(id) = {value, chunk.messages.back().logCode, _lastTime, _present};
+    chunk.changes.push_back({_message, id, value});
+    standing(id) = {value, chunk.messages[_message].logCode, _lastTime, _present};
     ++_present;
 }
 
@@ -525,7 +528,8 @@ void ChangeStore::visit(std::uint64_t from, StoreVisitor& visitor) const
             const auto kind = change.value == nothing ? DisplayChange::Kind::Gone
                               : change.value == group ? DisplayChange::Kind::Empty
                                                       : DisplayChange::Kind::Shown;
-            visitor.changed({chunk->first + i, message.time, message.logCode, change.place, kind,
+            visitor.changed({chunk->first + i, message.time, message.logCode, message.record,
+                             change.place, kind,
                              kind == DisplayChange::Kind::Shown ? chunk->valueAt(change.value)
                                                                 : StoredValue{}});
         }

@@ -37,6 +37,7 @@ struct StoredChange {
     std::uint64_t number; ///< so many changes came before
     Clock::TimePoint time;
     std::uint32_t logCode; ///< effective, of the record that told it; 0 where none did
+    std::uint64_t record;  ///< the store was told of so many messages before its own
     PlaceId place;
     DisplayChange::Kind kind;
     StoredValue value; ///< of what shows
@@ -82,6 +83,7 @@ class ChangeStore : public MessageObserver
                       const PlistDictionary& state) override;
     void channelChanged(Clock::TimePoint time, bool isOpen, std::string_view reason);
 
+    RecordsMode records() const { return _records; }
     bool isEmpty() const { return _chunks.empty(); }
     /// The moments from the first one that can be shown to the present.
     std::uint64_t firstMoment() const;
@@ -133,6 +135,7 @@ class ChangeStore : public MessageObserver
         std::uint32_t logCode;
         std::uint32_t firstChange; // of the chunk's
         std::uint64_t bytesStart;
+        std::uint64_t record; // so many messages came before
         std::uint32_t bytesSize;
     };
     struct Change {
@@ -229,6 +232,8 @@ class ChangeStore : public MessageObserver
 
     std::deque<std::unique_ptr<Chunk>> _chunks;
     std::uint64_t _present = 0;
+    std::uint64_t _messagesTold = 0;
+    std::uint32_t _message = 0; // of the newest chunk's, whose changes are taken
     Clock::TimePoint _lastTime = {};
     std::shared_ptr<PlaceTable> _places = std::make_shared<PlaceTable>();
     std::size_t _generation = 0;

@@ -223,6 +223,7 @@ class EventLog::Follower : public StoreVisitor
     struct Message {
         Clock::TimePoint time;
         std::uint32_t logCode;
+        std::optional<std::uint64_t> record;
         std::uint64_t end; ///< behind its changes
     };
 
@@ -345,7 +346,7 @@ void EventLog::Follower::takeStanding()
     useTechnology(display.technology());
     if (const ModelNodePointer root = display.topLevelNodes())
         takeStanding(*root, "/");
-    _message = Message{display.time(), 0, _next};
+    _message = Message{display.time(), 0, std::nullopt, _next};
     end();
     std::erase_if(_new, [](const Event& event) { return event.kind != EventKind::Technology; });
 }
@@ -363,7 +364,10 @@ void EventLog::Follower::takeStanding(const VentrikModelNode& node, const std::s
 
 void EventLog::Follower::changed(const StoredChange& change)
 {
-    if (!_message || _message->time != change.time || _message->logCode != change.logCode)
+    const bool isOfMessage =
+        _message && (_message->record == change.record ||
+                     (_message->time == change.time && _message->logCode == change.logCode));
+    if (!isOfMessage)
         begin(change);
     _message->end = change.number + 1;
     const Use use = useOf(change.place);
@@ -381,7 +385,7 @@ void EventLog::Follower::begin(const StoredChange& change)
 {
     end();
     addChannelEvents(change.number);
-    _message = Message{change.time, change.logCode, change.number + 1};
+    _message = Message{change.time, change.logCode, change.record, change.number + 1};
     useTechnology(_store.technologyAt(change.number + 1));
 }
 

@@ -240,7 +240,7 @@ void ChangeStore::takeFirst(std::span<const DisplayChange> changes, ByteView mes
 // What the generator before showed stands no more where this one has nothing.
 void ChangeStore::removeWhatIsNotShown(const PlistDictionary& state)
 {
-    std::vector<PlaceId> shown;
+    std::vector<PlaceId> shown; // some of them are new
     for (const DisplayGroup::Entry* entry : _changes->entries())
         shown.push_back(idOf(*entry->place, state));
     std::vector<bool> isShown(_places->size());

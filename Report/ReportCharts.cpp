@@ -154,7 +154,7 @@ std::string ReportCharts::titleOf(const LineGroup& group) const
 
 void ReportCharts::write(HtmlWriter& html) const
 {
-    const auto part = html.inside("section");
+    const auto part = html.inside("section", R"(class="charts")");
     html.element("h2", "Signals over time");
     writeNotes(html);
     std::string section;

@@ -22,8 +22,8 @@ struct LineGroup {
     std::size_t changeCount = 0;
 };
 
-/// Groups of the values that changed: those with units, then those without, each in the order of the
-/// tree. Large ones are parted.
+/// Groups of the values that changed: those with units, then those without, each in the order of
+/// the tree. Large ones are parted.
 std::vector<LineGroup> lineGroups(std::span<const NumberLine> lines, const PlaceTable& places);
 
 /// The numbers that changed as charts over time, with changes of the serving cell as marks. Where

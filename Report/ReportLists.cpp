@@ -55,7 +55,7 @@ std::string namedLevelText(const CellLevels& levels, double value)
 void writeCell(HtmlWriter& html, const SeenCell& cell, const ReportTimes& times)
 {
     const auto row = html.inside("tr");
-    html.element("td", channelText(cell));
+    html.element("td", channelText(cell), R"(class="name")");
     html.element("td", identityText(cell));
     html.element("td", nameOf(cell.kind));
     html.element("td", times.inTable(cell.first), R"(class="time")");
@@ -131,7 +131,8 @@ void writeCells(HtmlWriter& html, const CellHistory& history, const ReportTimes&
         return writeNote(html, "None.");
     std::size_t written = 0;
     {
-        const auto table = html.inside("table");
+        const auto frame = html.inside("div", R"(class="wide")");
+        const auto table = html.inside("table", R"(class="cells")");
         writeHeads(html, heads);
         const auto body = html.inside("tbody");
         for (const std::size_t start = html.size();

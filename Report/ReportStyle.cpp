@@ -19,10 +19,12 @@ h3 { margin: 1.4rem 0 .4rem; }
 .warning { padding: .5rem .8rem; border-radius: .3rem; background: var(--warning); }
 table { border-collapse: collapse; width: 100%; margin: .4rem 0; font-size: .87rem; }
 th, td { padding: .22rem .6rem .22rem 0; text-align: left; vertical-align: top;
-  border-bottom: 1px solid var(--line); overflow-wrap: anywhere; }
+  border-bottom: 1px solid var(--line); overflow-wrap: break-word; }
 thead th { background: var(--head); color: var(--faint); padding-left: .3rem; font-weight: 600; }
 tbody td:first-child { padding-left: .3rem; }
-.number, .time { white-space: nowrap; font-variant-numeric: tabular-nums; }
+.number, .time, .name { white-space: nowrap; font-variant-numeric: tabular-nums; }
+.values td { overflow-wrap: anywhere; }
+.wide { overflow-x: auto; }
 .place { color: var(--faint); }
 .values th { width: 45%; font-weight: normal; color: var(--faint); padding-left: .3rem; }
 .facts th { width: 9rem; }
@@ -46,6 +48,10 @@ footer { margin-top: 2rem; color: var(--faint); font-size: .8rem; }
   * { print-color-adjust: exact; -webkit-print-color-adjust: exact; }
   body { max-width: none; padding: 0; font-size: 10.5pt; }
   h2, h3, figcaption, summary { break-after: avoid; }
+  .charts .note { break-after: avoid; }
+  table { font-size: 8.5pt; }
+  .cells { font-size: 7.5pt; }
+  .columns { columns: 2 14rem; column-gap: 2rem; }
   tr { break-inside: avoid; }
   thead { display: table-header-group; }
 }

@@ -14,8 +14,8 @@ namespace ventrik
 
 /// What a report tells of a capture beside its display.
 struct ReportFacts {
-    std::string capture;
-    std::string technology; ///< for people
+    std::string capture = {};
+    std::string technology = {}; ///< for people
     std::size_t recordCount = 0;
     std::size_t decodedCount = 0;
     std::vector<std::string> notes = {}; ///< what is to be said about the capture, such as damage

@@ -140,6 +140,8 @@ void refuseWrongTogether(const CommandLine& line, const Options& options)
     const bool areRows = decode.format == DecodeFormat::Rows && !isReport;
     if (captures.empty() && (options.captures.lists.empty() || !areRows))
         line.refuse("CAPTURE is required");
+    if (captures.size() > 1 && !isReport && decode.format == DecodeFormat::Html)
+        line.refuse("--format html goes with one capture");
     if (captures.size() > 1 && !isReport && !areRows)
         line.refuse(fmt::format("what is '{}'?", captures[1]));
     if (!isReport && options.report.withBytes)

@@ -244,6 +244,21 @@ TEST_F(ChangeStoreTest, TellsSinceWhenAValueStands)
     EXPECT_EQ(now.valueAt("/b")->changed, start + 1s);
 }
 
+TEST_F(ChangeStoreTest, TakesAFirstDisplayOfManyValues)
+{
+    IdleGenerator asksForNothing;
+    PlistDictionary display;
+    for (int i = 0; i < 5000; ++i)
+        display.set(std::to_string(i), "1");
+    ChangeStore store(RecordsMode::Base);
+    store.useGenerator(&asksForNothing, "ifx");
+    state.set(StateKey::display, display);
+    store.messageTaken(start, {}, state);
+    EXPECT_EQ(store.places().size(), 5001u);
+    EXPECT_EQ(treeOf(*std::make_unique<DisplayMoment>(store.at(store.present()))),
+              treeOf(state.find(StateKey::display)));
+}
+
 TEST_F(ChangeStoreTest, NotesTheChannelsLossAndReturnOnce)
 {
     store.channelChanged(start, true, "");

@@ -1,6 +1,7 @@
 #include "App/VentrikApp.h"
 
 #include "App/OriginScreen.h"
+#include "App/Strip/SignalStrip.h"
 #include "App/Toolkit/PlainText.h"
 #include "Model/ChannelNote.h"
 #include "Model/NodeRows.h"
@@ -189,7 +190,12 @@ void VentrikApp::createTimeLine()
     _viewerWindow->addTimeLine(_timeLineView);
     const auto kept = _platform.preferences.text(preferenceDomain, timeLineKey);
     _viewerWindow->setTimeLineWanted(_options.timeLine && kept != timeLineHidden);
-    _viewerWindow->setWidthCallback([this] { leaveTimeLineScreen(); });
+    _timeLineView->strip().setBands(_options.bands);
+    _viewerWindow->setWidthCallback([this] {
+        leaveTimeLineScreen();
+        if (_navController && _options.timeLineButton)
+            updateStatusForViewController(_navController->topScreen());
+    });
     _viewerWindow->setSpaceCallback([this] {
         if (!_saveViewController)
             togglePause();
@@ -197,6 +203,11 @@ void VentrikApp::createTimeLine()
     auto* key = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_T), _window.get());
     QObject::connect(key, &QShortcut::activated, _window.get(), [this] { toggleTimeLine(); });
     updateTimeLine();
+}
+
+bool VentrikApp::offersTimeLine() const
+{
+    return _options.timeLineButton && _viewerWindow && !_viewerWindow->isWide();
 }
 
 void VentrikApp::toggleTimeLine()
@@ -430,7 +441,7 @@ void VentrikApp::updateViewControllerFromModel()
         return;
     _hasRefreshed = true;
     _tree->takeDisplay(); // which records it in the history, whatever is shown
-    _timeLine.update();
+    _alertTeller.tell(_timeLine.update());
     updateTimeLine();
     if (!showsPast())
         reloadScreens();

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "App/AlertTeller.h"
 #include "App/DateFormatter.h"
 #include "App/TimeLine.h"
 #include "App/TimeLineScreen.h"
@@ -8,9 +9,11 @@
 #include "App/VentrikPaneController.h"
 #include "App/VentrikSaveViewController.h"
 #include "App/ViewerWindow.h"
+#include "Charts/QualityBands.h"
 #include "Model/ChannelPane.h"
 #include "Model/OpenedSource.h"
 #include "Model/ValueSource.h"
+#include "Platform/Notices.h"
 #include "Platform/Platform.h"
 
 #include <QPointer>
@@ -18,9 +21,11 @@
 #include <QSize>
 #include <QWidget>
 
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace ventrik
 {
@@ -38,6 +43,11 @@ struct VentrikAppOptions {
     std::optional<QSize> windowSize;          ///< none: as large as the main screen
     ChangeStore::Limits historyLimits;        ///< of what the time line keeps
     bool timeLine = true; ///< stands beside the panes from the start, unless it was hidden before
+    bool timeLineButton = false; ///< where it does not stand there, a button leads to it
+    QualityBands bands;          ///< by which signals are excellent, good, fair or poor
+    std::vector<ValueAlert> alerts;
+    Notices* notices = nullptr; ///< tells of alerts; none where it is null
+    std::function<void()> ring; ///< the bell, for alerts; may be none
     /// Shown in the place of what a telephony service tells; null as a rule.
     std::shared_ptr<OpenedSource> opened;
 };
@@ -66,7 +76,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     TimeLine& timeLine() { return _timeLine; }
     /// Shows the time line beside the panes or hides it there; in a narrow window opens its screen,
     /// or leaves that.
-    void toggleTimeLine();
+    void toggleTimeLine() override;
+    bool offersTimeLine() const override;
     /// Null before launch and after termination.
     TimeLineView* timeLineView() const { return _timeLineView; }
 
@@ -152,7 +163,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
     ChannelCounts _channelCounts;
     ChangeStore _store;
-    TimeLine _timeLine{_store, _platform.preferences};
+    TimeLine _timeLine{_store, _platform.preferences, _options.alerts};
+    AlertTeller _alertTeller{_platform.clock, _options.notices, _options.ring};
     ValueSources _sources;
     std::unique_ptr<DateFormatter> _pauseFormatter;
     QPointer<TimeLineView> _timeLineView;     // the window's

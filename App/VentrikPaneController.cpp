@@ -32,6 +32,15 @@ std::unique_ptr<QWidget> makeSaveButton(VentrikPaneHost& host)
     return button;
 }
 
+// Its key is that of the whole window.
+std::unique_ptr<QWidget> makeTimeLineButton(VentrikPaneHost& host)
+{
+    auto button = std::make_unique<PushButton>(QStringLiteral("Time Line"));
+    QObject::connect(button.get(), &QPushButton::clicked, button.get(),
+                     [&host] { host.toggleTimeLine(); });
+    return button;
+}
+
 // Where the rows of one node are in another one.
 TableView::RowMapping mappingBetween(const ModelNodePointer& from, const ModelNodePointer& to)
 {
@@ -97,6 +106,8 @@ VentrikPaneController::initWithNode(VentrikPaneHost& host, ModelNodePointer node
 void VentrikPaneController::createToolbarItems()
 {
     std::vector<ToolBarItem> items = statusItems(_status, _isLoading, _host);
+    if (_host.offersTimeLine())
+        items.push_back(ToolBarItem::widget(makeTimeLineButton(_host)));
     if (_host.allowSaveButton())
         items.push_back(ToolBarItem::widget(makeSaveButton(_host)));
     setToolbarItems(std::move(items), true);

@@ -24,6 +24,9 @@ class VentrikPaneHost : public DisplayTree
     /// Whether the panes show a moment of the past. Their places stay then, also where nothing
     /// stood.
     virtual bool showsPast() const { return false; }
+    /// Whether a button leads to the time line, and what it does.
+    virtual bool offersTimeLine() const { return false; }
+    virtual void toggleTimeLine() {}
     /// Back to the present.
     virtual void goLive() {}
     /// Whether the number at a path can be drawn over time, and is.

@@ -219,6 +219,11 @@ class EventLog::Follower : public StoreVisitor
         bool isPresent = false;
         bool isTouched = false;
     };
+    struct Fired {
+        std::size_t alert;
+        std::string text;
+        std::string path;
+    };
     /// What the changes of one message have in common, as far as can be told.
     struct Message {
         Clock::TimePoint time;
@@ -261,8 +266,8 @@ class EventLog::Follower : public StoreVisitor
     std::vector<std::optional<Use>> _uses;
 
     std::optional<Message> _message;
-    std::vector<std::pair<std::string, std::string>> _fired; // text and path
-    std::deque<ChannelEvent> _channelEvents;                 // that are not told yet
+    std::vector<Fired> _fired;
+    std::deque<ChannelEvent> _channelEvents; // that are not told yet
     std::optional<ChannelEvent> _lastChannelEvent;
     std::vector<Event> _new;
 };
@@ -481,11 +486,13 @@ void EventLog::Follower::takeGone(std::string_view path)
 void EventLog::Follower::takeAlerts(const StoredChange& change)
 {
     const PlaceTable& places = _store.places();
-    for (AlertWatch& watch : _alerts)
-        if (watch.take(change.place, places, change.value))
-            _fired.emplace_back(fmt::format("{} is {} ({})", places.nameOf(change.place),
-                                            shortened(change.value.text), watch.alert().condition),
-                                places.pathOf(places[change.place].holder));
+    for (std::size_t i = 0; i < _alerts.size(); ++i)
+        if (_alerts[i].take(change.place, places, change.value))
+            _fired.push_back(
+                {i,
+                 fmt::format("{} is {} ({})", places.nameOf(change.place),
+                             shortened(change.value.text), _alerts[i].alert().condition),
+                 places.pathOf(places[change.place].holder)});
 }
 
 // ---- Events
@@ -498,8 +505,10 @@ void EventLog::Follower::end()
     add(EventKind::Technology, std::exchange(_technologyChange, {}), "/");
     addServing();
     addValues();
-    for (const auto& [text, path] : std::exchange(_fired, {}))
-        add(EventKind::Alert, text, path);
+    for (const Fired& fired : std::exchange(_fired, {})) {
+        add(EventKind::Alert, fired.text, fired.path);
+        _new.back().alert = fired.alert;
+    }
     _isFirstMessage = false;
     _message.reset();
 }

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <deque>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -34,6 +35,7 @@ struct Event {
     std::string text; ///< "PCI 301 → 87, E-ARFCN 1300 → 6300"
     std::string path; ///< of the pane that shows it
     bool isMark;      ///< what happened to the serving cell, the radio's state or the technology
+    std::optional<std::size_t> alert = {}; ///< of an alert, which of those that were given
 };
 
 /// Makes events of what a store takes. What a value says first makes none, but for the technology

@@ -9,6 +9,7 @@
 #include <cstdlib>
 #include <filesystem>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include <fmt/format.h>
@@ -44,6 +45,7 @@ constexpr RotationUnit rotationUnits[] = {{"K", std::uint64_t{1} << 10, 0},
                                           {"d", 0, 86400}};
 constexpr std::uint64_t longestTime = 3'000'000'000; // in seconds; it can be counted in ns
 constexpr std::uint64_t smallestFile = std::uint64_t{64} << 10;
+constexpr std::uint64_t smallestHistory = std::uint64_t{8} << 20;
 
 // "a, b or c"
 std::string alternatives(std::vector<std::string> names)
@@ -92,7 +94,11 @@ std::optional<double> speedValue(const std::string& text)
     return text == "max" ? std::nullopt : std::optional(positiveNumberValue(text));
 }
 
-Rotation rotationValue(const std::string& text)
+namespace
+{
+
+// Of any size; neither for what is none.
+Rotation sizeOrTimeIn(const std::string& text)
 {
     std::uint32_t number = 0; // far enough: 2^32 of the largest units
     const char* end = text.data() + text.size();
@@ -100,12 +106,54 @@ Rotation rotationValue(const std::string& text)
     const auto* unit =
         std::ranges::find(rotationUnits, std::string_view(unitStart, end), &RotationUnit::name);
     if (error != std::errc() || number == 0 || unit == std::end(rotationUnits))
-        throw WrongValue(fmt::format("'{}' is no size such as 100M and no time such as 1h", text));
+        return {};
     if (unit->seconds > 0)
         return {std::nullopt, std::chrono::seconds(std::min(number * unit->seconds, longestTime))};
-    if (number * unit->bytes < smallestFile)
-        throw WrongValue(fmt::format("'{}' is less than 64K", text));
     return {number * unit->bytes, std::nullopt};
+}
+
+} // namespace
+
+Rotation rotationValue(const std::string& text)
+{
+    const Rotation rotation = sizeOrTimeIn(text);
+    if (!rotation.size && !rotation.time)
+        throw WrongValue(fmt::format("'{}' is no size such as 100M and no time such as 1h", text));
+    if (rotation.size && *rotation.size < smallestFile)
+        throw WrongValue(fmt::format("'{}' is less than 64K", text));
+    return rotation;
+}
+
+std::size_t historySizeValue(const std::string& text)
+{
+    const auto size = sizeOrTimeIn(text).size;
+    if (!size)
+        throw WrongValue(fmt::format("'{}' is no size such as 64M", text));
+    if (*size < smallestHistory)
+        throw WrongValue(fmt::format("'{}' is less than 8M", text));
+    return *size;
+}
+
+std::chrono::nanoseconds historyAgeValue(const std::string& text)
+{
+    const auto time = sizeOrTimeIn(text).time;
+    if (!time)
+        throw WrongValue(fmt::format("'{}' is no time such as 24h", text));
+    return *time;
+}
+
+void addAlert(std::vector<ValueAlert>& alerts, const std::string& text)
+{
+    AlertReading reading = parseAlert(text);
+    if (!reading.alert)
+        throw WrongValue(reading.error);
+    alerts.push_back(std::move(*reading.alert));
+}
+
+void changeBands(QualityBands& bands, const std::string& text)
+{
+    if (const auto error = bands.change(text))
+        throw WrongValue(*error);
 }
 
 std::string directoryValue(const std::string& text)

@@ -1,13 +1,17 @@
 #pragma once
 
+#include "Charts/QualityBands.h"
+#include "Model/ValueAlert.h"
 #include "Packets/Layouts.h"
 #include "Platform/Technology.h"
 
 #include <chrono>
+#include <cstddef>
 #include <cstdint>
 #include <optional>
 #include <stdexcept>
 #include <string>
+#include <vector>
 
 namespace ventrik
 {
@@ -32,7 +36,12 @@ std::uint32_t positiveWholeNumberValue(const std::string& text);
 double positiveNumberValue(const std::string& text);
 std::optional<double> speedValue(const std::string& text); ///< a positive number, or none for "max"
 Rotation rotationValue(const std::string& text);           ///< as in "100M" or "1h"
-std::string directoryValue(const std::string& text);       ///< one that is there
+std::size_t historySizeValue(const std::string& text);     ///< at least "8M"
+std::chrono::nanoseconds historyAgeValue(const std::string& text); ///< as in "24h"
+/// Adds one to those that there are.
+void addAlert(std::vector<ValueAlert>& alerts, const std::string& text);
+void changeBands(QualityBands& bands, const std::string& text);
+std::string directoryValue(const std::string& text); ///< one that is there
 Technology technologyValue(const std::string& text);
 RecordsMode recordsValue(const std::string& text);
 int logLevelValue(const std::string& text); ///< see LogPriority

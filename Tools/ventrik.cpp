@@ -94,6 +94,25 @@ void addServiceOptions(CommandLine& line, ViewerOptions& result)
         result.technology, [](const std::string& text) { return technologyValue(text).name; });
 }
 
+void addTimeLineOptions(CommandLine& line, VentrikAppOptions& app)
+{
+    line.addFlag("--timeline",
+                 "in a narrow window a button leads to the time line; Ctrl+T does, too",
+                 app.timeLineButton);
+    line.addOption("--history SIZE", "how much the time line keeps at most (default: 64M)",
+                   app.historyLimits.bytes, historySizeValue);
+    line.addOption("--history-age TIME", "for how long it keeps that (default: 24h)",
+                   app.historyLimits.age, historyAgeValue);
+    line.addOption("--bands LIMITS",
+                   "from where on a signal is excellent, good and fair, as in "
+                   "RSRP=-80,-100,-110; may be given again",
+                   [&app](const std::string& text) { changeBands(app.bands, text); });
+    line.addOption("--alert CONDITION",
+                   "rings and tells the desktop when a value crosses a threshold, as in "
+                   "\"/Serving Cell Measurements/Measured RSRP < -110\"; may be given again",
+                   [&app](const std::string& text) { addAlert(app.alerts, text); });
+}
+
 void addOptions(CommandLine& line, ViewerOptions& result)
 {
     addServiceOptions(line, result);
@@ -112,6 +131,7 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                  "the root ends with a row for the channel: what came, and what did not; F8 shows "
                  "it, too",
                  result.app.channelPane);
+    addTimeLineOptions(line, result.app);
     line.addOption("--records LAYOUTS", recordsNames() + ", or the preference", result.records,
                    recordsValue);
     line.addFlag("--remember-records", "makes that the preference, for later runs",
@@ -255,6 +275,8 @@ int runViewer(const ViewerOptions& options, const std::string& runtimeDirectory)
     appOptions.records = chooseRecords(options, platform);
     if (options.opened && !openCapture(options, platform.platform(), appOptions))
         return EXIT_FAILURE;
+    appOptions.notices = &platform.notices();
+    appOptions.ring = QApplication::beep;
     Recording recording("ventrik", platform.platform(), options.recording);
     if (!recording.isPossible())
         return EXIT_FAILURE;

@@ -3,6 +3,7 @@
 #include "Platform/Linux/LinuxClock.h"
 #include "Platform/Linux/LinuxMainQueue.h"
 #include "Platform/Linux/LinuxMessagePorts.h"
+#include "Platform/Linux/LinuxNotices.h"
 #include "Platform/Linux/LinuxPreferences.h"
 #include "Platform/Linux/LinuxResources.h"
 #include "Platform/Linux/LinuxSystemLog.h"
@@ -38,6 +39,7 @@ class LinuxPlatform
     LinuxMainQueue& mainQueue() { return _mainQueue; }
     LinuxSystemLog& log() { return _log; }
     LinuxPreferences& preferences() { return _preferences; }
+    LinuxNotices& notices() { return _notices; }
 
   private:
     LinuxSystemLog _log;
@@ -47,6 +49,7 @@ class LinuxPlatform
     LinuxResources _resources;
     LinuxPreferences _preferences;
     LinuxClock _clock;
+    LinuxNotices _notices;
 };
 
 } // namespace ventrik

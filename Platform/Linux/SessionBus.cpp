@@ -54,6 +54,21 @@ class BusConnection
             checked(sd_bus_message_append_basic(made, 's', argument.c_str()));
         checked(sd_bus_send(_bus.get(), made, nullptr));
     }
+    void send(const std::string& notice)
+    {
+        constexpr const char* service = "org.freedesktop.Notifications";
+        sd_bus_message* made = nullptr;
+        checked(sd_bus_message_new_method_call(
+            _bus.get(), &made, service, "/org/freedesktop/Notifications", service, "Notify"));
+        const std::unique_ptr<sd_bus_message, MessageReleaser> message(made);
+        checked(sd_bus_message_set_expect_reply(made, 0));
+        constexpr std::uint32_t replacesNone = 0;
+        constexpr std::int32_t usualTime = -1;
+        // As the summary, in which no character is markup; no body, no actions and no hints.
+        checked(sd_bus_message_append(made, "susssasa{sv}i", "Ventrik", replacesNone, "ventrik",
+                                      notice.c_str(), "", 0, 0, usualTime));
+        checked(sd_bus_send(_bus.get(), made, nullptr));
+    }
     /// The answer to a question tells that what came before has been taken.
     void waitUntilTaken()
     {
@@ -82,6 +97,21 @@ class BusConnection
     std::unique_ptr<sd_bus, BusCloser> _bus;
 };
 
+template <typename Sent>
+std::optional<std::string> sendOnBus(const std::string& address, const Sent& sent,
+                                     std::chrono::milliseconds longestWait)
+{
+    const Deadline deadline(longestWait);
+    try {
+        BusConnection bus(address, deadline);
+        bus.send(sent);
+        bus.waitUntilTaken();
+        return std::nullopt;
+    } catch (const std::system_error& error) {
+        return error.code() == std::errc::timed_out ? "it does not answer" : error.code().message();
+    }
+}
+
 } // namespace
 
 std::optional<std::string> sessionBusAddress()
@@ -97,15 +127,13 @@ std::optional<std::string> sessionBusAddress()
 std::optional<std::string> sendBusSignal(const std::string& address, const BusSignal& signal,
                                          std::chrono::milliseconds longestWait)
 {
-    const Deadline deadline(longestWait);
-    try {
-        BusConnection bus(address, deadline);
-        bus.send(signal);
-        bus.waitUntilTaken();
-        return std::nullopt;
-    } catch (const std::system_error& error) {
-        return error.code() == std::errc::timed_out ? "it does not answer" : error.code().message();
-    }
+    return sendOnBus(address, signal, longestWait);
+}
+
+std::optional<std::string> sendBusNotice(const std::string& address, const std::string& text,
+                                         std::chrono::milliseconds longestWait)
+{
+    return sendOnBus(address, text, longestWait);
 }
 
 } // namespace ventrik

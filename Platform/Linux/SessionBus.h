@@ -27,4 +27,8 @@ std::optional<std::string> sessionBusAddress();
 std::optional<std::string> sendBusSignal(const std::string& address, const BusSignal& signal,
                                          std::chrono::milliseconds longestWait);
 
+/// Has the desktop show a notice, in the same manner; nobody waits for its answer.
+std::optional<std::string> sendBusNotice(const std::string& address, const std::string& text,
+                                         std::chrono::milliseconds longestWait);
+
 } // namespace ventrik

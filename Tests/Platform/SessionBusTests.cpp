@@ -1,3 +1,4 @@
+#include "Platform/Linux/LinuxNotices.h"
 #include "Platform/Linux/SessionBus.h"
 #include "Platform/Linux/Socket.h"
 
@@ -95,6 +96,23 @@ TEST(SessionBus, ThatIsNotThereOrOfAnotherKindIsTold)
     EXPECT_EQ(sendBusSignal("unix:path=/nowhere/%62us", someSignal, 1s),
               "No such file or directory");
     EXPECT_TRUE(sendBusSignal("carrier-pigeon:", someSignal, 1s));
+}
+
+TEST(SessionBus, ThatDoesNotAnswerIsNotWaitedForByNotices)
+{
+    const QTemporaryDir directory;
+    const std::string path = directory.filePath("bus").toStdString();
+    const FileDescriptor listener = listenSocket(path);
+    qputenv("DBUS_SESSION_BUS_ADDRESS", QByteArray::fromStdString("unix:path=" + path));
+    const auto start = std::chrono::steady_clock::now();
+    {
+        LinuxNotices notices;
+        notices.post("RSRP is -112 dBm");
+        notices.post("RSRP is -113 dBm");
+        EXPECT_LT(std::chrono::steady_clock::now() - start, LinuxNotices::longestWait / 2);
+    }
+    EXPECT_LT(std::chrono::steady_clock::now() - start, 2 * LinuxNotices::longestWait);
+    qunsetenv("DBUS_SESSION_BUS_ADDRESS");
 }
 
 TEST(SessionBus, IsWhereTheEnvironmentSays)

@@ -89,15 +89,16 @@ class WindowProcess : public ToolUsageFixture
     {
         return readFile(path("home/config/org.ventrik.HomeScreen.conf"));
     }
-    /// A session bus of our own, watched, once it is there; the environment names it from then on.
-    ProgramPointer startBus()
+    /// A session bus of our own, of which an interface is watched, once it is there; the
+    /// environment names it from then on.
+    ProgramPointer startBus(const std::string& interface = "org.ventrik.Preferences")
     {
-        auto bus = std::make_unique<Program>(
-            "/usr/bin/dbus-run-session",
-            Arguments{"--", "/bin/sh", "-c",
-                      "echo \"$DBUS_SESSION_BUS_ADDRESS\"; "
-                      "exec dbus-monitor \"interface='org.ventrik.Preferences'\""},
-            environment);
+        auto bus = std::make_unique<Program>("/usr/bin/dbus-run-session",
+                                             Arguments{"--", "/bin/sh", "-c",
+                                                       "echo \"$DBUS_SESSION_BUS_ADDRESS\"; "
+                                                       "exec dbus-monitor \"interface='$0'\"",
+                                                       interface},
+                                             environment);
         // The monitor is told its own name once it watches.
         EXPECT_TRUE(waitUntil([&] { return bus->prints("NameLost"); })) << bus->errors();
         environment.insert("DBUS_SESSION_BUS_ADDRESS",
@@ -258,6 +259,27 @@ TEST_F(WindowProcess, TellsTheSessionBusThatThePreferenceHasChanged)
                           "   string \"HSShowGSMRSSI\"\n"));
 }
 
+TEST_F(WindowProcess, HasTheDesktopTellOfAnAlert)
+{
+    const auto bus = startBus("org.freedesktop.Notifications");
+    const auto service = startScenario();
+    // One of them is crossed soon.
+    Arguments arguments{"--verbose"};
+    for (int threshold = -120; threshold < -60; ++threshold)
+        arguments.insert(
+            arguments.end(),
+            {"--alert", "/Serving Cell Measurements/Measured RSRP < " + std::to_string(threshold)});
+    const auto window = start("ventrik", arguments);
+    EXPECT_TRUE(waitUntil([&] { return bus->prints("string \"Measured RSRP is "); }))
+        << bus->output() << window->errors();
+    EXPECT_THAT(bus->output(), HasSubstr("path=/org/freedesktop/Notifications; "
+                                         "interface=org.freedesktop.Notifications; "
+                                         "member=Notify\n   string \"Ventrik\"\n   uint32 0\n"
+                                         "   string \"ventrik\"\n   string \"Measured RSRP is -"));
+    window->send(SIGTERM);
+    EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
+}
+
 TEST_F(WindowProcess, ReconnectsAfterTheServiceWasKilled)
 {
     auto service = startScenario();
@@ -321,7 +343,12 @@ TEST_F(WindowProcess, RefusesWhatIsWrong)
                               {"--serial", "/dev/null"},
                               {"--technology", "lte"},
                               {"--speed", "2"},
-                              {"--replay", "x", "--speed", "0"}});
+                              {"--replay", "x", "--speed", "0"},
+                              {"--alert", "RSRP < -110"},
+                              {"--alert", "/Cell/RSRP"},
+                              {"--history", "7M"},
+                              {"--history-age", "24"},
+                              {"--bands", "RSRP=good"}});
 }
 
 TEST_F(WindowProcess, TellsItsUsageAndVersion)

@@ -51,6 +51,43 @@ TEST(OptionValues, TakeASizeOrATimeForARotation)
         EXPECT_THROW(rotationValue(text), WrongValue) << text;
 }
 
+TEST(OptionValues, TakeASizeForAHistory)
+{
+    EXPECT_EQ(historySizeValue("8M"), std::size_t{8} << 20);
+    EXPECT_EQ(historySizeValue("2G"), std::size_t{2} << 30);
+    for (const char* text : {"", "7M", "64", "64h", "-8M"})
+        EXPECT_THROW(historySizeValue(text), WrongValue) << text;
+}
+
+TEST(OptionValues, TakeATimeForAHistory)
+{
+    using namespace std::chrono_literals;
+    EXPECT_EQ(historyAgeValue("24h"), 24h);
+    EXPECT_EQ(historyAgeValue("90s"), 90s);
+    for (const char* text : {"", "24", "24M", "-1h"})
+        EXPECT_THROW(historyAgeValue(text), WrongValue) << text;
+}
+
+TEST(OptionValues, TakeSeveralAlertsAndSayWhatIsWrongWithOne)
+{
+    std::vector<ValueAlert> alerts;
+    addAlert(alerts, "/Cell/RSRP < -110");
+    addAlert(alerts, "/Cell/RSRQ < -15");
+    EXPECT_EQ(alerts.size(), 2U);
+    EXPECT_THROW(addAlert(alerts, "RSRP"), WrongValue);
+    EXPECT_EQ(alerts.size(), 2U);
+}
+
+TEST(OptionValues, TakeBandsAndSayWhatIsWrongWithThem)
+{
+    QualityBands bands;
+    changeBands(bands, "RSRP=-70,-90,-100");
+    const auto limits = bands.find("RSRP", "dBm");
+    ASSERT_TRUE(limits);
+    EXPECT_EQ(limits->from.front(), -70);
+    EXPECT_THROW(changeBands(bands, "RSRP=good"), WrongValue);
+}
+
 TEST(OptionValues, TakeASpeedOrNone)
 {
     EXPECT_EQ(speedValue("2.5"), 2.5);

@@ -102,8 +102,6 @@ class ChangeStore : public MessageObserver
     /// When a record of that code came last.
     std::optional<Clock::TimePoint> lastHeard(std::uint32_t logCode) const;
 
-    /// By which layouts the messages were read.
-    RecordsMode records() const { return _records; }
     const PlaceTable& places() const { return *_places; }
     /// Another number when all places have new numbers, for the store began anew.
     std::size_t generation() const { return _generation; }

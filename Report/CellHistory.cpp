@@ -13,6 +13,9 @@ namespace ventrik
 namespace
 {
 
+// What is told again changes nothing, but its time.
+constexpr std::chrono::seconds longestUnseen{5};
+
 // Beyond so many places looked at, a second passes between looks, then two, and so on.
 constexpr std::size_t mostSpent = 40'000'000;
 
@@ -82,7 +85,7 @@ void CellHistory::update()
 {
     const Clock::TimePoint now = _store.lastTime();
     pass(now);
-    if (_next != _store.present() && isRelevant())
+    if (now - _lastLook >= longestUnseen || (_next != _store.present() && isRelevant()))
         _isOutdated = true;
     _next = _store.present();
     if (_isOutdated && (_step.count() == 0 || now - _lastLook >= _step))
@@ -99,13 +102,14 @@ void CellHistory::pass(Clock::TimePoint now)
         return;
     }
     for (const Present& present : _present) {
+        // Another system may serve by now.
+        if (before - present.told > longestHold)
+            continue;
         SeenCell& cell = _cells[present.cell];
         if (present.isServing) {
             cell.served += now - before;
             cell.last = now;
         }
-        if (before - present.told > longestHold)
-            continue;
         if (present.hasLevel)
             cell.level.stay(now - before);
         if (present.hasQuality)

@@ -36,14 +36,15 @@ struct SeenCell {
     std::string identity = {}; ///< empty where it was not told
     std::string band = {};
     Clock::TimePoint first = {};
-    Clock::TimePoint last = {}; ///< when it was told last
+    Clock::TimePoint last = {}; ///< when it was told, or served, last
     std::chrono::nanoseconds served = {};
     CellLevels level = {};
     CellLevels quality = {};
 };
 
-/// All cells of a display over time, from its first message on. Nothing counts while messages stay
-/// away for longer than a value is held good.
+/// All cells of a display over time, from its first message on. A cell counts for as long as it is
+/// told, and for as long after as a value is held good; nothing counts while messages stay away for
+/// longer than that.
 class CellHistory
 {
   public:

@@ -63,8 +63,9 @@ std::vector<LineGroup> lineGroups(std::span<const NumberLine> lines, const Place
         const PlaceId holder = places[line->place].holder;
         const auto [known, isNew] = last.try_emplace({holder, line->unit}, groups.size());
         if (isNew || !belongTogether(groups[known->second], *line, holder)) {
+            const int part = isNew || line->unit.empty() ? 1 : groups[known->second].part + 1;
             known->second = groups.size();
-            groups.push_back({holder, line->unit, {}});
+            groups.push_back({.holder = holder, .unit = line->unit, .lines = {}, .part = part});
         }
         LineGroup& group = groups[known->second];
         group.lines.push_back(line);
@@ -149,7 +150,8 @@ std::string ReportCharts::titleOf(const LineGroup& group) const
     const std::string what = group.unit.empty()
                                  ? std::string(_store.places().nameOf(group.lines.front()->place))
                                  : group.unit;
-    return title.empty() ? what : title + " · " + what;
+    const std::string part = group.part > 1 ? fmt::format(" ({})", group.part) : "";
+    return (title.empty() ? what : title + " · " + what) + part;
 }
 
 void ReportCharts::write(HtmlWriter& html) const

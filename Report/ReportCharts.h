@@ -20,6 +20,7 @@ struct LineGroup {
     std::string unit;
     std::vector<const NumberLine*> lines;
     std::size_t changeCount = 0;
+    int part = 1; ///< of those with the same holder and unit
 };
 
 /// Groups of the values that changed: those with units, then those without, each in the order of
@@ -31,7 +32,7 @@ std::vector<LineGroup> lineGroups(std::span<const NumberLine> lines, const Place
 class ReportCharts
 {
   public:
-    static constexpr std::size_t mostCharts = 60;
+    static constexpr std::size_t mostCharts = 80;
     static constexpr std::size_t mostBytes = 2'600'000; ///< of all pictures
 
     /// The store and the times outlive it.

@@ -122,7 +122,7 @@ void writeCells(HtmlWriter& html, const CellHistory& history, const ReportTimes&
                 std::size_t mostBytes)
 {
     static constexpr std::array<std::string_view, 10> heads{
-        "Channel", "Cell",       "Role", "First seen",   "Last told",
+        "Channel", "Cell",       "Role", "First seen",   "Last seen",
         "Served",  "Best level", "Mean", "Best quality", "Mean"};
     const auto part = html.inside("section");
     html.element("h2", "Cells");

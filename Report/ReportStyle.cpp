@@ -48,6 +48,7 @@ footer { margin-top: 2rem; color: var(--faint); font-size: .8rem; }
   * { print-color-adjust: exact; -webkit-print-color-adjust: exact; }
   body { max-width: none; padding: 0; font-size: 10.5pt; }
   h2, h3, figcaption, summary { break-after: avoid; }
+  p { break-inside: avoid; }
   .charts .note { break-after: avoid; }
   table { font-size: 8.5pt; }
   .cells { font-size: 7.5pt; }

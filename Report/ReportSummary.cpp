@@ -65,7 +65,10 @@ void writeServingCells(HtmlWriter& html, const CellHistory& history, nanoseconds
     auto cells = history.cells();
     const std::size_t seen = cells.size();
     std::erase_if(cells, [](const SeenCell& cell) { return cell.served.count() == 0; });
-    html.element("p", fmt::format("{} cells were seen; {} of them served.", seen, cells.size()));
+    html.element("p", fmt::format("{} cells were seen; {} of them served. Shares are of the whole "
+                                  "time; cells of two systems may serve at once. Time counts while "
+                                  "a cell is told, and at most 10 s after.",
+                                  seen, cells.size()));
     if (cells.empty())
         return;
     {

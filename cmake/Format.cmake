@@ -3,7 +3,8 @@ find_program(CLANG_FORMAT clang-format)
 find_program(RUN_CLANG_TIDY NAMES run-clang-tidy run-clang-tidy-14)
 file(GLOB_RECURSE VENTRIK_SOURCES RELATIVE ${PROJECT_SOURCE_DIR}
   PropertyList/*.cpp PropertyList/*.h Packets/*.cpp Packets/*.h Files/*.cpp Files/*.h Platform/*.cpp Platform/*.h
-  LogGenerator/*.cpp LogGenerator/*.h Model/*.cpp Model/*.h Charts/*.cpp Charts/*.h Capture/*.cpp Capture/*.h App/*.cpp App/*.h
+  LogGenerator/*.cpp LogGenerator/*.h Model/*.cpp Model/*.h Charts/*.cpp Charts/*.h
+  Report/*.cpp Report/*.h Capture/*.cpp Capture/*.h App/*.cpp App/*.h
   TelephonyService/*.cpp TelephonyService/*.h Tools/*.cpp Tools/*.h Tests/*.cpp Tests/*.h
   Benchmarks/*.cpp Fuzz/*.cpp)
 if(CLANG_FORMAT)
@@ -17,6 +18,6 @@ endif()
 if(RUN_CLANG_TIDY)
   add_custom_target(tidy
     COMMAND ${RUN_CLANG_TIDY} -quiet -p ${CMAKE_BINARY_DIR}
-      "^${PROJECT_SOURCE_DIR}/(PropertyList|Packets|Files|Platform|LogGenerator|Model|Charts|Capture|App|TelephonyService|Tools)/"
+      "^${PROJECT_SOURCE_DIR}/(PropertyList|Packets|Files|Platform|LogGenerator|Model|Charts|Report|Capture|App|TelephonyService|Tools)/"
     WORKING_DIRECTORY ${PROJECT_SOURCE_DIR} VERBATIM)
 endif()

@@ -250,13 +250,13 @@ TEST_F(ChangeStoreTest, TakesAFirstDisplayOfManyValues)
     PlistDictionary display;
     for (int i = 0; i < 5000; ++i)
         display.set(std::to_string(i), "1");
-    ChangeStore store(RecordsMode::Base);
-    store.useGenerator(&asksForNothing, "ifx");
+    ChangeStore many(RecordsMode::Base);
+    many.useGenerator(&asksForNothing, "ifx");
     state.set(StateKey::display, display);
-    store.messageTaken(start, {}, state);
-    EXPECT_EQ(store.places().size(), 5001u);
-    EXPECT_EQ(treeOf(*std::make_unique<DisplayMoment>(store.at(store.present()))),
-              treeOf(state.find(StateKey::display)));
+    many.messageTaken(start, {}, state);
+    EXPECT_EQ(many.places().size(), 5001u);
+    DisplayMoment now = many.at(many.present());
+    EXPECT_EQ(treeOf(now), treeOf(state.find(StateKey::display)));
 }
 
 TEST_F(ChangeStoreTest, NotesTheChannelsLossAndReturnOnce)

@@ -80,6 +80,19 @@ TEST_F(CellHistoryTest, CountsNoTimeWithoutMessages)
     EXPECT_EQ(history.silence(), 60s);
 }
 
+TEST_F(CellHistoryTest, CountsACellNoMoreThatIsNotTold)
+{
+    show(serving("301", "-90 dBm"));
+    generator.read.logCode = 2; // only what another record tells comes from now on
+    PlistDictionary display = serving("301", "-90 dBm");
+    for (int i = 0; i < 30; ++i) {
+        display.set("Note", fmt::format("{}", i));
+        show(display);
+    }
+    EXPECT_THAT(lines(),
+                ElementsAre("LTE 1300 (B3) PCI 301 Serving 0-11 served 11.0 s RSRP -90 -90"));
+}
+
 TEST_F(CellHistoryTest, SeesCellsThatNeverServe)
 {
     show(withNeighbor("118", "-100 dBm"));

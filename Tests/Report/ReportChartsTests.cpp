@@ -67,6 +67,8 @@ TEST_F(ReportChartsTest, PartsLargeGroups)
         show(PlistDictionary{{"Cell", cell}});
     }
     EXPECT_THAT(groups(), ElementsAre("Cell dB: a b c d e f", "Cell dB: g"));
+    EXPECT_THAT(page(), HasSubstr("<figcaption>Cell · dB</figcaption>"));
+    EXPECT_THAT(page(), HasSubstr("<figcaption>Cell · dB (2)</figcaption>"));
 }
 
 TEST_F(ReportChartsTest, DrawsWhatChangedAndCountsTheRest)
@@ -92,10 +94,12 @@ TEST_F(ReportChartsTest, LeavesOutWhatChangedLeastAndSaysHowMuch)
     showAll(0, 0);
     showAll(1, 0);
     showAll(2, 2); // the first two stay
-    EXPECT_THAT(page(), HasSubstr("62 of 62 numbers changed. 2 of them, in 2 charts, are left out: "
-                                  "those that changed least."));
-    EXPECT_THAT(page(), Not(HasSubstr("Number 01")));
-    EXPECT_THAT(page(), HasSubstr("Number 02"));
+    const std::string text = page();
+    EXPECT_THAT(text.substr(0, 200),
+                HasSubstr("82 of 82 numbers changed. 2 of them, in 2 charts, are left out: those "
+                          "that changed least."));
+    EXPECT_EQ(text.find("Number 01"), text.npos);
+    EXPECT_NE(text.find("Number 02"), text.npos);
 }
 
 TEST_F(ReportChartsTest, MarksChangesOfTheServingCell)

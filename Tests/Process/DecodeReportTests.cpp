@@ -82,7 +82,7 @@ TEST_P(DecodeReportOf, IsOneWellFormedPageThatLoadsNothing)
 
 INSTANTIATE_TEST_SUITE_P(Technologies, DecodeReportOf,
                          testing::Values("lte", "gsm", "utran", "c2k", "ifx"),
-                         [](const auto& info) { return std::string(info.param); });
+                         [](const auto& tested) { return std::string(tested.param); });
 
 TEST_F(DecodeReport, TellsTimesInTheLocalZoneAndNamesIt)
 {

@@ -1,7 +1,9 @@
 #include "App/Strip/SignalStrip.h"
 #include "App/TimeLineMenu.h"
+#include "LogGenerator/Core/StateKeys.h"
 #include "Packets/PacketBuilder.h"
 #include "Tests/App/AppFixture.h"
+#include "Tests/Support/IdleGenerator.h"
 
 #include <QApplication>
 #include <QFileDialog>
@@ -158,6 +160,47 @@ TEST_F(TimeLineMenuTest, SavesTheValuesOfTheShownRangeAsRows)
     const std::string text = textOf(pathOf("values.csv"));
     EXPECT_THAT(text, StartsWith("capture,record,time,"));
     EXPECT_THAT(text, HasSubstr("\nlive,0,2026-11-16T"));
+}
+
+namespace
+{
+
+/// A capture of one value.
+class OneValue : public OpenedSource
+{
+  public:
+    void setObserver(MessageObserver& observer) override
+    {
+        observer.useGenerator(&_generator, "lte");
+        _state.set(StateKey::display, PlistDictionary{{"PCI", "301"}});
+        observer.messageTaken(Clock::TimePoint(60s), {}, _state);
+    }
+    std::string name() const override { return "drive.pcap"; }
+    bool readOn() override { return false; }
+    std::string progress() const override { return {}; }
+    std::string fault() const override { return {}; }
+
+  private:
+    IdleGenerator _generator;
+    PlistDictionary _state;
+};
+
+} // namespace
+
+TEST_F(TimeLineMenuTest, NamesTheOpenedCaptureInItsRows)
+{
+    window.applicationWillTerminate();
+    VentrikAppOptions options = wide();
+    options.opened = std::make_shared<OneValue>();
+    VentrikApp opened(fake.platform(), options);
+    opened.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    opened.timeLineView()->menu().actions()[2]->trigger();
+    auto* dialog = opened.window()->findChild<QFileDialog*>();
+    ASSERT_NE(dialog, nullptr);
+    dialog->selectFile(QString::fromStdString(pathOf("values.csv")));
+    QMetaObject::invokeMethod(dialog, "accept");
+    EXPECT_THAT(textOf(pathOf("values.csv")), HasSubstr("\ndrive.pcap,0,1970-01-01T00:01:00."));
 }
 
 TEST_F(TimeLineMenuTest, TellsOfAFileThatWasWrittenInTheStatusLine)

@@ -55,8 +55,8 @@ class Numbers : public LogGenerator
     PlistDictionary state;
 };
 
-/// What ten seconds of so many changes a second takes, ten a message of 100 bytes, and how far back a
-/// store of the usual size then reaches.
+/// What ten seconds of so many changes a second takes, ten a message of 100 bytes, and how far back
+/// a store of the usual size then reaches.
 void keepChanges(benchmark::State& benchmarkState)
 {
     const auto changesOfSecond = static_cast<std::size_t>(benchmarkState.range(0));

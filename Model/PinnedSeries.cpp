@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <utility>
 
 namespace ventrik
@@ -16,6 +17,7 @@ struct DefaultPin {
     std::string_view technology;
     std::string_view path;
     std::string_view name;
+    bool leavesOutSign = false;
 };
 
 constexpr std::array defaults = {
@@ -23,8 +25,8 @@ constexpr std::array defaults = {
     DefaultPin{"lte", "/Neighbors/Neighbor Cells List/*/Measured RSRP", "Best neighbor RSRP"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRQ", "RSRQ"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSSI", "RSSI"},
-    DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI"},
-    DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor RSSI"},
+    DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI", true},
+    DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor GSM RSSI", true},
     DefaultPin{"gsm", "/Neighbors/UMTS Set/*/RSCP", "Best RSCP"},
     DefaultPin{"gsm", "/Neighbors/UMTS Set/*/Energy Per Chip", "Best Ec/Io"},
     DefaultPin{"utran", "/Neighbor Cell List/*/Filter RSCP", "Best RSCP"},
@@ -44,7 +46,7 @@ Pin Pin::of(std::string path)
 {
     const std::string last = path.substr(path.rfind('/') + 1);
     const bool isOfList = path.find(anyElement) != path.npos;
-    return {std::move(path), isOfList ? "Best " + last : last};
+    return {std::move(path), isOfList ? "Best " + last : last, false};
 }
 
 bool Pin::matches(std::string_view valuePath) const
@@ -67,7 +69,7 @@ std::vector<Pin> defaultPins(std::string_view technology)
     std::vector<Pin> pins;
     for (const DefaultPin& pin : defaults)
         if (pin.technology == technology)
-            pins.push_back({std::string(pin.path), std::string(pin.name)});
+            pins.push_back({std::string(pin.path), std::string(pin.name), pin.leavesOutSign});
     return pins;
 }
 
@@ -138,8 +140,8 @@ void PinnedSeries::take(std::size_t pin, const StoredChange& change)
 {
     Follower& follower = _followers[pin];
     Series& series = _series[pin];
-    if (change.value.number)
-        follower.numbers[change.place] = *change.value.number;
+    if (const auto number = change.value.number)
+        follower.numbers[change.place] = series.pin.leavesOutSign ? -std::abs(*number) : *number;
     else
         follower.numbers.erase(change.place);
     follower.logCode = change.logCode;

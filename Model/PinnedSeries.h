@@ -19,6 +19,8 @@ namespace ventrik
 struct Pin {
     std::string path;
     std::string name; ///< in the chart
+    /// A level in dBm that some records tell without its sign: it is drawn below 0.
+    bool leavesOutSign = false;
 
     /// With the name that the path has: that of the value; for a list's, "Best" before it.
     static Pin of(std::string path);

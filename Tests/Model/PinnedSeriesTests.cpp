@@ -147,6 +147,14 @@ TEST_F(PinnedSeriesTest, LeavesOutPinsBeyondItsLimit)
     EXPECT_EQ(series.series().size(), PinnedSeries::mostPins);
 }
 
+TEST_F(PinnedSeriesTest, DrawsALevelThatLeavesOutItsSignBelowZero)
+{
+    series.setPins({{"/Cells/*/Level", "Best", true}});
+    show(PlistDictionary{{"Cells", PlistArray{level("90 dBm"), level("-80 dBm")}}});
+    show(PlistDictionary{{"Cells", PlistArray{level("75 dBm"), level("-80 dBm")}}});
+    EXPECT_THAT(points(), ElementsAre("0-0: -80", "1-1: -75"));
+}
+
 TEST(PinTest, MatchesElementsOfItsListOnly)
 {
     const Pin pin = Pin::of("/Cells/*/Level");

@@ -172,8 +172,14 @@ void TimeLineView::update()
 void TimeLineView::updateStrip()
 {
     StripData shown;
+    // The series go on while nothing of this is seen.
+    std::vector<std::vector<SeriesPoint>> points;
     for (const PinnedSeries::Series& series : _timeLine.series().series())
-        shown.lines.push_back({series.pin.name, series.unit, series.points});
+        points.push_back(series.points);
+    for (std::size_t i = 0; i < points.size(); ++i) {
+        const PinnedSeries::Series& series = _timeLine.series().series()[i];
+        shown.lines.push_back({series.pin.name, series.unit, points[i]});
+    }
     for (const Event& event : _timeLine.events().events())
         if (event.isMark)
             shown.marks.push_back({event.time, event.text});
@@ -183,6 +189,7 @@ void TimeLineView::updateStrip()
     shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();
     _strip->setSecondsFromUtc(_clock.timeZone(shown.last).secondsFromUtc);
     _strip->setData(std::move(shown));
+    _points = std::move(points);
     _strip->setCursor(_timeLine.pausedAt());
 }
 

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <string>
+#include <vector>
 
 class QLabel;
 class QPushButton;
@@ -65,6 +66,7 @@ class TimeLineView : public QWidget
     QLabel* _status;
     QPushButton* _pause;
     QPushButton* _menuButton;
+    std::vector<std::vector<SeriesPoint>> _points; // that the strip shows
     SignalStrip* _strip;
     TimeLineMenu* _menu;
     CellsView* _cells;

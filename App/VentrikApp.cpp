@@ -78,7 +78,11 @@ void VentrikApp::applicationDidFinishLaunching()
     createDateFormatter();
     createNavigationStack();
     showWindow();
-    _noteTimer = _platform.mainQueue.repeatEvery(noteInterval, [this] { updateTopNotes(); });
+    _noteTimer = _platform.mainQueue.repeatEvery(noteInterval, [this] {
+        updateTopNotes();
+        if (!showsPast())
+            updateTimeLine(); // ages and times go on while nothing comes
+    });
     _channelTimer =
         _platform.mainQueue.repeatEvery(channelInterval, [this] { updateChannelPane(); });
     if (_options.channelPane) {

@@ -549,6 +549,18 @@ TEST_F(TimeLineWindowTest, AClickOnACellLeavesTheTimeLinesScreen)
     EXPECT_FALSE(showsTimeLine());
 }
 
+TEST_F(TimeLineWindowTest, CellsGrowOldWhileNothingComes)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(1280);
+    const CellsModel& cells = window->timeLineView()->cells().model();
+    ASSERT_EQ(cells.rowCount(), 1);
+    const auto before = cells.cell(0).age;
+    fake.clock.advance(14s);
+    fake.mainQueue.advance(1s);
+    EXPECT_EQ(cells.cell(0).age, before + 14s);
+}
+
 TEST_F(TimeLineWindowTest, AClickOnAnEventGoesToItsMoment)
 {
     fake.resources.add("/res/LTE.plist", cellTemplate);

@@ -182,7 +182,7 @@ void TimeLineView::updateStrip()
     }
     for (const Event& event : _timeLine.events().events())
         if (event.isMark)
-            shown.marks.push_back({event.time, event.text});
+            shown.marks.push_back({event.time, event.text, event.kind == EventKind::RRC});
     // Where nothing comes the present goes on.
     shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()
                                       : std::max(_timeLine.store().lastTime(), _clock.now());

@@ -99,6 +99,8 @@ void SignalChart::drawReadings(Canvas& canvas, const ChartLane& lane, const Tag&
         readings.push_back({{}, shortNumber(*value), strokeOf(lane, member).color});
         canvas.fillRect({x - 2.5, wanted.back() - 2.5, 5, 5}, color);
     }
+    if (x >= lane.area.right() - 1) // the current values stand beside it already
+        return;
     const auto places = spreadLabels(wanted, size + 4, lane.area.y + 1, lane.area.bottom() - 1);
     for (std::size_t reading = 0; reading < places.size(); ++reading) {
         if (!places[reading])

@@ -20,6 +20,7 @@ struct ChartLine {
 struct ChartMark {
     Clock::TimePoint time;
     std::string text;
+    bool isMinor = false; ///< the first to give way where there are many
 };
 
 /// For how long a value is held good that has not been told again.

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cstddef>
-#include <limits>
 #include <numeric>
 
 namespace ventrik
@@ -60,15 +59,20 @@ std::vector<std::optional<double>> spreadLabels(std::span<const double> wanted, 
 
 std::vector<std::optional<int>> labelRows(std::span<const LabelExtent> labels, int rows)
 {
-    std::vector<double> ends(static_cast<std::size_t>(std::max(0, rows)),
-                             -std::numeric_limits<double>::infinity());
+    std::vector<std::vector<LabelExtent>> taken(static_cast<std::size_t>(std::max(0, rows)));
     std::vector<std::optional<int>> found;
     for (const LabelExtent& label : labels) {
-        const auto row = std::ranges::find_if(ends, [&](double end) { return end <= label.from; });
-        found.push_back(row == ends.end() ? std::nullopt
-                                          : std::optional(static_cast<int>(row - ends.begin())));
-        if (row != ends.end())
-            *row = label.to;
+        const auto row = std::ranges::find_if(taken, [&](const auto& others) {
+            return std::ranges::none_of(others, [&](const LabelExtent& other) {
+                return other.from < label.to && label.from < other.to;
+            });
+        });
+        if (row == taken.end()) {
+            found.emplace_back();
+            continue;
+        }
+        row->push_back(label);
+        found.emplace_back(static_cast<int>(row - taken.begin()));
     }
     return found;
 }

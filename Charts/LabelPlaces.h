@@ -18,8 +18,8 @@ struct LabelExtent {
     double to;
 };
 
-/// The row of each label, in the order in which they come: the first of so many rows in which it
-/// does not overlap a former one. None for a label that has no room.
+/// The row of each label, those that come first having the choice: the first of so many rows in
+/// which it overlaps no former one. None for a label that has no room.
 std::vector<std::optional<int>> labelRows(std::span<const LabelExtent> labels, int rows);
 
 } // namespace ventrik

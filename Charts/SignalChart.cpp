@@ -48,7 +48,8 @@ void SignalChart::layOut(const TextMeasure& measure)
 {
     const double size = _looks.textSize;
     const bool isHigh = _height >= 260;
-    _markRows = marksShown().empty() ? 0 : isHigh ? 2 : 1;
+    takeMarks();
+    _markRows = _marks.empty() ? 0 : isHigh ? 2 : 1;
     const double top = size * 0.6 + _markRows * (size + 3);
     const double bottom = rowHeight() + (_height >= 120 ? rowHeight() : 0) + 2;
     _plot = {0, top, _width, std::max(1.0, _height - top - bottom)};
@@ -91,16 +92,6 @@ double SignalChart::labelWidth(const TextMeasure& measure) const
 bool SignalChart::isShown(Clock::TimePoint time) const
 {
     return time >= _content.first && time <= _content.last;
-}
-
-// In the order of their times.
-std::vector<ChartMark> SignalChart::marksShown() const
-{
-    std::vector<ChartMark> marks;
-    std::ranges::copy_if(_content.marks, std::back_inserter(marks),
-                         [this](const ChartMark& mark) { return isShown(mark.time); });
-    std::ranges::stable_sort(marks, {}, &ChartMark::time);
-    return marks;
 }
 
 bool SignalChart::hasBands() const
@@ -306,43 +297,6 @@ void SignalChart::drawTimeAxis(Canvas& canvas) const
         if (hasRoom && !isUnderTag(x - half, x + half, canvas))
             canvas.text({x, bottom + size + 3}, tick.text, faint(Anchor::Middle));
     }
-}
-
-void SignalChart::drawMarks(Canvas& canvas) const
-{
-    const auto marks = marksShown();
-    double column = -1;
-    for (const ChartMark& mark : marks) {
-        const double x = std::floor(_times.x(mark.time)) + 0.5;
-        if (x == column)
-            continue;
-        column = x;
-        canvas.line({x, _plot.y - 3}, {x, _lanes.back().area.bottom()},
-                    {_looks.palette.mark, 1, Dash::Dashed});
-    }
-    drawMarkLabels(canvas, marks);
-}
-
-void SignalChart::drawMarkLabels(Canvas& canvas, const std::vector<ChartMark>& marks) const
-{
-    constexpr std::size_t mostLabels = 1000; // more never have room side by side
-    const double size = _looks.textSize - 1;
-    const double widest = std::min(220.0, _plot.width * 0.6);
-    std::vector<std::string> texts;
-    std::vector<LabelExtent> extents;
-    for (const ChartMark& mark : std::span(marks).first(std::min(marks.size(), mostLabels))) {
-        texts.push_back(elided(mark.text, widest, size, false, canvas));
-        const double width = canvas.textWidth(texts.back(), size);
-        const double start = std::clamp(_times.x(mark.time) - width / 2, _plot.x,
-                                        std::max(_plot.x, _width - width - 4));
-        extents.push_back({start, start + width + size});
-    }
-    const auto rows = labelRows(extents, _markRows);
-    TextStyle style{.color = _looks.palette.text, .size = size};
-    for (std::size_t label = 0; label < rows.size(); ++label)
-        if (rows[label])
-            canvas.text({extents[label].from, _plot.y - 5 - *rows[label] * (size + 3)},
-                        texts[label], style);
 }
 
 void SignalChart::drawLegend(Canvas& canvas) const

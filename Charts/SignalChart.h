@@ -49,7 +49,6 @@ class SignalChart
     double leftWidth(const TextMeasure& measure) const;
     double labelWidth(const TextMeasure& measure) const;
     bool isShown(Clock::TimePoint time) const;
-    std::vector<ChartMark> marksShown() const;
     bool hasBands() const;
     double rowHeight() const { return _looks.textSize + 5; }
     TextStyle faint(Anchor anchor) const;
@@ -67,8 +66,11 @@ class SignalChart
     std::string currentText(std::size_t line) const;
     std::vector<TimeTick> timeTicksFor(const TextMeasure& measure) const;
     void drawTimeAxis(Canvas& canvas) const;
+    void takeMarks();
+    std::vector<double> columnsOf(bool areMinor) const;
     void drawMarks(Canvas& canvas) const;
-    void drawMarkLabels(Canvas& canvas, const std::vector<ChartMark>& marks) const;
+    void drawMarks(Canvas& canvas, bool areMinor) const;
+    void drawMarkLabels(Canvas& canvas) const;
     void drawLegend(Canvas& canvas) const;
     void drawNote(Canvas& canvas, Point place, double width) const;
     /// A cursor in view, with its time in a tag on the axis.
@@ -107,6 +109,7 @@ class SignalChart
     std::size_t _lanesLeftOut = 0;
     Rect _plot;
     TimeScale _times;
+    std::vector<const ChartMark*> _marks; ///< in view; those of more weight first
     int _markRows = 0;
 };
 

@@ -49,4 +49,10 @@ TEST(LabelPlacesTest, MarksThatWouldOverlapGoToTheNextRow)
                 ElementsAre(std::nullopt, std::nullopt, std::nullopt, std::nullopt));
 }
 
+TEST(LabelPlacesTest, MarksThatComeFirstHaveTheChoice)
+{
+    const std::vector<LabelExtent> labels{{50, 80}, {10, 40}, {35, 55}, {0, 10}};
+    EXPECT_THAT(labelRows(labels, 1), ElementsAre(0, 0, std::nullopt, 0));
+}
+
 } // namespace ventrik

@@ -64,6 +64,16 @@ class SignalChartTest : public testing::Test
         });
     }
 
+    // How far down the line goes there; 0 without one.
+    static double depthAt(const RecordingCanvas& canvas, double x)
+    {
+        double depth = 0;
+        for (const auto& line : canvas.lines)
+            if (std::abs(line.first.x - x) < 1 && std::abs(line.second.x - x) < 1)
+                depth = std::max(depth, line.second.y - line.first.y);
+        return depth;
+    }
+
     std::deque<std::vector<SeriesPoint>> kept;
     std::vector<ChartLine> lines;
     std::vector<ChartMark> marks;
@@ -246,6 +256,52 @@ TEST_F(SignalChartTest, MarksStayWhereTheirLabelsHaveNoRoom)
         EXPECT_GE(uprightsAt(canvas, chart(600, 300).times().x(mark.time)), 1);
 }
 
+TEST_F(SignalChartTest, AMarkGoesAcrossTheLanes)
+{
+    addConstant("RSRP", "dBm", -90);
+    addConstant("RSRQ", "dB", -9);
+    marks = {{at(51), "301 → 302"}};
+    const SignalChart shown = chart();
+    EXPECT_NEAR(depthAt(drawn(), shown.times().x(at(51))), shown.plot().height + 3, 0.01);
+}
+
+TEST_F(SignalChartTest, MarksThatWouldHideTheLinesAreTicks)
+{
+    addConstant("RSRP", "dBm", -90);
+    for (int mark = 0; mark < 60; ++mark)
+        marks.push_back({at(mark + 0.3), "mark"});
+    const auto canvas = drawn();
+    for (int mark = 0; mark < 60; ++mark)
+        EXPECT_EQ(depthAt(canvas, chart().times().x(at(mark + 0.3))), 7);
+}
+
+TEST_F(SignalChartTest, ManyMinorMarksLeaveTheOthersTheirLinesAndLabels)
+{
+    addConstant("RSRP", "dBm", -90);
+    for (int mark = 0; mark < 60; ++mark)
+        marks.push_back({at(mark + 0.3), "minor " + std::to_string(mark), true});
+    marks.push_back({at(30.6), "301 → 302"});
+    const auto canvas = drawn();
+    const SignalChart shown = chart();
+    EXPECT_EQ(depthAt(canvas, shown.times().x(at(29.3))), 7);
+    EXPECT_NEAR(depthAt(canvas, shown.times().x(at(30.6))), shown.plot().height + 3, 0.01);
+    EXPECT_TRUE(canvas.has("301 → 302"));
+    EXPECT_TRUE(canvas.has("minor 0"));
+}
+
+TEST_F(SignalChartTest, OfVeryManyMarksSomeAreLabelledEverywhere)
+{
+    addConstant("RSRP", "dBm", -90);
+    for (int mark = 0; mark < 5000; ++mark)
+        marks.push_back({at(mark * 0.02), "mark"});
+    const auto canvas = drawn();
+    const SignalChart shown = chart();
+    const double right = shown.plot().x + shown.plot().width * 0.9;
+    EXPECT_TRUE(std::ranges::any_of(canvas.texts, [&](const DrawnText& text) {
+        return text.text == "mark" && text.place.x > right;
+    }));
+}
+
 TEST_F(SignalChartTest, MarksOutsideAreNotDrawn)
 {
     addConstant("RSRP", "dBm", -90);
@@ -268,6 +324,15 @@ TEST_F(SignalChartTest, ACursorHasItsTimeAndTheValues)
                     testing::Field(&DrawnText::text, "-90"),
                     testing::Field(&DrawnText::place,
                                    testing::Field(&Point::x, testing::DoubleNear(x + 9, 0.01))))));
+}
+
+TEST_F(SignalChartTest, ACursorAtTheEndLeavesItsValuesToThoseBesideIt)
+{
+    addConstant("RSRP", "dBm", -63.75);
+    cursor = at(100);
+    const auto canvas = drawn();
+    EXPECT_TRUE(canvas.has("10:01:40.0"));
+    EXPECT_EQ(std::ranges::count(canvas.texts, "-63.75", &DrawnText::text), 1);
 }
 
 TEST_F(SignalChartTest, OfTwoCursorsEachHasItsValuesOnItsOuterSide)

@@ -10,8 +10,6 @@ namespace ventrik
 namespace
 {
 
-constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
-
 std::string pinsKey(const std::string& technology)
 {
     return "Pins." + technology;

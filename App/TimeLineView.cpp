@@ -94,8 +94,8 @@ QWidget* TimeLineView::makeLists()
     column->addWidget(_tabs);
     auto* row = new QHBoxLayout;
     row->setSpacing(1);
-    row->addWidget(_cells, 3);
-    row->addWidget(_events, 2);
+    row->addWidget(_cells, 2);
+    row->addWidget(_events, 1);
     column->addLayout(row, 1);
     layOutLists();
     return lists;

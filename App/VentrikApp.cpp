@@ -30,7 +30,6 @@ constexpr auto savedMessageTime = 8s;
 constexpr auto staleAge = 10s;
 constexpr auto readingInterval = 500ms;
 
-constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
 constexpr std::string_view timeLineKey = "TimeLine";
 constexpr std::string_view timeLineShown = "shown";
 constexpr std::string_view timeLineHidden = "hidden";
@@ -320,11 +319,18 @@ void VentrikApp::updateTimeLine()
 {
     if (!_timeLineView || _timeLineView->isHidden())
         return;
-    const std::optional<Clock::TimePoint> at = _timeLine.pausedAt();
-    _timeLineView->setStatus(
-        at ? QString::fromStdString(_pauseFormatter->stringFromDate(*at)) : QStringLiteral("Live"),
-        at.has_value(), _options.opened ? QStringLiteral("End") : QStringLiteral("Live"));
+    _timeLineView->setStatus(QString::fromStdString(timeLineStatus()), showsPast(),
+                             _options.opened ? QStringLiteral("End") : QStringLiteral("Live"));
     _timeLineView->update();
+}
+
+std::string VentrikApp::timeLineStatus() const
+{
+    if (const auto at = _timeLine.pausedAt())
+        return _pauseFormatter->stringFromDate(*at);
+    if (_options.opened)
+        return openedStatus();
+    return _model && _model->isConnected() ? "Live" : connectingStatus;
 }
 
 // Not before the launch has returned; by then the application may have ended again.
@@ -478,6 +484,7 @@ void VentrikApp::channelChanged()
         updateStatusForViewController(_navController->topScreen());
     else
         updateTopNotes();
+    updateTimeLine();
     updateWindowTitle();
 }
 

@@ -148,6 +148,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void openPane(const std::string& path);
     void togglePause();
     std::string pausedStatus() const;
+    std::string timeLineStatus() const;
     void readOnLater();
     void readOn();
     void openSource();

@@ -7,6 +7,9 @@
 namespace ventrik
 {
 
+/// Where our own preferences are.
+inline constexpr std::string_view preferenceDomain = "org.ventrik.Ventrik";
+
 /// Preferences of our own domain and of another application's, and the notice that they have
 /// changed.
 class Preferences

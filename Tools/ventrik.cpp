@@ -231,21 +231,20 @@ void undoSettingAtExit()
 // What the user has said now or, once, for later runs.
 RecordsMode chooseRecords(const ViewerOptions& options, LinuxPlatform& platform)
 {
-    constexpr std::string_view domain = "org.ventrik.Ventrik";
     constexpr std::string_view key = "Records";
     LinuxPreferences& preferences = platform.preferences();
     if (options.records) {
         if (options.remembersRecords) {
-            preferences.setText(domain, key, nameOf(*options.records));
-            preferences.synchronize(domain);
+            preferences.setText(preferenceDomain, key, nameOf(*options.records));
+            preferences.synchronize(preferenceDomain);
         }
         return *options.records;
     }
-    const auto preference = preferences.text(domain, key);
+    const auto preference = preferences.text(preferenceDomain, key);
     const auto records = preference ? recordsModeNamed(*preference) : std::nullopt;
     if (preference && !records)
         platform.log().error("The preference {} of {} is none of base, newer and extended: {}", key,
-                             domain, *preference);
+                             preferenceDomain, *preference);
     return records.value_or(RecordsMode::Newer);
 }
 

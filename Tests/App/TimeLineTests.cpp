@@ -8,6 +8,7 @@
 #include "Tests/Support/IdleGenerator.h"
 
 #include <QApplication>
+#include <QLabel>
 #include <QListView>
 #include <QMenu>
 #include <QPushButton>
@@ -524,6 +525,16 @@ TEST_F(TimeLineWindowTest, ThePauseButtonFreezesAndLeadsBack)
     button.click();
     EXPECT_FALSE(window->timeLine().isPaused());
     EXPECT_EQ(window->timeLineView()->strip().cursor(), std::nullopt);
+}
+
+TEST_F(TimeLineWindowTest, TheBarIsNotLiveWhileTheChannelIsLost)
+{
+    launch(900);
+    const QLabel& bar = *window->timeLineView()->findChild<QLabel*>();
+    EXPECT_EQ(bar.text(), "Live");
+    loseService();
+    fake.mainQueue.advance(4s); // the model finds out
+    EXPECT_EQ(bar.text(), "Connecting...");
 }
 
 TEST_F(TimeLineWindowTest, AClickOnACellOpensItsPaneWithTheWayBackBelowIt)

@@ -20,7 +20,7 @@ std::string pinsKey(const std::string& technology)
 void TimeLine::pause()
 {
     if (!_store.isEmpty() && !isPaused())
-        showMoment(_store.present(), _store.lastTime());
+        showMoment(_store.present(), end());
 }
 
 void TimeLine::togglePause()
@@ -34,22 +34,28 @@ void TimeLine::togglePause()
 void TimeLine::showTime(Clock::TimePoint time)
 {
     if (!_store.isEmpty())
-        showMoment(_store.momentAt(time), std::clamp(time, _store.firstTime(), _store.lastTime()));
+        showMoment(_store.momentAt(time), std::clamp(time, _store.firstTime(), end()));
 }
 
 void TimeLine::showEvent(const Event& event)
 {
     if (!_store.isEmpty())
-        showMoment(std::min(event.moment, _store.present()), event.time);
+        showMoment(event.moment, std::max(event.time, _store.firstTime()));
+}
+
+Clock::TimePoint TimeLine::end() const
+{
+    return _clock ? std::max(_store.lastTime(), _clock->now()) : _store.lastTime();
 }
 
 void TimeLine::showMoment(std::uint64_t moment, Clock::TimePoint time)
 {
     // Nothing stands before the first change.
-    const std::uint64_t shown = std::max(moment, _store.firstMoment() + 1);
+    const std::uint64_t shown =
+        std::min(std::max(moment, _store.firstMoment() + 1), _store.present());
+    if (!_past || _past->moment() != shown || _pausedAt != time)
+        _past = std::make_unique<DisplayMoment>(_store, shown, time);
     _pausedAt = time;
-    if (!_past || _past->moment() != shown)
-        _past = std::make_unique<DisplayMoment>(_store, shown);
     if (_momentChanged)
         _momentChanged();
 }

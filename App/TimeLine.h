@@ -22,11 +22,12 @@ namespace ventrik
 class TimeLine
 {
   public:
-    /// Both outlive it.
-    TimeLine(const ChangeStore& store, Preferences& preferences,
+    /// All outlive it. Without a clock the last change is the end, as in a capture.
+    TimeLine(const ChangeStore& store, Preferences& preferences, const Clock* clock,
              std::vector<ValueAlert> alerts = {})
         : _store(store),
           _preferences(preferences),
+          _clock(clock),
           _series(store),
           _events(store, std::move(alerts))
     {
@@ -43,13 +44,15 @@ class TimeLine
     void pause();
     void togglePause();
     void showTime(Clock::TimePoint time);
-    /// After what happened there.
+    /// After what happened there; of what the store holds no more the oldest moment.
     void showEvent(const Event& event);
     void goLive();
     /// What is shown while it is paused; null otherwise.
     DisplayMoment* past() const { return _past.get(); }
     /// The moment to which the user has gone, which may lie between two changes.
     std::optional<Clock::TimePoint> pausedAt() const { return _pausedAt; }
+    /// The present, also where nothing comes.
+    Clock::TimePoint end() const;
 
     /// Takes what is new in the store, and tells what happened.
     std::vector<Event> update();
@@ -73,6 +76,7 @@ class TimeLine
 
     const ChangeStore& _store;
     Preferences& _preferences;
+    const Clock* _clock;
     PinnedSeries _series;
     EventLog _events;
     std::vector<Pin> _pins;

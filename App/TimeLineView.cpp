@@ -163,9 +163,7 @@ void TimeLineView::setStatus(const QString& text, bool isPaused, const QString& 
 void TimeLineView::update()
 {
     updateStrip();
-    _cells->setCells(_timeLine.isPaused() || _timeLine.store().isEmpty()
-                         ? cellsOf(_timeLine.shown())
-                         : cellsOf(_timeLine.shown(), _clock.now()));
+    _cells->setCells(cellsOf(_timeLine.shown(), _timeLine.pausedAt().value_or(_timeLine.end())));
     _events->setEvents(_timeLine.events());
 }
 
@@ -183,9 +181,7 @@ void TimeLineView::updateStrip()
     for (const Event& event : _timeLine.events().events())
         if (event.isMark)
             shown.marks.push_back({event.time, event.text, event.kind == EventKind::RRC});
-    // Where nothing comes the present goes on.
-    shown.last = _timeLine.isPaused() ? _timeLine.store().lastTime()
-                                      : std::max(_timeLine.store().lastTime(), _clock.now());
+    shown.last = _timeLine.end();
     shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();
     _strip->setSecondsFromUtc(_clock.timeZone(shown.last).secondsFromUtc);
     _strip->setData(std::move(shown));

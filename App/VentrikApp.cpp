@@ -50,6 +50,8 @@ VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
       _options(std::move(options)),
       _channelCounts(_options.records),
       _store(_options.records, _options.historyLimits),
+      _timeLine(_store, platform.preferences, _options.opened ? nullptr : &platform.clock,
+                _options.alerts),
       _sources(platform.resources, platform.clock, _options.records)
 {
 }
@@ -279,7 +281,7 @@ bool VentrikApp::isStale(const std::string& path)
     if (_store.isEmpty())
         return false;
     const DisplayMoment::Value* value = _timeLine.shown().valueAt(path);
-    const Clock::TimePoint now = _timeLine.pausedAt().value_or(_platform.clock.now());
+    const Clock::TimePoint now = _timeLine.pausedAt().value_or(_timeLine.end());
     return value && value->logCode != 0 && now - value->written > staleAge;
 }
 

@@ -164,7 +164,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::unique_ptr<VentrikSaveViewController> _saveViewController;
     ChannelCounts _channelCounts;
     ChangeStore _store;
-    TimeLine _timeLine{_store, _platform.preferences, _options.alerts};
+    TimeLine _timeLine;
     AlertTeller _alertTeller{_platform.clock, _options.notices, _options.ring};
     ValueSources _sources;
     std::unique_ptr<DateFormatter> _pauseFormatter;

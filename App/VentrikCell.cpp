@@ -91,15 +91,27 @@ void VentrikCell::setDoubt(const QString& line)
 
 void VentrikCell::setFaint(bool isFaint)
 {
-    if (!_value || std::exchange(_isFaint, isFaint) == isFaint)
-        return;
+    if (_value && std::exchange(_isFaint, isFaint) != isFaint)
+        colorValue();
+}
+
+// The label draws in the text's color, or in that of the highlight, which stays as it is.
+void VentrikCell::colorValue()
+{
     QPalette colors;
-    if (isFaint) {
-        QColor color = palette().color(QPalette::WindowText);
+    if (_isFaint) {
+        QColor color = palette().color(QPalette::Text);
         color.setAlphaF(faintness);
-        colors.setColor(QPalette::WindowText, color);
+        colors.setColor(QPalette::Text, color);
     }
-    _value->setPalette(isFaint ? colors : QPalette());
+    _value->setPalette(colors);
+}
+
+void VentrikCell::changeEvent(QEvent* event)
+{
+    TableRow::changeEvent(event);
+    if (event->type() == QEvent::PaletteChange && _isFaint)
+        colorValue();
 }
 
 bool VentrikCell::event(QEvent* event)

@@ -60,6 +60,7 @@ class VentrikCell : public TableRow
 
   protected:
     bool event(QEvent* event) override;
+    void changeEvent(QEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
     void timerEvent(QTimerEvent* event) override;
 
@@ -68,6 +69,7 @@ class VentrikCell : public TableRow
 
     VentrikCell(Style style, const QString& identifier);
 
+    void colorValue();
     void placeKey();
     void placeValue();
     int roomAroundKey() const;

@@ -468,7 +468,7 @@ Clock::TimePoint ChangeStore::firstTime() const
     for (const auto& chunk : _chunks)
         if (!chunk->messages.empty())
             return chunk->messages.front().time;
-    return {};
+    return _lastTime;
 }
 
 std::uint64_t ChangeStore::momentAt(Clock::TimePoint time) const
@@ -507,7 +507,7 @@ const ChangeStore::Chunk* ChangeStore::chunkAt(std::uint64_t moment) const
 
 DisplayMoment ChangeStore::at(std::uint64_t moment) const
 {
-    return {*this, std::clamp(moment, firstMoment(), _present)};
+    return {*this, moment};
 }
 
 void ChangeStore::visit(std::uint64_t from, StoreVisitor& visitor) const

@@ -88,7 +88,7 @@ class ChangeStore : public MessageObserver
     /// The moments from the first one that can be shown to the present.
     std::uint64_t firstMoment() const;
     std::uint64_t present() const { return _present; }
-    /// The same as times; the epoch where there is nothing.
+    /// The same as times; the epoch where nothing came.
     Clock::TimePoint firstTime() const;
     Clock::TimePoint lastTime() const { return _lastTime; }
     /// After all that came until then, that time included.

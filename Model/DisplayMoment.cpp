@@ -168,18 +168,25 @@ std::optional<PlaceId> DisplayMoment::Content::idAt(const std::string& path) con
 }
 
 DisplayMoment::DisplayMoment(const ChangeStore& store, std::uint64_t moment)
+    : DisplayMoment(store, moment,
+                    moment == store.present() ? store.lastTime() : store.timeOf(moment))
+{
+}
+
+DisplayMoment::DisplayMoment(const ChangeStore& store, std::uint64_t moment, Clock::TimePoint time)
     : _content(std::make_unique<Content>(store))
 {
     Content& content = *_content;
+    moment = std::clamp(moment, store.firstMoment(), store.present());
     content.moment = moment;
-    content.time = store.timeOf(moment);
+    content.time = std::max(time, store.timeOf(moment));
     content.technology = store.technologyAt(moment);
     const ChangeStore::Chunk* chunk = store.chunkAt(moment);
     if (!chunk)
         return;
     const auto changes = static_cast<std::uint32_t>(moment - chunk->first);
     content.goThrough(*chunk, changes);
-    if (moment == store.present()) {
+    if (moment == store.present() && content.time >= store.lastTime()) {
         content.heard = store._lastHeard;
         content.layouts = store._layouts;
     } else {

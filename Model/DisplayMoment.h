@@ -25,7 +25,11 @@ class DisplayMoment : public DisplayTree
         std::uint64_t change;     ///< the number of the change
     };
 
+    /// A moment of the store, the nearest that it still has, when its last change came; the present
+    /// with all that came since.
     DisplayMoment(const ChangeStore& store, std::uint64_t moment);
+    /// The same later on, before the next change.
+    DisplayMoment(const ChangeStore& store, std::uint64_t moment, Clock::TimePoint time);
     ~DisplayMoment() override;
     DisplayMoment(DisplayMoment&&) noexcept;
     DisplayMoment& operator=(DisplayMoment&&) noexcept;

@@ -3,11 +3,14 @@
 #include "Packets/PacketBuilder.h"
 #include "Tests/App/AppFixture.h"
 
+#include <QApplication>
 #include <QHelpEvent>
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QTest>
 #include <QToolTip>
+
+#include <algorithm>
 
 namespace ventrik
 {
@@ -56,6 +59,15 @@ class OriginTest : public AppFixture
     VentrikCell& cell(int row)
     {
         return static_cast<VentrikCell&>(*topPane().table().rowAt({0, row}));
+    }
+    static int darkestOf(QWidget& widget)
+    {
+        const QImage image = widget.grab().toImage();
+        int darkest = 255;
+        for (int y = 0; y < image.height(); ++y)
+            for (int x = 0; x < image.width(); ++x)
+                darkest = std::min(darkest, image.pixelColor(x, y).lightness());
+        return darkest;
     }
     static std::string tipOver(QWidget& widget)
     {
@@ -125,16 +137,27 @@ TEST_F(OriginTest, ThePointerIsToldInShort)
     EXPECT_EQ(tipOver(cell(1)), "");
 }
 
+TEST_F(OriginTest, AFainterValueFollowsTheColorsOfTheDesktop)
+{
+    wait(12s);
+    QPalette dark = QApplication::palette();
+    dark.setColor(QPalette::Base, Qt::black);
+    dark.setColor(QPalette::Text, Qt::white);
+    cell(0).setPalette(dark);
+    EXPECT_GT(cell(0).value()->palette().color(QPalette::Text).lightness(), 200);
+}
+
 TEST_F(OriginTest, AValueThatWasNotToldForLongIsFainter)
 {
     EXPECT_FALSE(cell(0).isFaint());
+    const int usual = darkestOf(*cell(0).value());
     wait(12s);
     EXPECT_TRUE(cell(0).isFaint());
-    EXPECT_LT(cell(0).value()->palette().color(QPalette::WindowText).alphaF(), 1);
+    EXPECT_GT(darkestOf(*cell(0).value()), usual + 40);
     EXPECT_FALSE(cell(1).isFaint()); // nobody tells it
     tell(301);
     EXPECT_FALSE(cell(0).isFaint());
-    EXPECT_EQ(cell(0).value()->palette().color(QPalette::WindowText).alphaF(), 1);
+    EXPECT_EQ(darkestOf(*cell(0).value()), usual);
 }
 
 } // namespace ventrik

@@ -72,14 +72,49 @@ TEST_F(PauseTest, TheSpaceBarFreezesThePanesWhileDataRunOn)
     EXPECT_EQ(firstRow(), "Physical Cell ID: 302");
 }
 
+TEST_F(PauseTest, AtAPauseNothingBecomesYounger)
+{
+    launchAndConnect();
+    drive(301);
+    openRow(0);
+    fake.clock.advance(60s);
+    fake.mainQueue.advance(60s);
+    EXPECT_TRUE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+    press(Qt::Key_Space);
+    EXPECT_TRUE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+    EXPECT_EQ(app.timeLine().pausedAt(), fake.clock.now());
+}
+
+TEST_F(PauseTest, WhatWasToldAgainAndAgainIsNotOldInThePast)
+{
+    launchAndConnect();
+    for (int message = 0; message < 20; ++message)
+        drive(301);
+    drive(302);
+    app.timeLine().showTime(fake.clock.now() - 6s);
+    EXPECT_FALSE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+}
+
+TEST_F(PauseTest, WhatCameAgainOnlyLaterIsOldInAGap)
+{
+    launchAndConnect();
+    drive(301);
+    fake.clock.advance(60s);
+    drive(301);
+    app.timeLine().showTime(fake.clock.now() - 2s);
+    EXPECT_FALSE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+    app.timeLine().showTime(fake.clock.now() - 30s);
+    EXPECT_TRUE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+}
+
 TEST_F(PauseTest, TheStatusTellsOfThePause)
 {
     launchAndConnect();
     drive(301);
     press(Qt::Key_Space);
-    EXPECT_EQ(statusText(topPane()), "Paused at 06:10:28 · Live");
+    EXPECT_EQ(statusText(topPane()), "Paused at 06:10:30 · Live");
     drive(302);
-    EXPECT_EQ(statusText(topPane()), "Paused at 06:10:28 · Live");
+    EXPECT_EQ(statusText(topPane()), "Paused at 06:10:30 · Live");
     press(Qt::Key_Space);
     EXPECT_EQ(statusText(topPane()), "Updated 2026-11-16 at 06:10:32");
 }
@@ -193,7 +228,11 @@ namespace
 class TwoTurns : public OpenedSource
 {
   public:
-    explicit TwoTurns(const FakePlatform& fake) : _fake(fake) {}
+    /// The second turn ends with a text of its own.
+    explicit TwoTurns(const FakePlatform& fake, std::string text = {})
+        : _fake(fake), _text(std::move(text))
+    {
+    }
 
     void setObserver(MessageObserver& observer) override
     {
@@ -204,9 +243,9 @@ class TwoTurns : public OpenedSource
     bool readOn() override
     {
         ++_turn;
-        _state.set(
-            StateKey::display,
-            PlistDictionary{{"Cell", PlistDictionary{{"PCI", std::to_string(300 + _turn)}}}});
+        _state.set(StateKey::display,
+                   PlistDictionary{{"Cell", PlistDictionary{{"PCI", std::to_string(300 + _turn)},
+                                                            {"Text", _turn < 2 ? "" : _text}}}});
         _observer->messageTaken(_fake.clock.now() + _turn * 60s, {}, _state);
         return _turn < 2;
     }
@@ -215,6 +254,7 @@ class TwoTurns : public OpenedSource
 
   private:
     const FakePlatform& _fake;
+    std::string _text;
     IdleGenerator _generator;
     PlistDictionary _state;
     MessageObserver* _observer = nullptr;
@@ -273,6 +313,20 @@ TEST_F(OpenedWindowTest, GoesBackInTheCaptureAndToItsEnd)
     EXPECT_EQ(*window.nodeAtPath("/Cell/PCI")->value(), "302");
 }
 
+TEST_F(OpenedWindowTest, ShowsWhatStandsWhereTheHistoryHasNoChangeLeft)
+{
+    VentrikAppOptions options =
+        optionsOf(std::make_shared<TwoTurns>(fake, std::string(40000, 'x')));
+    options.historyLimits.bytes = 16384;
+    VentrikApp small(fake.platform(), options);
+    small.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    const ChangeStore& store = small.timeLine().store();
+    ASSERT_FALSE(store.isEmpty());
+    ASSERT_EQ(store.firstMoment(), store.present());
+    EXPECT_EQ(*small.nodeAtPath("/Cell/PCI")->value(), "302");
+}
+
 TEST_F(OpenedWindowTest, SavesNothingAndHasNoChannel)
 {
     window.applicationDidFinishLaunching();
@@ -310,6 +364,10 @@ class TimeLineWindowTest : public AppFixture
     {
         VentrikAppOptions options = optionsOf(width);
         options.timeLine = withTimeLine;
+        return launch(options);
+    }
+    VentrikApp& launch(const VentrikAppOptions& options)
+    {
         window.emplace(fake.platform(), options);
         window->applicationDidFinishLaunching();
         fake.mainQueue.run();
@@ -525,6 +583,34 @@ TEST_F(TimeLineWindowTest, ThePauseButtonFreezesAndLeadsBack)
     button.click();
     EXPECT_FALSE(window->timeLine().isPaused());
     EXPECT_EQ(window->timeLineView()->strip().cursor(), std::nullopt);
+}
+
+TEST_F(TimeLineWindowTest, CellsAreAsOldAsTheyWereAtTheMoment)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    fake.clock.advance(60s);
+    window->timeLine().showTime(fake.clock.now() - 20s);
+    const QAbstractItemModel& cells = *window->timeLineView()->cells().table().model();
+    EXPECT_EQ(cells.index(0, CellsModel::Age).data().toString(), "40");
+}
+
+TEST_F(TimeLineWindowTest, AnEventThatTheHistoryHasNoMoreLeadsToItsBeginning)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    VentrikAppOptions options = optionsOf(900);
+    options.historyLimits.bytes = 65536;
+    launch(options);
+    for (std::uint16_t identity = 0; identity < 500; ++identity) {
+        fake.clock.advance(2s);
+        tell(identity);
+    }
+    const Event oldest = window->timeLine().events().events().front();
+    const Clock::TimePoint begin = window->timeLine().store().firstTime();
+    ASSERT_FALSE(window->timeLine().store().isEmpty());
+    ASSERT_LT(oldest.time, begin);
+    window->timeLine().showEvent(oldest);
+    EXPECT_EQ(window->timeLine().pausedAt(), begin);
 }
 
 TEST_F(TimeLineWindowTest, TheBarIsNotLiveWhileTheChannelIsLost)

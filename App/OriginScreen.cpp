@@ -3,8 +3,12 @@
 #include "App/StatusItems.h"
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/NavigationStack.h"
+#include "App/Toolkit/WindowKeys.h"
 
+#include <QClipboard>
 #include <QFontDatabase>
+#include <QGuiApplication>
+#include <QKeyEvent>
 #include <QPlainTextEdit>
 #include <QScrollBar>
 #include <QTextBlock>
@@ -29,10 +33,26 @@ QFont fixedFont()
     return font;
 }
 
+/// Without a selection all of it is copied.
+class OriginText : public QPlainTextEdit
+{
+  public:
+    using QPlainTextEdit::QPlainTextEdit;
+
+  protected:
+    void keyPressEvent(QKeyEvent* event) override
+    {
+        if (event->matches(QKeySequence::Copy) && !textCursor().hasSelection())
+            QGuiApplication::clipboard()->setText(toPlainText());
+        else
+            QPlainTextEdit::keyPressEvent(event);
+    }
+};
+
 } // namespace
 
 OriginScreen::OriginScreen(VentrikPaneHost& host, const Clock& clock, Finder find)
-    : _host(host), _clock(clock), _find(std::move(find)), _text(new QPlainTextEdit(this))
+    : _host(host), _clock(clock), _find(std::move(find)), _text(new OriginText(this))
 {
     setTitle(QStringLiteral("Origin"));
     _text->setReadOnly(true);
@@ -41,6 +61,7 @@ OriginScreen::OriginScreen(VentrikPaneHost& host, const Clock& clock, Finder fin
     _text->setFont(fixedFont());
     _text->document()->setDocumentMargin(textMargin);
     _text->setAccessibleName(title());
+    leaveKeysToWindow(*_text);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(_text);
@@ -69,14 +90,8 @@ bool OriginScreen::reload()
 
 void OriginScreen::showText()
 {
-    QString lines;
-    if (!_source) {
-        lines = QStringLiteral("There is no value here now.");
-    } else {
-        for (const auto& [name, value] : _source->lines(_clock))
-            lines += QString::fromStdString(name + ": " + value + "\n");
-        lines += u'\n' + QString::fromStdString(_source->packetText(bytesOfLine()));
-    }
+    const QString lines = _source ? QString::fromStdString(_source->allText(_clock, bytesOfLine()))
+                                  : QStringLiteral("There is no value here now.");
     // What one reads or has selected stays as long as it says the same.
     if (lines == _text->toPlainText())
         return;

@@ -5,6 +5,7 @@
 #include "App/Toolkit/PlainText.h"
 #include "Model/ChannelNote.h"
 #include "Model/NodeRows.h"
+#include "Platform/Technology.h"
 
 #include <QGuiApplication>
 #include <QScreen>
@@ -28,7 +29,6 @@ constexpr auto noteInterval = 1s;
 constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
 constexpr auto staleAge = 10s;
-constexpr auto readingInterval = 500ms;
 
 constexpr std::string_view timeLineKey = "TimeLine";
 constexpr std::string_view timeLineShown = "shown";
@@ -54,6 +54,8 @@ VentrikApp::VentrikApp(const Platform& platform, VentrikAppOptions options)
                 _options.alerts),
       _sources(platform.resources, platform.clock, _options.records)
 {
+    if (_options.opened)
+        _reading.emplace(_options.opened, _platform, _store, _timeLine);
 }
 
 VentrikApp::~VentrikApp() = default;
@@ -90,42 +92,22 @@ void VentrikApp::applicationDidFinishLaunching()
         _tree->keep();
         reloadScreens();
     }
-    if (_options.opened)
-        openSource();
+    if (_reading)
+        openCapture();
     else
         startModelLater();
 }
 
-void VentrikApp::openSource()
+void VentrikApp::openCapture()
 {
-    _options.opened->setObserver(_store);
-    _isReading = true;
     _hasRefreshed = true;
-    readOnLater();
+    _reading->start([this] {
+        updateTimeLine();
+        updateStatusForViewController(_navController->topScreen());
+        updateWindowTitle();
+    });
     updateStatusForViewController(_navController->topScreen());
     updateWindowTitle();
-}
-
-void VentrikApp::readOnLater()
-{
-    _platform.mainQueue.async([this, started = std::weak_ptr(_model)] {
-        if (!started.expired())
-            readOn();
-    });
-}
-
-void VentrikApp::readOn()
-{
-    _isReading = _options.opened->readOn();
-    if (_isReading)
-        readOnLater();
-    const Clock::TimePoint now = _platform.clock.now();
-    if (_isReading && _lastReadingUpdate && now - *_lastReadingUpdate < readingInterval)
-        return;
-    _lastReadingUpdate = now;
-    _timeLine.update();
-    goLive();
-    updateStatusForViewController(_navController->topScreen());
 }
 
 void VentrikApp::createWindow()
@@ -155,8 +137,8 @@ void VentrikApp::createDateFormatter()
     _dateFormatter = std::make_unique<DateFormatter>(_platform.clock);
     _dateFormatter->setDateFormat(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
     _pauseFormatter = std::make_unique<DateFormatter>(_platform.clock);
-    _pauseFormatter->setDateFormat(_options.opened ? QStringLiteral("'at' yyyy-MM-dd HH:mm:ss")
-                                                   : QStringLiteral("'Paused at' HH:mm:ss"));
+    _pauseFormatter->setDateFormat(_reading ? QStringLiteral("'at' yyyy-MM-dd HH:mm:ss")
+                                            : QStringLiteral("'Paused at' HH:mm:ss"));
 }
 
 void VentrikApp::createNavigationStack()
@@ -190,14 +172,15 @@ void VentrikApp::createTimeLine()
          .onOpen = [this](const std::string& path) { openPane(path); },
          .onPause = [this] { togglePause(); },
          .onSaved = [this](const std::string& fileName) { snapshotSaved(fileName); }});
-    if (_options.opened)
-        _timeLineView->setCaptureName(_options.opened->name());
+    if (_reading)
+        _timeLineView->setCaptureName(_reading->name());
     _viewerWindow->addTimeLine(_timeLineView);
     const auto kept = _platform.preferences.text(preferenceDomain, timeLineKey);
     _viewerWindow->setTimeLineWanted(_options.timeLine && kept != timeLineHidden);
     _timeLineView->strip().setBands(_options.bands);
     _viewerWindow->setWidthCallback([this] {
         leaveTimeLineScreen();
+        updateTimeLine();
         if (_navController && _options.timeLineButton)
             updateStatusForViewController(_navController->topScreen());
     });
@@ -240,7 +223,7 @@ void VentrikApp::toggleTimeLine()
 // The end of a capture stands still by itself.
 void VentrikApp::togglePause()
 {
-    if (_options.opened)
+    if (_reading)
         goLive();
     else
         _timeLine.togglePause();
@@ -322,7 +305,7 @@ void VentrikApp::updateTimeLine()
     if (!_timeLineView || _timeLineView->isHidden())
         return;
     _timeLineView->setStatus(QString::fromStdString(timeLineStatus()), showsPast(),
-                             _options.opened ? QStringLiteral("End") : QStringLiteral("Live"));
+                             _reading ? QStringLiteral("End") : QStringLiteral("Live"));
     _timeLineView->update();
 }
 
@@ -330,8 +313,8 @@ std::string VentrikApp::timeLineStatus() const
 {
     if (const auto at = _timeLine.pausedAt())
         return _pauseFormatter->stringFromDate(*at);
-    if (_options.opened)
-        return openedStatus();
+    if (_reading)
+        return _reading->status();
     return _model && _model->isConnected() ? "Live" : connectingStatus;
 }
 
@@ -355,6 +338,7 @@ void VentrikApp::applicationWillTerminate()
     _timeLine.goLive();
     _dateFormatter.reset();
     _pauseFormatter.reset();
+    _reading.reset();
     setSaveViewController(nullptr);
     if (_window)
         _window->hide();
@@ -372,7 +356,7 @@ void VentrikApp::_setGSMRSSI(bool value)
 
 void VentrikApp::showSaveView()
 {
-    if (_saveViewController || !_navController || _options.opened)
+    if (_saveViewController || !_navController || _reading)
         return;
     setSaveViewController(VentrikSaveViewController::initWithSaveHistory(
         *this, _platform, _options.snapshotDirectory, _model->getSaveContents()));
@@ -402,8 +386,8 @@ void VentrikApp::snapshotSaved(const std::string& fileName)
 
 void VentrikApp::updateStatusForViewController(Screen& screen)
 {
-    if (_options.opened)
-        screen.setStatus(openedStatus(), _isReading);
+    if (_reading)
+        screen.setStatus(_reading->status(), _reading->isReading());
     else if (showsPast())
         screen.setStatus(pausedStatus(), false);
     else if (_model->isConnected())
@@ -415,20 +399,10 @@ void VentrikApp::updateStatusForViewController(Screen& screen)
 // A capture's present is its end.
 void VentrikApp::goLive()
 {
-    if (_options.opened)
-        _timeLine.showTime(_store.lastTime());
+    if (_reading)
+        _reading->showEnd();
     else
         _timeLine.goLive();
-}
-
-std::string VentrikApp::openedStatus() const
-{
-    const std::string name = _options.opened->name();
-    if (_isReading)
-        return "Reading " + name + ": " + _options.opened->progress();
-    if (!_timeLine.pausedAt())
-        return name;
-    return name + " " + _pauseFormatter->stringFromDate(*_timeLine.pausedAt());
 }
 
 std::string VentrikApp::pausedStatus() const
@@ -471,7 +445,9 @@ void VentrikApp::shownMomentChanged()
         return;
     _liveKey->setEnabled(showsPast());
     updateTimeLine();
+    _isMovingInTime = true;
     reloadScreens();
+    _isMovingInTime = false;
     updateStatusForViewController(_navController->topScreen());
 }
 
@@ -486,6 +462,7 @@ void VentrikApp::channelChanged()
         updateStatusForViewController(_navController->topScreen());
     else
         updateTopNotes();
+    _alertTeller.tell(_timeLine.update());
     updateTimeLine();
     updateWindowTitle();
 }
@@ -500,7 +477,7 @@ void VentrikApp::toggleChannelPane()
 {
     if (!_navController || _saveViewController)
         return;
-    if (_options.opened)
+    if (_reading)
         return; // there is no channel
     _timeLine.goLive();
     const bool leadsThere = _tree->toggle(topPath());
@@ -514,7 +491,7 @@ void VentrikApp::toggleChannelPane()
     }
 }
 
-// Every screen of the stack is a pane.
+// Empty where the screen is no pane.
 std::string VentrikApp::topPath() const
 {
     const auto* pane = dynamic_cast<VentrikPaneController*>(&_navController->topScreen());
@@ -542,6 +519,9 @@ ModelNodePointer VentrikApp::topLevelNodes()
 
 ModelNodePointer VentrikApp::nodeAtPath(const std::string& path)
 {
+    // The channel has no past.
+    if (_tree && _tree->holds(path))
+        return _tree->nodeAtPath(path);
     return shownTree() ? shownTree()->nodeAtPath(path) : nullptr;
 }
 
@@ -559,16 +539,16 @@ StatusNote VentrikApp::statusNote() const
 {
     if (_savedMessage)
         return {*_savedMessage, StatusLabel::NoteKind::Passing};
-    if (_options.opened)
-        return {_isReading ? std::string() : _options.opened->fault()};
+    if (_reading)
+        return {_reading->note()};
     return {_model ? channelNote(ChannelState::of(*_model), _platform.clock, _lastUpdate)
                    : std::string()};
 }
 
 std::string VentrikApp::reasonForNoData() const
 {
-    if (_options.opened && _store.isEmpty())
-        return _isReading ? std::string() : "Nothing in the capture can be shown";
+    if (_reading && _store.isEmpty())
+        return _reading->isReading() ? std::string() : "Nothing in the capture can be shown";
     if (showsPast())
         return "Nothing was here then";
     return _model ? ventrik::reasonForNoData(ChannelState::of(*_model)) : std::string();
@@ -581,13 +561,22 @@ void VentrikApp::updateWindowTitle()
         if (!part.isEmpty())
             title += QStringLiteral(" – ") + oneLine(part);
     };
-    if (_options.opened)
-        add(QString::fromStdString(_options.opened->name()));
-    const std::string_view technology = _model->technologyName();
+    if (_reading)
+        add(QString::fromStdString(_reading->name()));
+    const std::string_view technology = technologyName();
     add(QString::fromUtf8(technology.data(), static_cast<qsizetype>(technology.size())));
     if (_navController->screens().size() > 1)
         add(_navController->topScreen().title());
     _window->setWindowTitle(title);
+}
+
+// As people call it; empty where it is not known.
+std::string_view VentrikApp::technologyName() const
+{
+    if (!_reading)
+        return _model->technologyName();
+    const auto technology = technologyNamed(_store.technologyAt(_store.present()));
+    return technology ? technology->displayName : std::string_view();
 }
 
 void VentrikApp::willShowScreen(NavigationStack&, Screen& screen, bool)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "App/AlertTeller.h"
+#include "App/CaptureReading.h"
 #include "App/DateFormatter.h"
 #include "App/TimeLine.h"
 #include "App/TimeLineScreen.h"
@@ -11,7 +12,6 @@
 #include "App/ViewerWindow.h"
 #include "Charts/QualityBands.h"
 #include "Model/ChannelPane.h"
-#include "Model/OpenedSource.h"
 #include "Model/ValueSource.h"
 #include "Platform/Notices.h"
 #include "Platform/Platform.h"
@@ -115,8 +115,11 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     ModelNodePointer nodeAtPath(const std::string& path) override;
     std::string_view doubtAt(const std::string& path) const override;
     std::vector<std::string> layoutWarningsAt(const std::string& path) const override;
-    bool allowSaveButton() const override { return _allowSaveButton && !_options.opened; }
-    bool tintsChanges() const override { return _options.tintsChanges && !showsPast(); }
+    bool allowSaveButton() const override { return _allowSaveButton && !_reading; }
+    bool tintsChanges() const override
+    {
+        return _options.tintsChanges && !showsPast() && !_isMovingInTime;
+    }
     bool showsPast() const override { return _timeLine.isPaused(); }
     void goLive() override;
     bool canPin(const std::string& path) override { return _timeLine.canPin(path); }
@@ -149,10 +152,8 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void togglePause();
     std::string pausedStatus() const;
     std::string timeLineStatus() const;
-    void readOnLater();
-    void readOn();
-    void openSource();
-    std::string openedStatus() const;
+    void openCapture();
+    std::string_view technologyName() const;
     DisplayTree* shownTree() const;
 
     Platform _platform;
@@ -170,15 +171,15 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     std::unique_ptr<DateFormatter> _pauseFormatter;
     QPointer<TimeLineView> _timeLineView;     // the window's
     QPointer<TimeLineScreen> _timeLineScreen; // while the stack has one
-    bool _isReading = false;                  // the opened source
-    std::optional<Clock::TimePoint> _lastReadingUpdate;
-    QPointer<QShortcut> _liveKey; // Home, while that leads anywhere
+    std::optional<CaptureReading> _reading;   // of an opened capture
+    QPointer<QShortcut> _liveKey;             // Home, while that leads anywhere
     std::shared_ptr<VentrikModel> _model;
     std::unique_ptr<ChannelPane> _tree; // the model's, with a row for the channel
     bool _allowSaveButton = false;
     std::unique_ptr<DateFormatter> _dateFormatter;
     std::optional<std::string> _updateMessage;
     bool _hasRefreshed = false;
+    bool _isMovingInTime = false; // what shows changes, but did not change just now
     std::optional<Clock::TimePoint> _lastUpdate;
     std::shared_ptr<const std::string> _savedMessage; // while it is shown
     std::unique_ptr<RepeatingTimer> _noteTimer;

@@ -82,9 +82,9 @@ void ViewerWindow::resizeEvent(QResizeEvent*)
 {
     if (std::exchange(_wasWide, isWide()) == isWide())
         return;
+    layOut();
     if (_widthChanged)
         _widthChanged();
-    layOut();
 }
 
 void ViewerWindow::keyPressEvent(QKeyEvent* event)

@@ -127,13 +127,12 @@ std::string ValueSource::packetText(std::size_t bytesOfLine) const
     return lines;
 }
 
-std::string ValueSource::allText(const Clock& clock) const
+std::string ValueSource::allText(const Clock& clock, std::size_t bytesOfLine) const
 {
-    constexpr std::size_t bytesOfLine = 16;
     std::string all;
     for (const auto& [name, value] : lines(clock))
         all += name + ": " + value + "\n";
-    return all + packetText(bytesOfLine);
+    return all + "\n" + packetText(bytesOfLine);
 }
 
 ValueSources::ValueSources(const Resources& resources, const Clock& clock, RecordsMode records)

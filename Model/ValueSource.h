@@ -38,8 +38,8 @@ struct ValueSource {
     std::string packetText(std::size_t bytesOfLine) const;
     /// In one line: log code, version, layout, raw number and place; empty where nothing is known.
     std::string brief() const;
-    /// All of it.
-    std::string allText(const Clock& clock) const;
+    /// All of it: the lines, an empty one, and the packet.
+    std::string allText(const Clock& clock, std::size_t bytesOfLine) const;
     /// Whether a byte of the packet holds some of the value.
     bool isMarked(std::size_t byte) const;
 };

@@ -26,6 +26,11 @@ constexpr std::size_t messagesBetweenLooks = 64;
 std::unique_ptr<OpenedCapture> OpenedCapture::open(const OpenedCaptureOptions& options,
                                                    const Platform& platform, std::string& error)
 {
+    std::error_code unknown;
+    if (std::filesystem::is_other(std::filesystem::status(options.capture, unknown))) {
+        error = options.capture + ": it is no file"; // waiting for it would hold up the window
+        return nullptr;
+    }
     auto reader = CaptureReader::open(options.capture, error);
     if (!reader)
         return nullptr;

@@ -71,6 +71,13 @@ std::string fileValue(const std::string& text)
     return text;
 }
 
+std::string openedValue(const std::string& text)
+{
+    if (text == "-")
+        throw WrongValue("standard input cannot be opened");
+    return text;
+}
+
 void addServiceOptions(CommandLine& line, ViewerOptions& result)
 {
     line.addOption("--demo TECHNOLOGY", "brings its own telephony service: " + technologyNames(),
@@ -87,7 +94,7 @@ void addServiceOptions(CommandLine& line, ViewerOptions& result)
                        return text;
                    });
     line.addOption("--open CAPTURE", "shows a whole capture at once, without a service",
-                   result.opened, textValue);
+                   result.opened, openedValue);
     line.addOption(
         "--technology NAME",
         "what the port speaks, or the capture where it does not tell: " + technologyNames(),
@@ -99,9 +106,11 @@ void addTimeLineOptions(CommandLine& line, VentrikAppOptions& app)
     line.addFlag("--timeline",
                  "in a narrow window a button leads to the time line; Ctrl+T does, too",
                  app.timeLineButton);
-    line.addOption("--history SIZE", "how much the time line keeps at most (default: 64M)",
+    line.addOption("--history SIZE",
+                   "how much the time line keeps at most (default: 64M, of --open 1G)",
                    app.historyLimits.bytes, historySizeValue);
-    line.addOption("--history-age TIME", "for how long it keeps that (default: 24h)",
+    line.addOption("--history-age TIME",
+                   "for how long it keeps that (default: 24h, of --open any time)",
                    app.historyLimits.age, historyAgeValue);
     line.addOption("--bands LIMITS",
                    "from where on a signal is excellent, good and fair, as in "
@@ -141,8 +150,8 @@ void addOptions(CommandLine& line, ViewerOptions& result)
                        "copies every line of the log to standard error", result.verbose);
     line.addExitStatus(EXIT_SUCCESS, "it was ended");
     line.addExitStatus(EXIT_FAILURE,
-                       "there is no display, no service of its own, or nothing can be recorded "
-                       "there");
+                       "there is no display, no service of its own, nothing can be recorded there, "
+                       "or the capture cannot be read");
 }
 
 void refuseWrongTogether(const CommandLine& line)
@@ -162,6 +171,15 @@ void refuseWrongTogether(const CommandLine& line)
         line.refuse("--remember-records goes with --records");
 }
 
+// A capture is to be seen as a whole.
+void keepWholeCapture(const CommandLine& line, ChangeStore::Limits& limits)
+{
+    if (!line.has("--history"))
+        limits.bytes = std::size_t{1} << 30;
+    if (!line.has("--history-age"))
+        limits.age = std::chrono::nanoseconds::max();
+}
+
 ViewerOptions parseArguments(int argc, char** argv)
 {
     CommandLine line("ventrik",
@@ -173,6 +191,8 @@ ViewerOptions parseArguments(int argc, char** argv)
     line.parse(argc, argv);
     refuseWrongTogether(line);
     refuseWrongRecording(line);
+    if (line.has("--open"))
+        keepWholeCapture(line, result.app.historyLimits);
     return result;
 }
 

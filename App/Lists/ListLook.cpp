@@ -3,6 +3,7 @@
 #include "App/Toolkit/Fonts.h"
 #include "App/Toolkit/Separator.h"
 #include "App/Toolkit/ThinScrollBar.h"
+#include "App/Toolkit/WindowKeys.h"
 
 #include <QAbstractItemView>
 #include <QPainter>
@@ -73,6 +74,7 @@ void makePlain(QAbstractItemView& view)
     view.setEditTriggers(QAbstractItemView::NoEditTriggers);
     view.setTabKeyNavigation(false);
     view.setFont(listFont());
+    leaveKeysToWindow(view);
     QScroller::grabGesture(view.viewport(), QScroller::TouchGesture);
 }
 

@@ -226,7 +226,10 @@ void SignalStrip::usePinch(const QTouchEvent& event)
     const QPointF one = event.points().at(0).position();
     const QPointF other = event.points().at(1).position();
     const double width = std::max(8.0, distance(one, other));
-    if (_pinchWidth > 0)
+    // A finger that comes, or comes back, begins anew.
+    const bool isMove = !event.touchPointStates().testAnyFlags(
+        {QEventPoint::State::Pressed, QEventPoint::State::Released});
+    if (_pinchWidth > 0 && isMove)
         zoomAt(_pinchWidth / width, (one.x() + other.x()) / 2);
     _pinchWidth = width;
 }

@@ -362,15 +362,14 @@ bool TableView::useRowKey(const QKeyEvent& event, int row)
         copyRow({0, row});
         return true;
     }
-    if (runAction(event, row))
-        return true;
-    if ((event.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
-        return false;
-    if (event.key() == Qt::Key_Return || event.key() == Qt::Key_Enter) {
+    const bool isPlain = (event.modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
+    if (isPlain && (event.key() == Qt::Key_Return || event.key() == Qt::Key_Enter)) {
         activate(row);
         return true;
     }
-    return scrollSideways(row, event.key());
+    if (isPlain && (event.key() == Qt::Key_Left || event.key() == Qt::Key_Right))
+        return scrollSideways(row, event.key());
+    return runAction(event, row);
 }
 
 bool TableView::runAction(const QKeyEvent& event, int row)
@@ -387,9 +386,7 @@ bool TableView::runAction(const QKeyEvent& event, int row)
 bool TableView::scrollSideways(int row, int key)
 {
     TableRow* widget = rowAt({0, row});
-    if (!widget || (key != Qt::Key_Left && key != Qt::Key_Right))
-        return false;
-    return widget->scrollSideways(key == Qt::Key_Right ? 1 : -1);
+    return widget && widget->scrollSideways(key == Qt::Key_Right ? 1 : -1);
 }
 
 void TableView::moveTo(int row)

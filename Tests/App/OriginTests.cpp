@@ -4,6 +4,7 @@
 #include "Tests/App/AppFixture.h"
 
 #include <QApplication>
+#include <QClipboard>
 #include <QHelpEvent>
 #include <QLabel>
 #include <QPlainTextEdit>
@@ -128,6 +129,24 @@ TEST_F(OriginTest, TheKeyDoesNothingWhereNoRecordToldTheValue)
     press(Qt::Key_Down);
     press(Qt::Key_I, Qt::ControlModifier);
     EXPECT_EQ(titles().back(), "Serving Cell Info");
+}
+
+TEST_F(OriginTest, TheSpaceBarPausesThereAndHomeReturns)
+{
+    press(Qt::Key_Down);
+    press(Qt::Key_I, Qt::ControlModifier);
+    press(Qt::Key_Space);
+    EXPECT_TRUE(app.showsPast());
+    press(Qt::Key_Home);
+    EXPECT_FALSE(app.showsPast());
+}
+
+TEST_F(OriginTest, WithoutASelectionAllIsCopied)
+{
+    press(Qt::Key_Down);
+    press(Qt::Key_I, Qt::ControlModifier);
+    press(Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QGuiApplication::clipboard()->text().toStdString(), originText());
 }
 
 TEST_F(OriginTest, ThePointerIsToldInShort)

@@ -413,6 +413,20 @@ TEST_F(SignalStripTest, TwoFingersZoomAroundTheirMiddle)
     EXPECT_EQ(strip.cursor(), std::nullopt);
 }
 
+TEST_F(SignalStripTest, AFingerThatComesBackElsewhereDoesNotZoom)
+{
+    QTest::touchEvent(&strip, touchScreen()).press(0, {200, 150}, &strip);
+    QTest::touchEvent(&strip, touchScreen())
+        .move(0, {200, 150}, &strip)
+        .press(1, {300, 150}, &strip);
+    QTest::touchEvent(&strip, touchScreen()).stationary(0).release(1, {300, 150}, &strip);
+    const double before = length();
+    QTest::touchEvent(&strip, touchScreen()).stationary(0).press(1, {500, 150}, &strip);
+    EXPECT_EQ(length(), before);
+    QTest::touchEvent(&strip, touchScreen()).stationary(0).move(1, {350, 150}, &strip);
+    EXPECT_GT(length(), before);
+}
+
 TEST_F(SignalStripTest, ATouchPadPinches)
 {
     leaveNewest();

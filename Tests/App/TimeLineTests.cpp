@@ -2,6 +2,7 @@
 #include "App/Lists/CellsView.h"
 #include "App/Lists/EventsView.h"
 #include "App/Strip/SignalStrip.h"
+#include "App/VentrikCell.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/PacketBuilder.h"
 #include "Tests/App/AppFixture.h"
@@ -105,6 +106,30 @@ TEST_F(PauseTest, WhatCameAgainOnlyLaterIsOldInAGap)
     EXPECT_FALSE(app.isStale("/Serving Cell Info/Physical Cell ID"));
     app.timeLine().showTime(fake.clock.now() - 30s);
     EXPECT_TRUE(app.isStale("/Serving Cell Info/Physical Cell ID"));
+}
+
+TEST_F(PauseTest, ComingBackTintsNothing)
+{
+    launchAndConnect();
+    drive(301);
+    openRow(0);
+    press(Qt::Key_Space);
+    drive(302);
+    app.timeLine().goLive();
+    ASSERT_EQ(firstRow(), "Physical Cell ID: 302");
+    EXPECT_FALSE(static_cast<VentrikCell&>(*topPane().table().rowAt({0, 0})).isTinted());
+}
+
+TEST_F(PauseTest, TheChannelStaysInViewAtAPause)
+{
+    launchAndConnect();
+    drive(301);
+    app.toggleChannelPane();
+    const int rows = topPane().rowsInSection(0);
+    ASSERT_GT(rows, 0);
+    press(Qt::Key_Space);
+    ASSERT_TRUE(app.showsPast());
+    EXPECT_EQ(topPane().rowsInSection(0), rows);
 }
 
 TEST_F(PauseTest, TheStatusTellsOfThePause)
@@ -243,14 +268,20 @@ class TwoTurns : public OpenedSource
     bool readOn() override
     {
         ++_turn;
-        _state.set(StateKey::display,
-                   PlistDictionary{{"Cell", PlistDictionary{{"PCI", std::to_string(300 + _turn)},
-                                                            {"Text", _turn < 2 ? "" : _text}}}});
+        if (before)
+            before(_turn);
+        _state.set(
+            StateKey::display,
+            PlistDictionary{{"Cell", PlistDictionary{{"PCI", std::to_string(300 + _turn)},
+                                                     {"Text", _turn < turns ? "" : _text}}}});
         _observer->messageTaken(_fake.clock.now() + _turn * 60s, {}, _state);
-        return _turn < 2;
+        return _turn < turns;
     }
     std::string progress() const override { return std::to_string(_turn) + " messages"; }
     std::string fault() const override { return "it ends too early"; }
+
+    int turns = 2;
+    std::function<void(int turn)> before = {};
 
   private:
     const FakePlatform& _fake;
@@ -288,7 +319,7 @@ TEST_F(OpenedWindowTest, TellsHowFarTheReadingIs)
     window.applicationDidFinishLaunching();
     EXPECT_EQ(statusText(root()), "Reading drive.pcap: 0 messages");
     EXPECT_TRUE(isSpinning(root()));
-    EXPECT_EQ(window.window()->windowTitle().toStdString(), "Ventrik – drive.pcap");
+    EXPECT_EQ(window.window()->windowTitle().toStdString(), "Ventrik – drive.pcap – LTE");
 }
 
 TEST_F(OpenedWindowTest, ShowsTheCapturesEndWithoutAService)
@@ -325,6 +356,45 @@ TEST_F(OpenedWindowTest, ShowsWhatStandsWhereTheHistoryHasNoChangeLeft)
     ASSERT_FALSE(store.isEmpty());
     ASSERT_EQ(store.firstMoment(), store.present());
     EXPECT_EQ(*small.nodeAtPath("/Cell/PCI")->value(), "302");
+}
+
+TEST_F(OpenedWindowTest, AMomentThatWasChosenStaysWhileItIsRead)
+{
+    const auto source = std::make_shared<TwoTurns>(fake);
+    VentrikApp read(fake.platform(), optionsOf(source));
+    source->turns = 3;
+    source->before = [&](int turn) {
+        fake.clock.advance(1s);
+        if (turn == 3)
+            read.timeLine().showTime(read.timeLine().store().firstTime());
+    };
+    read.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    EXPECT_EQ(*read.nodeAtPath("/Cell/PCI")->value(), "301");
+    read.goLive();
+    EXPECT_EQ(*read.nodeAtPath("/Cell/PCI")->value(), "303");
+}
+
+TEST_F(OpenedWindowTest, TellsWhatTheHistoryHasNotKept)
+{
+    VentrikAppOptions options =
+        optionsOf(std::make_shared<TwoTurns>(fake, std::string(40000, 'x')));
+    options.historyLimits.bytes = 16384;
+    VentrikApp small(fake.platform(), options);
+    small.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    EXPECT_EQ(small.statusNote().text, "it ends too early; what was before 2026-11-16 06:12:28 is "
+                                       "gone: --history keeps more");
+}
+
+TEST_F(OpenedWindowTest, AWindowThatGrowsShowsTheTimeLine)
+{
+    window.applicationDidFinishLaunching();
+    fake.mainQueue.run();
+    window.window()->resize(1000, 640);
+    QTest::qWait(0);
+    EXPECT_EQ(window.timeLineView()->findChild<QLabel*>()->text(), "at 2026-11-16 06:12:28");
+    EXPECT_GT(window.timeLineView()->events().list().model()->rowCount(), 0);
 }
 
 TEST_F(OpenedWindowTest, SavesNothingAndHasNoChannel)
@@ -611,6 +681,28 @@ TEST_F(TimeLineWindowTest, AnEventThatTheHistoryHasNoMoreLeadsToItsBeginning)
     ASSERT_LT(oldest.time, begin);
     window->timeLine().showEvent(oldest);
     EXPECT_EQ(window->timeLine().pausedAt(), begin);
+}
+
+TEST_F(TimeLineWindowTest, ALostChannelIsAnEventAtOnce)
+{
+    launch(900);
+    loseService();
+    fake.mainQueue.advance(4s); // the model finds out
+    EXPECT_EQ(window->timeLine().events().events().back().kind, EventKind::Channel);
+}
+
+TEST_F(TimeLineWindowTest, SpacePausesFromTheListsAsWell)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    for (QWidget* list : {static_cast<QWidget*>(&window->timeLineView()->cells()),
+                          static_cast<QWidget*>(&window->timeLineView()->events())}) {
+        list->setFocus();
+        press(Qt::Key_Space);
+        EXPECT_TRUE(window->timeLine().isPaused());
+        press(Qt::Key_Home);
+        EXPECT_FALSE(window->timeLine().isPaused());
+    }
 }
 
 TEST_F(TimeLineWindowTest, TheBarIsNotLiveWhileTheChannelIsLost)

@@ -340,6 +340,7 @@ TEST_F(WindowProcess, RefusesWhatIsWrong)
                               {"--demo", "lte", "--replay", "x"},
                               {"--demo", "lte", "--open", "x"},
                               {"--open", "x", "--record", "y"},
+                              {"--open", "-"},
                               {"--serial", "/dev/null"},
                               {"--technology", "lte"},
                               {"--speed", "2"},

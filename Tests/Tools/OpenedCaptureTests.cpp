@@ -10,6 +10,8 @@
 
 #include <gmock/gmock.h>
 
+#include <sys/stat.h>
+
 namespace ventrik
 {
 
@@ -142,6 +144,13 @@ TEST_F(OpenedCaptureTest, EndsAtAMessageThatCannotBe)
     readAll(*opened);
     EXPECT_EQ(observer.messages, 0);
     EXPECT_THAT(opened->fault(), HasSubstr("message 0: "));
+}
+
+TEST_F(OpenedCaptureTest, ReadsNothingThatItWouldHaveToWaitFor)
+{
+    ASSERT_EQ(::mkfifo(file.path().c_str(), 0600), 0);
+    EXPECT_EQ(OpenedCapture::open({file.path()}, fake.platform(), error), nullptr);
+    EXPECT_EQ(error, file.path() + ": it is no file");
 }
 
 } // namespace ventrik

@@ -74,6 +74,7 @@ std::vector<Event> TimeLine::update()
 {
     usePins();
     _series.update();
+    ++_version;
     _newest = nullptr;
     return _events.update();
 }
@@ -85,16 +86,23 @@ void TimeLine::usePins()
     if (technology == _technology)
         return;
     _technology = technology;
-    _pins = defaultPins(technology);
+    std::vector<Pin> pins = defaultPins(technology);
     if (const auto kept = _preferences.text(preferenceDomain, pinsKey(_technology))) {
-        const std::vector<Pin> defaults = std::exchange(_pins, {});
+        const std::vector<Pin> defaults = std::exchange(pins, {});
         std::istringstream lines(*kept);
         for (std::string path; std::getline(lines, path);) {
             const auto known = std::ranges::find(defaults, path, &Pin::path);
-            _pins.push_back(known == defaults.end() ? Pin::of(path) : *known);
+            pins.push_back(known == defaults.end() ? Pin::of(path) : *known);
         }
     }
+    setPins(std::move(pins));
+}
+
+void TimeLine::setPins(std::vector<Pin> pins)
+{
+    _pins = std::move(pins);
     _series.setPins(_pins);
+    ++_version;
 }
 
 void TimeLine::keepPins() const
@@ -121,13 +129,20 @@ bool TimeLine::isPinned(const std::string& path) const
 
 void TimeLine::togglePin(const std::string& path)
 {
+    std::vector<Pin> pins = _pins;
     if (isPinned(path))
-        std::erase_if(_pins, [&](const Pin& pin) { return pin.path == path; });
+        std::erase_if(pins, [&](const Pin& pin) { return pin.path == path; });
     else if (canPin(path))
-        _pins.push_back(Pin::of(path));
+        pins.push_back(Pin::of(path));
     else
         return;
-    _series.setPins(_pins);
+    setPins(std::move(pins));
+    keepPins();
+}
+
+void TimeLine::resetPins()
+{
+    setPins(defaultPins(_technology));
     keepPins();
 }
 

@@ -56,6 +56,8 @@ class TimeLine
 
     /// Takes what is new in the store, and tells what happened.
     std::vector<Event> update();
+    /// Another number when series or events may be others.
+    std::uint64_t version() const { return _version; }
     /// The display as it is shown: that of the pause, or as it was at the last update.
     DisplayMoment& shown();
     const ChangeStore& store() const { return _store; }
@@ -67,11 +69,15 @@ class TimeLine
     bool isPinned(const std::string& path) const;
     /// Draws the value there from now on, or no more. Kept as a preference of the technology.
     void togglePin(const std::string& path);
+    const std::vector<Pin>& pins() const { return _pins; }
+    /// Draws what is drawn from the start.
+    void resetPins();
 
   private:
     void showMoment(std::uint64_t moment, Clock::TimePoint time);
 
     void usePins();
+    void setPins(std::vector<Pin> pins);
     void keepPins() const;
 
     const ChangeStore& _store;
@@ -80,6 +86,7 @@ class TimeLine
     PinnedSeries _series;
     EventLog _events;
     std::vector<Pin> _pins;
+    std::uint64_t _version = 0;
     std::string _technology; // whose pins these are
     std::function<void()> _momentChanged;
     std::unique_ptr<DisplayMoment> _past;

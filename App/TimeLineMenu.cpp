@@ -3,6 +3,7 @@
 #include "App/StoredRows.h"
 #include "App/Strip/SignalStrip.h"
 #include "App/Toolkit/Alert.h"
+#include "App/Toolkit/PlainText.h"
 #include "Files/PrivateFile.h"
 
 #include <QFileDialog>
@@ -50,7 +51,12 @@ QString textOfKeys()
 
 TimeLineMenu::TimeLineMenu(TimeLine& timeLine, const Clock& clock, SignalStrip& strip,
                            QWidget* parent)
-    : QMenu(parent), _timeLine(timeLine), _clock(clock), _strip(strip), _names(clock)
+    : QMenu(parent),
+      _timeLine(timeLine),
+      _clock(clock),
+      _strip(strip),
+      _names(clock),
+      _pins(new QMenu(QStringLiteral("Pinned"), this))
 {
     setAccessibleName(QStringLiteral("More"));
     _names.setDateFormat(QStringLiteral("'ventrik-'yyyy-MM-dd-HHmmss"));
@@ -63,6 +69,8 @@ TimeLineMenu::TimeLineMenu(TimeLine& timeLine, const Clock& clock, SignalStrip& 
     addSeparator();
     connect(addAction(QStringLiteral("Show All")), &QAction::triggered, this,
             [this] { _strip.fit(); });
+    connect(_pins, &QMenu::aboutToShow, this, [this] { listPins(); });
+    addMenu(_pins);
     connect(addAction(QStringLiteral("Keys")), &QAction::triggered, this, [this] { showKeys(); });
 }
 
@@ -146,6 +154,33 @@ bool TimeLineMenu::saveValues(const std::string& path, std::string& error) const
         file->write(block);
     });
     return file->commit(error);
+}
+
+// Also what no row shows now, such as the best of a list.
+void TimeLineMenu::listPins()
+{
+    _pins->clear();
+    for (const Pin& pin : _timeLine.pins()) {
+        QString text = oneLine(QString::fromStdString(pin.name + "  " + pin.path));
+        QAction* action = _pins->addAction(text.replace(QLatin1Char('&'), QLatin1String("&&")));
+        action->setCheckable(true);
+        action->setChecked(true);
+        connect(action, &QAction::triggered, this, [this, path = pin.path] {
+            _timeLine.togglePin(path);
+            tellOfPins();
+        });
+    }
+    _pins->addSeparator();
+    connect(_pins->addAction(QStringLiteral("As at First")), &QAction::triggered, this, [this] {
+        _timeLine.resetPins();
+        tellOfPins();
+    });
+}
+
+void TimeLineMenu::tellOfPins() const
+{
+    if (_onPins)
+        _onPins();
 }
 
 void TimeLineMenu::showKeys()

@@ -17,7 +17,7 @@ namespace ventrik
 class SignalStrip;
 
 /// What can be done with the time line: its picture, its drawing and its values as files of one's
-/// own, the whole range at once, and the keys.
+/// own, the whole range at once, what is pinned, and the keys.
 class TimeLineMenu : public QMenu
 {
   public:
@@ -26,6 +26,8 @@ class TimeLineMenu : public QMenu
 
     /// Called with the name of a file that was written.
     void setOnSaved(std::function<void(const std::string& fileName)> onSaved);
+    /// Called when other values are pinned.
+    void setOnPins(std::function<void()> onPins) { _onPins = std::move(onPins); }
     /// What the rows of values name as their capture; "live" as long as nothing else is said.
     void setCaptureName(std::string name) { _captureName = std::move(name); }
     /// Opens below the widget, with the first entry chosen.
@@ -42,6 +44,8 @@ class TimeLineMenu : public QMenu
     bool saveDrawing(const std::string& path, std::string& error) const;
     bool saveValues(const std::string& path, std::string& error) const;
     void showKeys();
+    void listPins();
+    void tellOfPins() const;
     std::string proposedName() const;
 
     TimeLine& _timeLine;
@@ -50,6 +54,8 @@ class TimeLineMenu : public QMenu
     DateFormatter _names;
     std::string _captureName = "live";
     std::function<void(const std::string&)> _onSaved;
+    QMenu* _pins;
+    std::function<void()> _onPins;
 };
 
 } // namespace ventrik

@@ -47,6 +47,15 @@ class TimeLineBar : public QWidget
     }
 };
 
+// The series go on while nothing of this is seen.
+std::vector<std::vector<SeriesPoint>> pointsOf(const PinnedSeries& series)
+{
+    std::vector<std::vector<SeriesPoint>> points;
+    for (const PinnedSeries::Series& one : series.series())
+        points.push_back(one.points);
+    return points;
+}
+
 } // namespace
 
 TimeLineView::TimeLineView(TimeLine& timeLine, const Clock& clock)
@@ -141,6 +150,7 @@ void TimeLineView::setListener(TimeLineListener listener)
         if (_listener.onSaved)
             _listener.onSaved(fileName);
     });
+    _menu->setOnPins([this] { update(); });
     _events->setOnEvent([this](const Event& event) { _timeLine.showEvent(event); });
     _strip->setListener({[this](Clock::TimePoint time) { _timeLine.showTime(time); },
                          [this] {
@@ -167,26 +177,34 @@ void TimeLineView::update()
     _events->setEvents(_timeLine.events());
 }
 
+// A dragged cursor asks often, and there may be millions of points.
 void TimeLineView::updateStrip()
 {
+    const bool isNew = _version != _timeLine.version();
+    if (isNew || _end != _timeLine.end()) {
+        _end = _timeLine.end();
+        const auto former = isNew ? std::exchange(_points, pointsOf(_timeLine.series()))
+                                  : std::vector<std::vector<SeriesPoint>>();
+        _strip->setSecondsFromUtc(_clock.timeZone(_end).secondsFromUtc);
+        _strip->setData(stripData()); // the former points are shown until then
+        _version = _timeLine.version();
+    }
+    _strip->setCursor(_timeLine.pausedAt());
+}
+
+StripData TimeLineView::stripData() const
+{
     StripData shown;
-    // The series go on while nothing of this is seen.
-    std::vector<std::vector<SeriesPoint>> points;
-    for (const PinnedSeries::Series& series : _timeLine.series().series())
-        points.push_back(series.points);
-    for (std::size_t i = 0; i < points.size(); ++i) {
+    for (std::size_t i = 0; i < _points.size(); ++i) {
         const PinnedSeries::Series& series = _timeLine.series().series()[i];
-        shown.lines.push_back({series.pin.name, series.unit, points[i]});
+        shown.lines.push_back({series.pin.name, series.unit, _points[i]});
     }
     for (const Event& event : _timeLine.events().events())
         if (event.isMark)
             shown.marks.push_back({event.time, event.text, event.kind == EventKind::RRC});
-    shown.last = _timeLine.end();
-    shown.first = _timeLine.store().isEmpty() ? shown.last : _timeLine.store().firstTime();
-    _strip->setSecondsFromUtc(_clock.timeZone(shown.last).secondsFromUtc);
-    _strip->setData(std::move(shown));
-    _points = std::move(points);
-    _strip->setCursor(_timeLine.pausedAt());
+    shown.last = _end;
+    shown.first = _timeLine.store().isEmpty() ? _end : _timeLine.store().firstTime();
+    return shown;
 }
 
 } // namespace ventrik

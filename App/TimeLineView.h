@@ -4,7 +4,9 @@
 
 #include <QWidget>
 
+#include <cstdint>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -19,6 +21,7 @@ class CellsView;
 class EventsView;
 class SignalStrip;
 class TimeLineMenu;
+struct StripData;
 
 /// What the time line's view tells its owner.
 struct TimeLineListener {
@@ -59,6 +62,7 @@ class TimeLineView : public QWidget
     QWidget* makeLists();
     void layOutLists();
     void updateStrip();
+    StripData stripData() const;
 
     TimeLine& _timeLine;
     const Clock& _clock;
@@ -67,6 +71,8 @@ class TimeLineView : public QWidget
     QPushButton* _pause;
     QPushButton* _menuButton;
     std::vector<std::vector<SeriesPoint>> _points; // that the strip shows
+    std::optional<std::uint64_t> _version;         // of what it shows
+    Clock::TimePoint _end;
     SignalStrip* _strip;
     TimeLineMenu* _menu;
     CellsView* _cells;

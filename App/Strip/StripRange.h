@@ -15,7 +15,7 @@ class StripRange
   public:
     using Duration = std::chrono::nanoseconds;
     static constexpr Duration shortest = std::chrono::seconds(1);
-    static constexpr Duration longest = std::chrono::hours(48);
+    static constexpr Duration longest = std::chrono::days(366);
     static constexpr Duration shortestAtFirst = std::chrono::minutes(1);
     static constexpr Duration longestAtFirst = std::chrono::minutes(5);
 

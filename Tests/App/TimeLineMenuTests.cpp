@@ -71,6 +71,22 @@ class TimeLineMenuTest : public AppFixture
                 return action->trigger();
         FAIL() << entry;
     }
+    QMenu& pins()
+    {
+        for (QAction* action : menu().actions())
+            if (action->menu()) {
+                emit action->menu()->aboutToShow();
+                return *action->menu();
+            }
+        throw std::logic_error("no menu of pins");
+    }
+    std::vector<std::string> lines()
+    {
+        std::vector<std::string> names;
+        for (const auto& series : window.timeLine().series().series())
+            names.push_back(series.pin.name);
+        return names;
+    }
     /// The dialog of an entry; null where there is none.
     QFileDialog* dialogOf(const char* entry)
     {
@@ -125,8 +141,8 @@ TEST_F(TimeLineMenuTest, OpensByItsButtonAndIsWalkedByKeys)
 
 TEST_F(TimeLineMenuTest, OffersFilesTheWholeRangeAndTheKeys)
 {
-    EXPECT_THAT(entries(),
-                ElementsAre("Save Picture…", "Save Drawing…", "Save Values…", "Show All", "Keys"));
+    EXPECT_THAT(entries(), ElementsAre("Save Picture…", "Save Drawing…", "Save Values…", "Show All",
+                                       "Pinned", "Keys"));
 }
 
 TEST_F(TimeLineMenuTest, ProposesANameOfThePresentTime)
@@ -232,6 +248,31 @@ TEST_F(TimeLineMenuTest, ShowsTheWholeRange)
     EXPECT_EQ(strip.shownRange().second - strip.shownRange().first, 5min);
     choose("Show All");
     EXPECT_GE(strip.shownRange().second - strip.shownRange().first, 1h);
+}
+
+TEST_F(TimeLineMenuTest, ListsWhatIsPinned)
+{
+    QAction& first = *pins().actions().front();
+    EXPECT_EQ(first.text(), "RSRP  /Serving Cell Measurements/Measured RSRP");
+    EXPECT_TRUE(first.isChecked());
+}
+
+TEST_F(TimeLineMenuTest, UnpinsTheBestOfAListWhichNoRowShows)
+{
+    ASSERT_THAT(lines(), testing::Contains("Best neighbor RSRP"));
+    for (QAction* action : pins().actions())
+        if (action->text().startsWith("Best neighbor RSRP"))
+            action->trigger();
+    EXPECT_THAT(lines(), testing::Not(testing::Contains("Best neighbor RSRP")));
+}
+
+TEST_F(TimeLineMenuTest, PinsAgainWhatIsPinnedFromTheStart)
+{
+    const auto before = lines();
+    pins().actions().front()->trigger();
+    ASSERT_NE(lines(), before);
+    pins().actions().back()->trigger();
+    EXPECT_EQ(lines(), before);
 }
 
 TEST_F(TimeLineMenuTest, ListsTheKeys)

@@ -14,7 +14,7 @@ class CellBar : public QStyledItemDelegate
 {
   public:
     /// A column with bars has room for one of that length, and the gap beside it.
-    static constexpr int shortestBar = 42;
+    static constexpr int shortestBar = 32;
 
     using QStyledItemDelegate::QStyledItemDelegate;
 

@@ -148,7 +148,7 @@ TEST_F(CellsViewTest, DropsTheLeastImportantColumnsWhereThereIsLittleRoom)
     view.setCells(lteCells());
     EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "RSRP dBm"));
     show(450);
-    EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "Channel", "Band", "RSRP dBm"));
+    EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "Channel", "RSRP dBm", "RSRQ dB"));
     show(80);
     EXPECT_THAT(shownColumns(), ElementsAre("Kind", "PCI", "RSRP dBm"));
     EXPECT_GT(view.table().horizontalScrollBar()->maximum(), 0);

@@ -9,6 +9,8 @@
 #include "Tests/Support/IdleGenerator.h"
 
 #include <QApplication>
+#include <QDir>
+#include <QFile>
 #include <QLabel>
 #include <QListView>
 #include <QMenu>
@@ -206,6 +208,12 @@ TEST_F(PauseTest, ThePresentIsSavedAllTheSame)
     ASSERT_NE(app.saveViewController(), nullptr);
     press(Qt::Key_Space); // goes into the description
     EXPECT_TRUE(app.timeLine().isPaused());
+    app.saveViewController()->savePressed();
+    const QStringList files = QDir(temporary.path()).entryList({QStringLiteral("*.ventrik")});
+    ASSERT_EQ(files.size(), 1);
+    QFile file(temporary.filePath(files.front()));
+    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
+    EXPECT_TRUE(file.readAll().contains("303"));
 }
 
 TEST_F(PauseTest, NothingIsPausedBeforeAnythingCame)
@@ -579,6 +587,9 @@ TEST_F(TimeLineWindowTest, OutlivesTheEndOfTheApplicationInEitherPlace)
 {
     launch(480);
     press(Qt::Key_T, Qt::ControlModifier);
+    window->applicationWillTerminate();
+    EXPECT_EQ(window->timeLineView(), nullptr);
+    launch(900);
     window->applicationWillTerminate();
     EXPECT_EQ(window->timeLineView(), nullptr);
 }

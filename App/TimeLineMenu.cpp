@@ -47,6 +47,15 @@ QString textOfKeys()
     return text + QStringLiteral("</table>");
 }
 
+bool writeFile(const std::string& path, std::string_view content, std::string& error)
+{
+    auto file = PrivateFile::create(path, error);
+    if (!file)
+        return false;
+    file->write(content);
+    return file->commit(error);
+}
+
 } // namespace
 
 TimeLineMenu::TimeLineMenu(TimeLine& timeLine, const Clock& clock, SignalStrip& strip,
@@ -132,16 +141,13 @@ void TimeLineMenu::save(const std::string& path, Writer writer)
 
 bool TimeLineMenu::savePicture(const std::string& path, std::string& error) const
 {
-    return _strip.savePng(path, error);
+    const QByteArray png = _strip.png();
+    return writeFile(path, {png.constData(), static_cast<std::size_t>(png.size())}, error);
 }
 
 bool TimeLineMenu::saveDrawing(const std::string& path, std::string& error) const
 {
-    auto file = PrivateFile::create(path, error);
-    if (!file)
-        return false;
-    file->write(_strip.svg());
-    return file->commit(error);
+    return writeFile(path, _strip.svg(), error);
 }
 
 bool TimeLineMenu::saveValues(const std::string& path, std::string& error) const

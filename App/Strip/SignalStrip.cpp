@@ -6,12 +6,11 @@
 #include "Charts/ChartTexts.h"
 #include "Charts/SvgCanvas.h"
 
+#include <QBuffer>
 #include <QEvent>
-#include <QFile>
 #include <QFocusEvent>
 #include <QImage>
 #include <QPainter>
-#include <QSaveFile>
 
 #include <fmt/format.h>
 
@@ -102,14 +101,21 @@ void SignalStrip::showAnew()
 const SignalChart& SignalStrip::chart() const
 {
     if (!_chart)
-        _chart.emplace(ChartContent{_data.lines, _data.marks, _range.first(), _range.last(),
-                                    _cursor, _secondCursor},
-                       ChartLooks{.palette = chartPalette(),
-                                  .bands = _bands,
-                                  .secondsFromUtc = _secondsFromUtc,
-                                  .textSize = width() >= 800 ? 12.0 : 11.0},
-                       width(), height(), FontMeasure());
+        _chart.emplace(chartContent(), chartLooks(), width(), height(), FontMeasure());
     return *_chart;
+}
+
+ChartContent SignalStrip::chartContent() const
+{
+    return {_data.lines, _data.marks, _range.first(), _range.last(), _cursor, _secondCursor};
+}
+
+ChartLooks SignalStrip::chartLooks() const
+{
+    return {.palette = chartPalette(),
+            .bands = _bands,
+            .secondsFromUtc = _secondsFromUtc,
+            .textSize = width() >= 800 ? 12.0 : 11.0};
 }
 
 // What the desktop decides of the colors, it decides for the chart as well.
@@ -185,7 +191,7 @@ void SignalStrip::focusOutEvent(QFocusEvent*)
     update();
 }
 
-bool SignalStrip::savePng(const std::string& path, std::string& error) const
+QByteArray SignalStrip::png() const
 {
     QImage image(size() * devicePixelRatioF(), QImage::Format_RGB32);
     image.setDevicePixelRatio(devicePixelRatioF());
@@ -194,26 +200,15 @@ bool SignalStrip::savePng(const std::string& path, std::string& error) const
         PainterCanvas canvas(painter, size());
         chart().draw(canvas);
     }
-    QSaveFile file(QString::fromStdString(path));
-    const bool isWritten = file.open(QIODevice::WriteOnly) &&
-                           file.setPermissions(QFile::ReadOwner | QFile::WriteOwner) &&
-                           image.save(&file, "PNG") && file.commit();
-    if (!isWritten)
-        error = fmt::format("Cannot write {}: {}", path, file.errorString().toStdString());
-    return isWritten;
+    QBuffer bytes;
+    image.save(&bytes, "PNG");
+    return bytes.data();
 }
 
 std::string SignalStrip::svg() const
 {
     SvgCanvas canvas(width(), height(), "Signals: " + accessibleDescription().toStdString());
-    const SignalChart drawn(ChartContent{_data.lines, _data.marks, _range.first(), _range.last(),
-                                         _cursor, _secondCursor},
-                            ChartLooks{.palette = chartPalette(),
-                                       .bands = _bands,
-                                       .secondsFromUtc = _secondsFromUtc,
-                                       .textSize = width() >= 800 ? 12.0 : 11.0},
-                            width(), height(), canvas);
-    drawn.draw(canvas);
+    SignalChart(chartContent(), chartLooks(), width(), height(), canvas).draw(canvas);
     return canvas.document();
 }
 

@@ -58,9 +58,8 @@ class SignalStrip : public QWidget
     std::pair<Clock::TimePoint, Clock::TimePoint> shownRange() const;
     bool isFollowing() const { return _range.isFollowing(); }
 
-    /// Writes what is shown, at its size, as a file that only its owner may read. When that fails,
-    /// `error` says why in one line, and a file that was there stays.
-    bool savePng(const std::string& path, std::string& error) const;
+    /// What is shown, at its size, as a file's content.
+    QByteArray png() const;
     std::string svg() const;
 
     /// What a line tells without a picture: the value at the cursor, or now, and the least and the
@@ -101,6 +100,8 @@ class SignalStrip : public QWidget
 
     const SignalChart& chart() const;
     ChartPalette chartPalette() const;
+    ChartContent chartContent() const;
+    ChartLooks chartLooks() const;
     void showAnew();
     void tellMeaning();
     bool hasData() const;

@@ -164,6 +164,14 @@ TEST_F(TimeLineMenuTest, SavesAPicture)
     EXPECT_EQ(image.width(), window.timeLineView()->strip().width());
 }
 
+TEST_F(TimeLineMenuTest, WhatItSavesIsPrivate)
+{
+    save("Save Picture…", pathOf("strip.png"));
+    EXPECT_EQ(QFile::permissions(QString::fromStdString(pathOf("strip.png"))) &
+                  (QFile::ReadGroup | QFile::ReadOther | QFile::WriteOther),
+              QFile::Permissions());
+}
+
 TEST_F(TimeLineMenuTest, SavesADrawing)
 {
     save("Save Drawing…", pathOf("signals.svg"));

@@ -23,9 +23,6 @@ struct ChartMark {
     bool isMinor = false; ///< the first to give way where there are many
 };
 
-/// For how long a value is held good that has not been told again.
-inline constexpr std::chrono::seconds longestHold{10};
-
 /// Whether a line leads from the one point to the next one.
 bool leadsOn(const SeriesPoint& point, const SeriesPoint& next);
 

@@ -25,8 +25,13 @@ void takeNumber(std::vector<SeriesPoint>& points, Clock::TimePoint time,
 
 void hearAgain(std::vector<SeriesPoint>& points, Clock::TimePoint time)
 {
-    if (!points.empty() && !points.back().isEnd)
-        points.back().until = std::max(points.back().until, time);
+    if (points.empty() || points.back().isEnd)
+        return;
+    SeriesPoint& last = points.back();
+    if (time - last.until > longestHold)
+        points.push_back({time, time, last.value});
+    else
+        last.until = std::max(last.until, time);
 }
 
 } // namespace ventrik

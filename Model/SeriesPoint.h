@@ -2,11 +2,15 @@
 
 #include "Platform/Clock.h"
 
+#include <chrono>
 #include <optional>
 #include <vector>
 
 namespace ventrik
 {
+
+/// For how long a value is held good that has not been told again.
+inline constexpr std::chrono::seconds longestHold{10};
 
 /// A number that stood for a while: from when it came until it was last told again.
 struct SeriesPoint {
@@ -20,7 +24,7 @@ struct SeriesPoint {
 /// several numbers at one time the last one stays.
 void takeNumber(std::vector<SeriesPoint>& points, Clock::TimePoint time,
                 std::optional<double> number);
-/// What stands was told again then.
+/// What stands was told again then: it goes on, or begins anew where it was not held good so long.
 void hearAgain(std::vector<SeriesPoint>& points, Clock::TimePoint time);
 
 } // namespace ventrik

@@ -1,5 +1,7 @@
 #include "Report/NumberSeries.h"
 
+#include <algorithm>
+
 namespace ventrik
 {
 
@@ -31,7 +33,31 @@ void NumberSeries::changed(const StoredChange& change)
 
 void NumberSeries::heard(Clock::TimePoint time, std::uint32_t logCode)
 {
-    _heard[logCode] = time;
+    const auto [known, isFirst] = _heard.emplace(logCode, time);
+    if (!isFirst && time - known->second > longestHold)
+        beginBehindGap(logCode, time);
+    known->second = time;
+}
+
+// Only here the lines of all places are gone through: else what is heard can wait for `settle`.
+void NumberSeries::beginBehindGap(std::uint32_t logCode, Clock::TimePoint time)
+{
+    for (std::size_t line = 0; line < _lines.size(); ++line) {
+        if (_codes[line] != logCode)
+            continue;
+        settle(line);
+        hear(_lines[line].points, time);
+    }
+}
+
+void NumberSeries::hear(std::vector<SeriesPoint>& points, Clock::TimePoint time)
+{
+    const std::size_t before = points.size();
+    if (_pointsBehindGaps < mostBehindGaps)
+        hearAgain(points, time);
+    else if (!points.empty())
+        points.back().isEnd = true;
+    _pointsBehindGaps += points.size() - before;
 }
 
 void NumberSeries::take(PlaceId place, const StoredChange& change)
@@ -55,11 +81,13 @@ void NumberSeries::take(PlaceId place, const StoredChange& change)
     takeNumber(line.points, change.time, change.value.number);
 }
 
-// What its record told again before another one changes it.
+// What its record told again, without a gap, before another one changes it.
 void NumberSeries::settle(std::size_t line)
 {
-    if (const auto last = _heard.find(_codes[line]); last != _heard.end())
-        hearAgain(_lines[line].points, last->second);
+    std::vector<SeriesPoint>& points = _lines[line].points;
+    const auto last = _heard.find(_codes[line]);
+    if (last != _heard.end() && !points.empty() && !points.back().isEnd)
+        points.back().until = std::max(points.back().until, last->second);
 }
 
 } // namespace ventrik

@@ -25,6 +25,10 @@ struct NumberLine {
 class NumberSeries : private StoreVisitor
 {
   public:
+    /// So many points only say that a number came again behind a gap. One record can tell of
+    /// thousands of numbers, and come again and again: behind more gaps none shows.
+    static constexpr std::size_t mostBehindGaps = 500000;
+
     explicit NumberSeries(const ChangeStore& store);
 
     /// In the order in which they came first.
@@ -37,12 +41,15 @@ class NumberSeries : private StoreVisitor
     void heard(Clock::TimePoint time, std::uint32_t logCode) override;
     void take(PlaceId place, const StoredChange& change);
     void settle(std::size_t line);
+    void beginBehindGap(std::uint32_t logCode, Clock::TimePoint time);
+    void hear(std::vector<SeriesPoint>& points, Clock::TimePoint time);
 
     const PlaceTable& _places;
     std::vector<NumberLine> _lines;
     std::vector<std::uint32_t> _codes;                // of each line's last change
     std::vector<std::uint32_t> _lineAt;               // by place
     std::map<std::uint32_t, Clock::TimePoint> _heard; // last, by code
+    std::size_t _pointsBehindGaps = 0;
 };
 
 } // namespace ventrik

@@ -85,6 +85,25 @@ TEST_F(PinnedSeriesTest, StandsOnlyUntilItWasToldLast)
     EXPECT_THAT(points(), ElementsAre("0-0: 1", "21-21: 2"));
 }
 
+TEST_F(PinnedSeriesTest, HasAGapBeforeTheSameValueThatIsToldAgainLater)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("-62")}});
+    time += 600s;
+    show(PlistDictionary{{"Cell", level("-62")}});
+    show(PlistDictionary{{"Cell", level("-62")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: -62", "601-602: -62"));
+}
+
+TEST_F(PinnedSeriesTest, HoldsAValueGoodForTenSeconds)
+{
+    series.setPins({Pin::of("/Cell/Level")});
+    show(PlistDictionary{{"Cell", level("-62")}});
+    time += 9s;
+    show(PlistDictionary{{"Cell", level("-62")}});
+    EXPECT_THAT(points(), ElementsAre("0-10: -62"));
+}
+
 TEST_F(PinnedSeriesTest, TakesWhatIsNewEachTime)
 {
     series.setPins({Pin::of("/Cell/Level")});

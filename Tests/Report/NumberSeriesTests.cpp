@@ -64,6 +64,45 @@ TEST_F(NumberSeriesTest, StandsUntilItWasToldLast)
     EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 1: 0-2 -70 32-32 -80"));
 }
 
+TEST_F(NumberSeriesTest, GoesOnForAsLongAsItIsToldAgainWithoutAGap)
+{
+    for (int i = 0; i < 30; ++i)
+        show(cell("-70 dBm"));
+    EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 0: 0-29 -70"));
+}
+
+TEST_F(NumberSeriesTest, HasAGapBeforeTheSameValueThatIsToldAgainLater)
+{
+    show(cell("-62 dBm"));
+    show(cell("-62 dBm"));
+    show(cell("-62 dBm"), 600s);
+    show(cell("-62 dBm"));
+    EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 0: 0-1 -62 601-602 -62"));
+}
+
+TEST_F(NumberSeriesTest, HasAGapBeforeAnotherValueThatTheSameCameBefore)
+{
+    show(cell("-62 dBm"));
+    show(cell("-62 dBm"), 600s);
+    show(cell("-70 dBm"));
+    EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 1: 0-0 -62 600-600 -62 601-601 -70"));
+}
+
+TEST_F(NumberSeriesTest, HasNoMorePointsBehindGapsThanItMay)
+{
+    constexpr std::size_t numbers = 1000;
+    PlistDictionary display;
+    for (std::size_t i = 0; i < numbers; ++i)
+        display.set(fmt::format("{}", i), "1");
+    for (std::size_t i = 0; i < NumberSeries::mostBehindGaps / numbers + 50; ++i)
+        show(display, 60s);
+    std::size_t points = 0;
+    const NumberSeries series(store);
+    for (const NumberLine& line : series.lines())
+        points += line.points.size();
+    EXPECT_EQ(points, numbers + NumberSeries::mostBehindGaps);
+}
+
 TEST_F(NumberSeriesTest, EndsWithTheGroupThatHeldIt)
 {
     show(cell("-70 dBm"));

@@ -316,7 +316,7 @@ void DisplayChanges::compareValue(DisplayGroup::Entry& entry, const PlistValue& 
     if (!isNew && !entry.group && entry.place->text == text)
         return;
     if (entry.group) {
-        add(DisplayChange::Kind::Gone, *entry.place);
+        goBeforeAnotherKind(*entry.place);
         release(*std::exchange(entry.group, nullptr));
     }
     keepText(entry.place->text, text);
@@ -331,7 +331,7 @@ void DisplayChanges::compareContainer(DisplayGroup::Entry& entry, const PlistVal
         return; // it tells by itself that it changes
     if (!isSameKind) {
         if (!isNew)
-            add(DisplayChange::Kind::Gone, *entry.place);
+            goBeforeAnotherKind(*entry.place);
         if (entry.group)
             release(*entry.group);
         entry.place->text.clear();
@@ -343,6 +343,14 @@ void DisplayChanges::compareContainer(DisplayGroup::Entry& entry, const PlistVal
     compare(group);
     if (!isSameKind && _changes.size() == before)
         add(DisplayChange::Kind::Empty, *group.place);
+}
+
+// What goes and comes again would stand at the end.
+void DisplayChanges::goBeforeAnotherKind(const DisplayPlace& place)
+{
+    add(DisplayChange::Kind::Gone, place);
+    if (!place.isSorted)
+        _isReordered = true;
 }
 
 void DisplayChanges::follow(DisplayGroup& group, const PlistValue& container)

@@ -91,8 +91,8 @@ class DisplayChanges
     /// What has changed in the state's display since the last time; all of it the first time.
     std::span<const DisplayChange> take(const PlistDictionary& state);
 
-    /// Whether a dictionary that does not show its keys in their order has got another order of
-    /// them than by what came at its end and what went, since it was last asked.
+    /// Whether what stands in the order of its container has got another one than the changes
+    /// tell, by what came at its end and what went, since it was last asked.
     bool takeReordered() { return std::exchange(_isReordered, false); }
     /// All places, in the order of the display, holders before what they hold. They live until the
     /// next changes are taken.
@@ -122,6 +122,7 @@ class DisplayChanges
     void noteOrder(const std::vector<DisplayGroup::Entry>& former, const DisplayGroup& group);
     void compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void compareContainer(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
+    void goBeforeAnotherKind(const DisplayPlace& place);
     void follow(DisplayGroup& group, const PlistValue& container);
     bool isFollowed(const DisplayGroup& group, const PlistValue& container) const;
     DisplayGroup& newGroup(const DisplayPlace* place);

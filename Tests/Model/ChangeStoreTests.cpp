@@ -168,6 +168,25 @@ TEST_F(ChangeStoreTest, ShowsAValueThatBecameAGroupAndBack)
     EXPECT_EQ(treeAt(2s), "Ventrik\n  a: 3\n");
 }
 
+TEST_F(ChangeStoreTest, KeepsAKeysPlaceWhereItsValueBecomesAGroupAndBack)
+{
+    show(PlistDictionary{{"a", "1"}, {"b", "2"}});
+    show(PlistDictionary{{"a", PlistDictionary{{"x", "3"}}}, {"b", "2"}});
+    show(PlistDictionary{{"a", "1"}, {"b", "2"}});
+    EXPECT_EQ(treeAt(1s), "Ventrik\n  a\n    x: 3\n  b: 2\n");
+    EXPECT_EQ(treeAt(2s), "Ventrik\n  a: 1\n  b: 2\n");
+}
+
+TEST_F(ChangeStoreTest, KeepsAnElementsPlaceWhereItBecomesAGroupAndBack)
+{
+    const PlistDictionary cell{{"ARFCN", "66"}};
+    show(PlistDictionary{{"l", PlistArray{"66", "79"}}});
+    show(PlistDictionary{{"l", PlistArray{cell, "79"}}});
+    show(PlistDictionary{{"l", PlistArray{"66", "79"}}});
+    EXPECT_EQ(treeAt(1s), "Ventrik\n  l\n    0\n      ARFCN: 66\n    1: 79\n");
+    EXPECT_EQ(treeAt(2s), "Ventrik\n  l\n    0: 66\n    1: 79\n");
+}
+
 TEST_F(ChangeStoreTest, TellsTheChangesInTheirOrder)
 {
     show(PlistDictionary{{"a", "1"}, {"b", PlistArray()}});

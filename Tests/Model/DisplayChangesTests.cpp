@@ -159,6 +159,29 @@ TEST_F(DisplayChangesTest, TellThatAKeyHasComeBetweenOthers)
     EXPECT_TRUE(changes.takeReordered());
 }
 
+TEST_F(DisplayChangesTest, TellAnotherOrderWhereAValueBecomesAGroupAndBack)
+{
+    const PlistDictionary values{{"a", "1"}, {"b", "2"}};
+    show(values);
+    take();
+    EXPECT_FALSE(changes.takeReordered());
+    show(PlistDictionary{{"a", PlistDictionary{{"x", "1"}}}, {"b", "2"}});
+    take();
+    EXPECT_TRUE(changes.takeReordered());
+    show(values);
+    take();
+    EXPECT_TRUE(changes.takeReordered());
+}
+
+TEST_F(DisplayChangesTest, TellNoOtherOrderWhereAGroupComesAtTheEnd)
+{
+    show(PlistDictionary{{"a", "1"}});
+    take();
+    show(PlistDictionary{{"a", "1"}, {"b", PlistDictionary{{"x", "1"}}}});
+    take();
+    EXPECT_FALSE(changes.takeReordered());
+}
+
 TEST_F(DisplayChangesTest, KeepTheOrderWhereKeysComeAtTheEndAndOthersGo)
 {
     show(PlistDictionary{{"a", "1"}, {"b", "2"}, {"c", "3"}});

@@ -536,6 +536,24 @@ void ChangeStore::visit(std::uint64_t from, StoreVisitor& visitor) const
     }
 }
 
+std::vector<StoredChange> ChangeStore::standing() const
+{
+    std::vector<StoredChange> changes;
+    const Chunk* chunk = _chunks.empty() ? nullptr : _chunks.front().get();
+    if (!chunk || chunk->keyStates.empty() || chunk->keyStates.front().change > 0)
+        return changes;
+    for (const auto& [id, standing] : chunk->keyStates.front().places) {
+        if (standing.value >= group)
+            continue;
+        const auto heard = chunk->heardBefore.find(standing.logCode);
+        const bool isHeard = heard != chunk->heardBefore.end() && heard->second > standing.time;
+        changes.push_back({standing.change, isHeard ? heard->second : standing.time,
+                           standing.logCode, 0, id, DisplayChange::Kind::Shown,
+                           chunk->valueAt(standing.value)});
+    }
+    return changes;
+}
+
 std::optional<Clock::TimePoint> ChangeStore::lastHeard(std::uint32_t logCode) const
 {
     const auto heard = _lastHeard.find(logCode);

@@ -99,6 +99,9 @@ class ChangeStore : public MessageObserver
     DisplayMoment at(std::uint64_t moment) const;
     /// All from that moment on; what came again since then may be told twice.
     void visit(std::uint64_t from, StoreVisitor& visitor) const;
+    /// The values that stand at the first moment, with the times when they were told last: what
+    /// came before is gone, but they are not. Their texts live until the store takes more.
+    std::vector<StoredChange> standing() const;
     /// When a record of that code came last.
     std::optional<Clock::TimePoint> lastHeard(std::uint32_t logCode) const;
 

@@ -92,13 +92,21 @@ void PinnedSeries::beginAnew()
     _places.clear();
     _next = _store.firstMoment();
     _generation = _store.generation();
+    takeStanding();
+}
+
+void PinnedSeries::takeStanding()
+{
+    std::vector<StoredChange> standing = _store.standing();
+    std::ranges::stable_sort(standing, {}, &StoredChange::time);
+    for (const StoredChange& change : standing)
+        changed(change);
 }
 
 void PinnedSeries::update()
 {
-    if (_generation != _store.generation())
+    if (_generation != _store.generation() || _next < _store.firstMoment())
         beginAnew();
-    _next = std::max(_next, _store.firstMoment());
     _store.visit(_next, *this);
     _next = _store.present();
     for (std::size_t pin = 0; pin < _series.size(); ++pin)
@@ -162,13 +170,17 @@ void PinnedSeries::heard(Clock::TimePoint time, std::uint32_t logCode)
             hearAgain(_series[pin].points, time);
 }
 
+// What still stands may be told again.
 void PinnedSeries::dropOld()
 {
     const Clock::TimePoint first = _store.firstTime();
     for (Series& series : _series) {
-        const auto kept = std::ranges::find_if(
-            series.points, [&](const SeriesPoint& point) { return point.until >= first; });
-        series.points.erase(series.points.begin(), kept);
+        auto& points = series.points;
+        auto kept = std::ranges::find_if(
+            points, [&](const SeriesPoint& point) { return point.until >= first; });
+        if (kept == points.end() && !points.empty() && !points.back().isEnd)
+            --kept;
+        points.erase(points.begin(), kept);
     }
 }
 

@@ -68,6 +68,7 @@ class PinnedSeries : private StoreVisitor
     void heard(Clock::TimePoint time, std::uint32_t logCode) override;
     std::uint32_t pinsAt(PlaceId place);
     void take(std::size_t pin, const StoredChange& change);
+    void takeStanding();
     void dropOld();
     void beginAnew();
 

@@ -8,6 +8,8 @@ namespace ventrik
 NumberSeries::NumberSeries(const ChangeStore& store)
     : _places(store.places()), _lineAt(store.places().size(), none)
 {
+    for (const StoredChange& change : store.standing())
+        take(change.place, change);
     store.visit(store.firstMoment(), *this);
     for (std::size_t line = 0; line < _lines.size(); ++line) {
         if (const auto last = store.lastHeard(_codes[line]))
@@ -73,6 +75,7 @@ void NumberSeries::take(PlaceId place, const StoredChange& change)
     NumberLine& line = _lines[index];
     settle(index);
     _codes[index] = change.logCode;
+    _heard.emplace(change.logCode, change.time);
     if (!change.value.unit.empty())
         line.unit = change.value.unit;
     if (change.value.number && !line.points.empty() &&

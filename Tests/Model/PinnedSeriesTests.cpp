@@ -174,6 +174,119 @@ TEST_F(PinnedSeriesTest, DrawsALevelThatLeavesOutItsSignBelowZero)
     EXPECT_THAT(points(), ElementsAre("0-0: -80", "1-1: -75"));
 }
 
+namespace
+{
+
+/// Says of which code the record was that was read.
+class TellingGenerator : public IdleGenerator
+{
+  public:
+    const ReadLayout* lastRead() const override { return &read; }
+
+    ReadLayout read{};
+};
+
+/// Series of a store that has dropped its beginning.
+class PinnedSeriesOfALaterStoreTest : public testing::Test
+{
+  protected:
+    PinnedSeriesOfALaterStoreTest()
+    {
+        generator.read.logCode = 1;
+        store.useGenerator(&generator, "ifx");
+    }
+
+    void take()
+    {
+        state.set(StateKey::display, display);
+        store.messageTaken(time, {}, state);
+        time += 1s;
+    }
+    /// Enough of another record that what came before goes.
+    void fill()
+    {
+        generator.read.logCode = 2;
+        const auto first = store.firstMoment();
+        for (int i = 0; i < 20000; ++i) {
+            display.set("Count", fmt::format("{}", ++count));
+            take();
+            if (isFollowed && i % 100 == 0)
+                series.update();
+        }
+        ASSERT_GT(store.firstMoment(), first + 10);
+        generator.read.logCode = 1;
+    }
+    std::vector<double> values(std::size_t pin = 0)
+    {
+        series.update();
+        std::vector<double> values;
+        for (const SeriesPoint& point : series.series()[pin].points)
+            values.push_back(point.value);
+        return values;
+    }
+
+    TellingGenerator generator;
+    PlistDictionary state;
+    PlistDictionary display{{"Cell", PlistDictionary{{"Level", "-70 dBm"}}},
+                            {"Cells", PlistArray{PlistDictionary{{"Level", "-80"}},
+                                                 PlistDictionary{{"Level", "-90"}}}}};
+    Clock::TimePoint time = start;
+    ChangeStore store{RecordsMode::Newer, {.bytes = 65536}};
+    PinnedSeries series{store};
+    int count = 0;
+    bool isFollowed = false;
+};
+
+} // namespace
+
+TEST_F(PinnedSeriesOfALaterStoreTest, HasWhatStandsSinceBeforeTheStoresFirstMoment)
+{
+    take();
+    fill();
+    series.setPins({Pin::of("/Cell/Level")});
+    ASSERT_THAT(values(), ElementsAre(-70));
+    EXPECT_EQ(series.series()[0].unit, "dBm");
+    EXPECT_EQ(series.series()[0].points[0].until, start) << "it was not told again";
+    take();
+    ASSERT_THAT(values(), ElementsAre(-70));
+    EXPECT_EQ(series.series()[0].points[0].from, time - 1s);
+}
+
+TEST_F(PinnedSeriesOfALaterStoreTest, KnowsTheBestOfAListThatStandsSinceBefore)
+{
+    take();
+    fill();
+    series.setPins({Pin::of("/Cells/*/Level")});
+    display.set("Cells",
+                PlistArray{PlistDictionary{{"Level", "-80"}}, PlistDictionary{{"Level", "-85"}}});
+    take();
+    EXPECT_THAT(values(), ElementsAre(-80));
+}
+
+TEST_F(PinnedSeriesOfALaterStoreTest, KnowsWhatChangedInWhatItDidNotSee)
+{
+    series.setPins({Pin::of("/Cell/Level"), Pin::of("/Cells/*/Level")});
+    take();
+    EXPECT_THAT(values(), ElementsAre(-70));
+    display.set("Cell", PlistDictionary{{"Level", "-75 dBm"}});
+    display.remove("Cells");
+    take();
+    fill();
+    EXPECT_THAT(values(), ElementsAre(-75));
+    EXPECT_THAT(values(1), IsEmpty());
+}
+
+TEST_F(PinnedSeriesOfALaterStoreTest, GoesOnWithWhatWasNotToldForAsLongAsTheStoreHas)
+{
+    isFollowed = true;
+    series.setPins({Pin::of("/Cell/Level")});
+    take();
+    fill();
+    take();
+    ASSERT_THAT(values(), ElementsAre(-70));
+    EXPECT_EQ(series.series()[0].points[0].from, time - 1s);
+}
+
 TEST(PinTest, MatchesElementsOfItsListOnly)
 {
     const Pin pin = Pin::of("/Cells/*/Level");

@@ -110,4 +110,23 @@ TEST_F(NumberSeriesTest, EndsWithTheGroupThatHeldIt)
     EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 0: 0-1 -70."));
 }
 
+TEST_F(NumberSeriesTest, HasWhatStandsSinceBeforeTheStoresFirstMoment)
+{
+    ChangeStore small(RecordsMode::Base, {.bytes = 65536});
+    small.useGenerator(&generator, "lte");
+    PlistDictionary display = cell("-70 dBm");
+    for (int i = 0; i < 20000; ++i) {
+        display.set("Count", fmt::format("{}", i));
+        state.set(StateKey::display, display);
+        small.messageTaken(start + i * 1s, {}, state);
+    }
+    ASSERT_GT(small.firstMoment(), 10U);
+    const NumberSeries series(small);
+    ASSERT_EQ(series.lines().size(), 2U);
+    EXPECT_EQ(series.lines()[0].unit, "dBm");
+    ASSERT_EQ(series.lines()[0].points.size(), 1U);
+    EXPECT_EQ(series.lines()[0].points[0].value, -70);
+    EXPECT_EQ(series.lines()[0].points[0].until, small.lastTime());
+}
+
 } // namespace ventrik

@@ -186,11 +186,11 @@ std::uint32_t ChangeStore::codeOf(ByteView message) const
     return effectiveLogCode(LogPacket(stripPrefix(message)));
 }
 
-// What no record tells is not told again by another message; but that of the cell monitor, whose
-// messages tell all there is.
+// What no record tells is not told again by another message, nor by a record that could not be
+// read; but that of the cell monitor, whose messages tell all there is.
 void ChangeStore::hear(std::uint32_t logCode)
 {
-    if (logCode == 0 && !_wanted.wantsAll())
+    if (!_generator->lastRead() && !_wanted.wantsAll())
         return;
     _lastHeard[logCode] = _lastTime;
     if (_chunks.empty())

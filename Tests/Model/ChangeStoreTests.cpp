@@ -2,6 +2,7 @@
 #include "Model/ChangeStore.h"
 #include "Model/DisplayMoment.h"
 #include "Model/TreePrinter.h"
+#include "Packets/PacketBuilder.h"
 #include "Platform/Technology.h"
 #include "TelephonyService/Scenarios.h"
 #include "Tests/Support/IdleGenerator.h"
@@ -446,6 +447,40 @@ TEST_F(ChangeStoreNotesTest, KnowsTheWarningsOfAnEarlierPart)
     }
     ASSERT_GT(small.firstMoment(), 0U);
     EXPECT_EQ(small.at(small.firstMoment() + 1).layoutWarningsAt("/Section").size(), 1U);
+}
+
+namespace
+{
+
+/// Wants the records of one code, and reads some of them.
+class ChoosyGenerator : public IdleGenerator
+{
+  public:
+    PlistDictionary getStartCommand() const override
+    {
+        return {{"SetOrbelLogCodes", PlistArray{0xB0C2}}};
+    }
+    const ReadLayout* lastRead() const override { return isRead ? &read : nullptr; }
+
+    bool isRead = true;
+    ReadLayout read{0xB0C2, 7, 40, LayoutKind::Base};
+};
+
+} // namespace
+
+TEST_F(ChangeStoreTest, TakesNoRecordThatCouldNotBeReadForValuesToldAgain)
+{
+    ChoosyGenerator choosy;
+    store.useGenerator(&choosy, "lte");
+    message = PacketBuilder(0xB0C2).build();
+    show(PlistDictionary{{"a", "1"}});
+    take();
+    choosy.isRead = false;
+    take();
+    EXPECT_EQ(store.lastHeard(0xB0C2), start + 1s);
+    show(PlistDictionary{{"a", "2"}});
+    EXPECT_EQ(store.lastHeard(0xB0C2), start + 1s);
+    EXPECT_EQ(store.at(store.present()).valueAt("/a")->logCode, 0xB0C2U);
 }
 
 namespace

@@ -40,22 +40,13 @@ constexpr std::array defaults = {
     DefaultPin{"ifx", "/UMTS Neighbor Cells/*/RSCP", "Best neighbor RSCP"},
 };
 
-} // namespace
-
-Pin Pin::of(std::string path)
-{
-    const std::string last = path.substr(path.rfind('/') + 1);
-    const bool isOfList = path.find(anyElement) != path.npos;
-    return {std::move(path), isOfList ? "Best " + last : last, false};
-}
-
-bool Pin::matches(std::string_view valuePath) const
+bool isPathOf(std::string_view path, std::string_view valuePath)
 {
     const auto any = path.find(anyElement);
     if (any == path.npos)
         return valuePath == path;
-    const std::string_view before = std::string_view(path).substr(0, any + 1);
-    const std::string_view behind = std::string_view(path).substr(any + anyElement.size() - 1);
+    const std::string_view before = path.substr(0, any + 1);
+    const std::string_view behind = path.substr(any + anyElement.size() - 1);
     if (valuePath.size() <= before.size() + behind.size() || !valuePath.starts_with(before) ||
         !valuePath.ends_with(behind))
         return false;
@@ -64,12 +55,48 @@ bool Pin::matches(std::string_view valuePath) const
     return part.find('/') == part.npos;
 }
 
+Pin pinOf(const DefaultPin& pin)
+{
+    return {std::string(pin.path), std::string(pin.name), pin.leavesOutSign};
+}
+
+} // namespace
+
+Pin Pin::of(std::string path)
+{
+    for (const DefaultPin& pin : defaults)
+        if (pin.path == path)
+            return pinOf(pin);
+    const std::string last = path.substr(path.rfind('/') + 1);
+    const bool isOfList = path.find(anyElement) != path.npos;
+    if (isLevelWithoutSign(path))
+        return {std::move(path), "GSM " + last, true};
+    return {std::move(path), isOfList ? "Best " + last : last, false};
+}
+
+bool Pin::matches(std::string_view valuePath) const
+{
+    return isPathOf(path, valuePath);
+}
+
+bool isLevelWithoutSign(std::string_view path)
+{
+    return std::ranges::any_of(defaults, [path](const DefaultPin& pin) {
+        return pin.leavesOutSign && isPathOf(pin.path, path);
+    });
+}
+
+double drawnLevel(double number)
+{
+    return -std::abs(number);
+}
+
 std::vector<Pin> defaultPins(std::string_view technology)
 {
     std::vector<Pin> pins;
     for (const DefaultPin& pin : defaults)
         if (pin.technology == technology)
-            pins.push_back({std::string(pin.path), std::string(pin.name), pin.leavesOutSign});
+            pins.push_back(pinOf(pin));
     return pins;
 }
 
@@ -149,14 +176,14 @@ void PinnedSeries::take(std::size_t pin, const StoredChange& change)
     Follower& follower = _followers[pin];
     Series& series = _series[pin];
     if (const auto number = change.value.number)
-        follower.numbers[change.place] = series.pin.leavesOutSign ? -std::abs(*number) : *number;
+        follower.numbers[change.place] = series.pin.leavesOutSign ? drawnLevel(*number) : *number;
     else
         follower.numbers.erase(change.place);
     follower.logCode = change.logCode;
     if (follower.numbers.empty())
         return takeNumber(series.points, change.time, std::nullopt);
-    if (!change.value.unit.empty())
-        series.unit = change.value.unit;
+    if (!change.value.unit.empty() || series.pin.leavesOutSign)
+        series.unit = change.value.unit.empty() ? "dBm" : change.value.unit;
     const double value = std::ranges::max_element(follower.numbers, {}, [](const auto& number) {
                              return number.second;
                          })->second;

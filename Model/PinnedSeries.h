@@ -22,11 +22,17 @@ struct Pin {
     /// A level in dBm that some records tell without its sign: it is drawn below 0.
     bool leavesOutSign = false;
 
-    /// With the name that the path has: that of the value; for a list's, "Best" before it.
+    /// What is pinned from the start stays what it is. Else with the name that the path has: that
+    /// of the value; for a list's, "Best" before it; for a level without its sign, "GSM".
     static Pin of(std::string path);
     bool matches(std::string_view valuePath) const;
     bool operator==(const Pin&) const = default;
 };
+
+/// Whether the value at a path is such a level, one that leaves out its sign.
+bool isLevelWithoutSign(std::string_view path);
+/// The number that it is drawn at, in dBm.
+double drawnLevel(double number);
 
 /// What a technology shows over time from the start: the levels of the serving cell and of the best
 /// neighbor.

@@ -1,5 +1,6 @@
 #include "Model/ValueAlert.h"
 
+#include "Model/PinnedSeries.h"
 #include "Model/StoredNumber.h"
 
 #include <charconv>
@@ -85,7 +86,8 @@ bool AlertWatch::take(PlaceId place, const PlaceTable& places, const StoredValue
     const auto number = state == State::NotWatched ? std::nullopt : storedNumber(shown);
     if (!number)
         return false;
-    const State now = _alert.isBeyond(number->number) ? State::Beyond : State::Within;
+    const double level = _areWithoutSign[place] ? drawnLevel(number->number) : number->number;
+    const State now = _alert.isBeyond(level) ? State::Beyond : State::Within;
     return std::exchange(state, now) == State::Within && now == State::Beyond;
 }
 
@@ -93,10 +95,19 @@ AlertWatch::State& AlertWatch::stateOf(PlaceId place, const PlaceTable& places)
 {
     if (place < _states.size())
         return _states[place];
-    for (auto id = static_cast<PlaceId>(_states.size()); id < places.size(); ++id)
-        _states.push_back(_alert.paths.selects(places.pathOf(id)) ? State::Unknown
-                                                                  : State::NotWatched);
+    for (auto id = static_cast<PlaceId>(_states.size()); id < places.size(); ++id) {
+        const std::string path = places.pathOf(id);
+        const bool isWatched = _alert.paths.selects(path);
+        _states.push_back(isWatched ? State::Unknown : State::NotWatched);
+        _areWithoutSign.push_back(isWatched && isLevelWithoutSign(path));
+    }
     return _states[place];
+}
+
+void AlertWatch::forgetPlaces()
+{
+    _states.clear();
+    _areWithoutSign.clear();
 }
 
 } // namespace ventrik

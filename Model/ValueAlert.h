@@ -35,7 +35,8 @@ struct AlertReading {
 AlertReading parseAlert(std::string_view text);
 
 /// Follows the numbers at an alert's paths and fires when one crosses its threshold: not for one
-/// that was beyond from the start or stays so, and again only when it has come back in between.
+/// that was beyond from the start or stays so, and again only when it has come back in between. A
+/// level that leaves out its sign is compared as it is drawn, below zero.
 class AlertWatch
 {
   public:
@@ -45,7 +46,7 @@ class AlertWatch
     /// True when it fires. Places are those of the store that shows the value.
     bool take(PlaceId place, const PlaceTable& places, const StoredValue& shown);
     /// The places have new numbers.
-    void forgetPlaces() { _states.clear(); }
+    void forgetPlaces();
 
   private:
     enum class State : std::uint8_t { Unknown, NotWatched, Within, Beyond };
@@ -53,7 +54,8 @@ class AlertWatch
     State& stateOf(PlaceId place, const PlaceTable& places);
 
     ValueAlert _alert;
-    std::vector<State> _states; // by place
+    std::vector<State> _states;        // by place
+    std::vector<bool> _areWithoutSign; // likewise: levels of which a record leaves out the sign
 };
 
 } // namespace ventrik

@@ -174,6 +174,14 @@ TEST_F(PinnedSeriesTest, DrawsALevelThatLeavesOutItsSignBelowZero)
     EXPECT_THAT(points(), ElementsAre("0-0: -80", "1-1: -75"));
 }
 
+TEST_F(PinnedSeriesTest, OfALevelThatLeavesOutItsSignHasTheUnitOfLevels)
+{
+    series.setPins({{"/Cell/Level", "GSM RSSI", true}});
+    show(PlistDictionary{{"Cell", level("90")}});
+    EXPECT_THAT(points(), ElementsAre("0-0: -90"));
+    EXPECT_EQ(series.series()[0].unit, "dBm");
+}
+
 namespace
 {
 
@@ -285,6 +293,23 @@ TEST_F(PinnedSeriesOfALaterStoreTest, GoesOnWithWhatWasNotToldForAsLongAsTheStor
     take();
     ASSERT_THAT(values(), ElementsAre(-70));
     EXPECT_EQ(series.series()[0].points[0].from, time - 1s);
+}
+
+TEST(PinTest, OfAPathOfADefaultIsThatDefault)
+{
+    for (const char* technology : {"lte", "gsm", "utran", "c2k", "ifx"})
+        for (const Pin& pin : defaultPins(technology))
+            EXPECT_EQ(Pin::of(pin.path), pin) << pin.path;
+}
+
+TEST(PinTest, OfAnElementLeavesOutTheSignWhereTheDefaultOfItsListDoes)
+{
+    const Pin pin = Pin::of("/Neighbors/Neighboring Cells/0/RSSI");
+    EXPECT_EQ(pin.name, "GSM RSSI");
+    EXPECT_TRUE(pin.leavesOutSign);
+    const Pin other = Pin::of("/Neighbors/Neighbor Cells List/0/Measured RSRP");
+    EXPECT_EQ(other.name, "Measured RSRP");
+    EXPECT_FALSE(other.leavesOutSign);
 }
 
 TEST(PinTest, MatchesElementsOfItsListOnly)

@@ -130,6 +130,19 @@ TEST_F(AlertWatchTest, ReadsTheNumberOfATextThatNoFieldShows)
     EXPECT_TRUE(watch.take(level, places, {.text = "-111 dBm"}));
 }
 
+TEST_F(AlertWatchTest, ComparesALevelThatLeavesOutItsSignAsItIsDrawn)
+{
+    const PlaceId serving =
+        places.add(PlaceTable::root, HolderKind::Dictionary, "Serving Cell", {});
+    const PlaceId cell = places.add(serving, HolderKind::Dictionary, "GSM Serving Cell", {});
+    const PlaceId rssi = places.add(cell, HolderKind::Dictionary, "RSSI", {});
+    AlertWatch watch(*parseAlert("/Serving Cell/GSM Serving Cell/RSSI < -100").alert);
+    EXPECT_FALSE(take(watch, rssi, 99));
+    EXPECT_TRUE(take(watch, rssi, 101));
+    EXPECT_FALSE(take(watch, rssi, -99));
+    EXPECT_TRUE(take(watch, rssi, -101));
+}
+
 TEST_F(AlertWatchTest, KnowsPlacesThatCameLater)
 {
     AlertWatch watch(*parseAlert("/Late < 0").alert);

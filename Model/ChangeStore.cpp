@@ -125,9 +125,12 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     _lastTime = std::max(_lastTime, time);
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);
-    noteLayout();
-    if (changes.empty())
-        return hear(logCode);
+    const bool isNoted = noteLayout();
+    if (changes.empty()) {
+        if (hear(logCode) || isNoted)
+            keepSmall(state);
+        return;
+    }
     if (_chunks.empty())
         beginChunk();
     if (std::exchange(_isFirstDisplay, false)) {
@@ -140,28 +143,37 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
             writeKeyState(state);
     }
     hear(logCode);
+    keepSmall(state);
+}
+
+// What is heard takes room, too. A display that was not taken yet begins no chunk.
+void ChangeStore::keepSmall(const PlistDictionary& state)
+{
+    if (_chunks.empty() || _isFirstDisplay)
+        return;
     endChunkIfFull(state);
     keepWithin();
 }
 
-// Only where it is another one than before.
-void ChangeStore::noteLayout()
+// Only where it is another one than before. True where that took room, as `hear` says it.
+bool ChangeStore::noteLayout()
 {
     const ReadLayout* read = _generator->lastRead();
     if (!read)
-        return;
+        return false;
     const auto [known, isFirst] = _layouts.emplace(read->logCode, *read);
     if (!isFirst && known->second.kind == read->kind && known->second.version == read->version)
-        return;
+        return false;
     known->second = *read;
     std::vector<std::string>& sections = _sections[read->logCode];
     if (sections.empty())
         for (const std::string_view section : _generator->sectionsOfCode(read->logCode))
             sections.emplace_back(section);
     if (_chunks.empty())
-        return;
+        return false;
     Chunk& chunk = *_chunks.back();
     chunk.layouts.push_back({static_cast<std::uint32_t>(chunk.changes.size()), *read});
+    return true;
 }
 
 // A moment is made of the key state before it and the changes since then: of few enough that it
@@ -188,19 +200,20 @@ std::uint32_t ChangeStore::codeOf(ByteView message) const
 
 // What no record tells is not told again by another message, nor by a record that could not be
 // read; but that of the cell monitor, whose messages tell all there is.
-void ChangeStore::hear(std::uint32_t logCode)
+bool ChangeStore::hear(std::uint32_t logCode)
 {
     if (!_generator->lastRead() && !_wanted.wantsAll())
-        return;
+        return false;
     _lastHeard[logCode] = _lastTime;
     if (_chunks.empty())
-        return;
+        return false;
     const auto [noted, isFirst] = _lastNoted.emplace(logCode, _lastTime);
     if (!isFirst && _lastTime - noted->second < hearingInterval)
-        return;
+        return false;
     noted->second = _lastTime;
     Chunk& chunk = *_chunks.back();
     chunk.heard.push_back({_lastTime, logCode, static_cast<std::uint32_t>(chunk.changes.size())});
+    return true;
 }
 
 void ChangeStore::beginMessage(ByteView message, std::uint32_t logCode)
@@ -386,6 +399,7 @@ void ChangeStore::beginChunk()
 {
     auto chunk = std::make_unique<Chunk>();
     chunk->first = _present;
+    chunk->firstTime = _lastTime;
     chunk->heardBefore = _lastHeard;
     chunk->layoutsBefore = _layouts;
     chunk->lastTime = _lastTime;
@@ -415,6 +429,7 @@ void ChangeStore::endChunkIfFull(const PlistDictionary& state)
     chunk.texts.shrink_to_fit();
     chunk.packets.shrink_to_fit();
     chunk.heard.shrink_to_fit();
+    chunk.layouts.shrink_to_fit();
     goOnInNewChunk(state);
 }
 
@@ -465,10 +480,7 @@ std::uint64_t ChangeStore::firstMoment() const
 
 Clock::TimePoint ChangeStore::firstTime() const
 {
-    for (const auto& chunk : _chunks)
-        if (!chunk->messages.empty())
-            return chunk->messages.front().time;
-    return _lastTime;
+    return _chunks.empty() ? Clock::TimePoint() : _chunks.front()->firstTime;
 }
 
 std::uint64_t ChangeStore::momentAt(Clock::TimePoint time) const
@@ -488,11 +500,12 @@ std::uint64_t ChangeStore::momentAt(Clock::TimePoint time) const
 Clock::TimePoint ChangeStore::timeOf(std::uint64_t moment) const
 {
     const Chunk* chunk = chunkAt(moment);
-    if (!chunk || chunk->messages.empty())
+    if (!chunk)
         return lastTime();
+    if (chunk->changes.empty())
+        return chunk->firstTime;
     const std::size_t change = std::max<std::uint64_t>(moment, chunk->first + 1) - chunk->first - 1;
-    return chunk->changes.empty() ? chunk->messages.front().time
-                                  : chunk->messages[chunk->changes[change].message].time;
+    return chunk->messages[chunk->changes[change].message].time;
 }
 
 // The chunk that the changes before the moment end in.

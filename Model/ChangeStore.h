@@ -175,7 +175,8 @@ class ChangeStore : public MessageObserver
         std::map<std::uint32_t, Clock::TimePoint> heardBefore;
         std::vector<NotedLayout> layouts;
         std::map<std::uint32_t, ReadLayout> layoutsBefore;
-        Clock::TimePoint lastTime = {};
+        Clock::TimePoint firstTime = {};
+        Clock::TimePoint lastTime = {}; // of a change
         std::size_t keyBytes = 0;
         std::size_t bytesAtStart = 0; // what it took over
 
@@ -198,8 +199,8 @@ class ChangeStore : public MessageObserver
 
     std::uint32_t codeOf(ByteView message) const;
     bool isFarFromKeyState() const;
-    void hear(std::uint32_t logCode);
-    void noteLayout();
+    bool hear(std::uint32_t logCode);
+    bool noteLayout();
     void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
                    const PlistDictionary& state);
     void beginMessage(ByteView message, std::uint32_t logCode);
@@ -218,6 +219,7 @@ class ChangeStore : public MessageObserver
     void beginChunk();
     void goOnInNewChunk(const PlistDictionary& state);
     void endChunkIfFull(const PlistDictionary& state);
+    void keepSmall(const PlistDictionary& state);
     void keepWithin();
     void beginAnew();
     const Chunk* chunkAt(std::uint64_t moment) const;

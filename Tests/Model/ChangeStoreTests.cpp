@@ -434,6 +434,21 @@ TEST_F(ChangeStoreNotesTest, TellsItOfThePresentAsWell)
     EXPECT_EQ(warningsAt(store.present(), "/Section").size(), 1U);
 }
 
+TEST_F(ChangeStoreNotesTest, StaysWithinItsSizeWhileOnlyLayoutsChange)
+{
+    ChangeStore small(RecordsMode::Newer, smallLimits);
+    small.useGenerator(&reading, "lte");
+    state.set(StateKey::display, PlistDictionary{{"Section", "1"}});
+    for (int i = 0; i < 40000; ++i) {
+        reading.read.kind = i % 2 == 0 ? LayoutKind::NotKnown : LayoutKind::Base;
+        small.messageTaken(start + i * 1s, message, state);
+    }
+    EXPECT_LE(small.bytes(), smallLimits.bytes);
+    EXPECT_EQ(small.at(small.present()).valueAt("/Section")->shown.text, "1");
+    EXPECT_GT(small.firstTime(), start);
+    EXPECT_EQ(small.timeOf(small.firstMoment()), small.firstTime());
+}
+
 TEST_F(ChangeStoreNotesTest, KnowsTheWarningsOfAnEarlierPart)
 {
     ChangeStore small(RecordsMode::Newer, smallLimits);

@@ -289,22 +289,20 @@ std::vector<bool> DisplayChanges::takeOverKeys(DisplayGroup& group,
                                     ? DisplayGroup::Entry{&newPlace(group, key), nullptr}
                                     : known->second);
     }
-    noteOrder(former, group);
+    noteOrder(former, group, areNew);
     return areNew;
 }
 
 // Those that stay come first, as they stood.
 void DisplayChanges::noteOrder(const std::vector<DisplayGroup::Entry>& former,
-                               const DisplayGroup& group)
+                               const DisplayGroup& group, const std::vector<bool>& areNew)
 {
-    auto next = group.entries.begin();
+    std::size_t next = 0;
     for (const DisplayGroup::Entry& entry : former)
-        if (next != group.entries.end() && next->place == entry.place)
+        if (next < group.entries.size() && group.entries[next].place == entry.place)
             ++next;
-    const auto isFormer = [&](const DisplayGroup::Entry& entry) {
-        return std::ranges::find(former, entry.place, &DisplayGroup::Entry::place) != former.end();
-    };
-    if (!group.isSorted && std::any_of(next, group.entries.end(), isFormer))
+    if (!group.isSorted && std::find(areNew.begin() + static_cast<std::ptrdiff_t>(next),
+                                     areNew.end(), false) != areNew.end())
         _isReordered = true;
 }
 

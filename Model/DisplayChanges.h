@@ -119,7 +119,8 @@ class DisplayChanges
     void repeatDoubles(const DisplayGroup& group, std::size_t firstChange);
     void repeat(const DisplayGroup::Entry& entry);
     std::vector<bool> takeOverKeys(DisplayGroup& group, const PlistDictionary& dictionary);
-    void noteOrder(const std::vector<DisplayGroup::Entry>& former, const DisplayGroup& group);
+    void noteOrder(const std::vector<DisplayGroup::Entry>& former, const DisplayGroup& group,
+                   const std::vector<bool>& areNew);
     void compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void compareContainer(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void goBeforeAnotherKind(const DisplayPlace& place);

@@ -88,7 +88,11 @@ void DisplayMoment::Content::showHolder(PlaceId id)
 
 void DisplayMoment::Content::remove(PlaceId id)
 {
-    std::erase(nodes[(*places)[id].holder].below, id);
+    std::vector<PlaceId>& beside = nodes[(*places)[id].holder].below;
+    if (!beside.empty() && beside.back() == id)
+        beside.pop_back(); // lists lose their elements from the end
+    else
+        std::erase(beside, id);
     std::vector<PlaceId> pending{id};
     while (!pending.empty()) {
         Node& gone = nodes[pending.back()];

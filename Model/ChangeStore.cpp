@@ -418,10 +418,23 @@ void ChangeStore::goOnInNewChunk(const PlistDictionary& state)
 }
 
 // Where the display itself is large, a chunk holds at least as much of what changed.
+bool ChangeStore::isFull(const Chunk& chunk) const
+{
+    return chunk.bytes() >= std::max(_limits.bytes / chunksOfStore, 2 * chunk.bytesAtStart);
+}
+
+// Where little changes, what is too old goes by pieces of time, unless the states that they begin
+// with would take the room of the changes.
+bool ChangeStore::isLong(const Chunk& chunk) const
+{
+    return _lastTime - chunk.firstTime > _limits.age / chunksOfStore &&
+           chunk.bytesAtStart < _limits.bytes / chunksOfStore / 2;
+}
+
 void ChangeStore::endChunkIfFull(const PlistDictionary& state)
 {
     Chunk& chunk = *_chunks.back();
-    if (chunk.bytes() < std::max(_limits.bytes / chunksOfStore, 2 * chunk.bytesAtStart))
+    if (!isFull(chunk) && !isLong(chunk))
         return;
     chunk.messages.shrink_to_fit();
     chunk.changes.shrink_to_fit();

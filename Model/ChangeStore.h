@@ -218,6 +218,8 @@ class ChangeStore : public MessageObserver
     void writeKeyState(const PlistDictionary& state);
     void beginChunk();
     void goOnInNewChunk(const PlistDictionary& state);
+    bool isFull(const Chunk& chunk) const;
+    bool isLong(const Chunk& chunk) const;
     void endChunkIfFull(const PlistDictionary& state);
     void keepSmall(const PlistDictionary& state);
     void keepWithin();

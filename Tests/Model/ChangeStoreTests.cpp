@@ -348,6 +348,22 @@ TEST_F(SmallChangeStoreTest, DropsWhatIsTooOld)
     EXPECT_LE(kept, 80min); // what is oldest goes a piece at a time
 }
 
+TEST_F(SmallChangeStoreTest, DropsWhatIsTooOldWhereThereIsRoomForAll)
+{
+    ChangeStore roomy(RecordsMode::Newer, {.age = 1h});
+    roomy.useGenerator(&generator, "lte");
+    for (; last < 7200; ++last) {
+        counter.set("n", std::to_string(last));
+        roomy.messageTaken(start + last * 1s, message, state);
+    }
+    const auto kept = roomy.lastTime() - roomy.firstTime();
+    EXPECT_GE(kept, 1h);
+    EXPECT_LE(kept, 65min);
+    DisplayMoment first = roomy.at(roomy.firstMoment() + 1);
+    const std::string text = std::to_string((first.time() - start) / 1s);
+    EXPECT_EQ(treeOf(first), "Ventrik\n  steady: 0\n  a\n    n: " + text + "\n");
+}
+
 TEST_F(SmallChangeStoreTest, DropsTheOldestPacketsBeforeTheChanges)
 {
     message.resize(500);

@@ -23,6 +23,8 @@ constexpr std::size_t largestPacketKept = 65536;
 constexpr std::size_t fewestChanges = 512;
 constexpr std::size_t changesForPlace = 8;
 constexpr auto hearingInterval = 1s;
+// What comes a little out of order is not worth a word.
+constexpr auto longestDelay = 1s;
 constexpr std::size_t mostEvents = 4096;
 constexpr unsigned knownValueBits = 13;
 constexpr unsigned knownValueShift = 64 - knownValueBits;
@@ -122,6 +124,7 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     ++_messagesTold;
     if (!_changes)
         return;
+    _lateCount += time < _lastTime - longestDelay ? 1 : 0;
     _lastTime = std::max(_lastTime, time);
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);

@@ -91,6 +91,8 @@ class ChangeStore : public MessageObserver
     /// The same as times; the epoch where nothing came.
     Clock::TimePoint firstTime() const;
     Clock::TimePoint lastTime() const { return _lastTime; }
+    /// How many messages were older than one before them, by more than a second.
+    std::uint64_t lateCount() const { return _lateCount; }
     /// After all that came until then, that time included.
     std::uint64_t momentAt(Clock::TimePoint time) const;
     /// When the last change before a moment came; that of the oldest one where it is gone.
@@ -238,6 +240,7 @@ class ChangeStore : public MessageObserver
     std::deque<std::unique_ptr<Chunk>> _chunks;
     std::uint64_t _present = 0;
     std::uint64_t _messagesTold = 0;
+    std::uint64_t _lateCount = 0;
     std::uint32_t _message = 0; // of the newest chunk's, whose changes are taken
     Clock::TimePoint _lastTime = {};
     std::shared_ptr<PlaceTable> _places = std::make_shared<PlaceTable>();

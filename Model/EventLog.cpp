@@ -224,10 +224,9 @@ class EventLog::Follower : public StoreVisitor
         std::string text;
         std::string path;
     };
-    /// What the changes of one message have in common, as far as can be told.
+    /// What the changes of one message have in common.
     struct Message {
         Clock::TimePoint time;
-        std::uint32_t logCode;
         std::optional<std::uint64_t> record;
         std::uint64_t end; ///< behind its changes
     };
@@ -351,7 +350,7 @@ void EventLog::Follower::takeStanding()
     useTechnology(display.technology());
     if (const ModelNodePointer root = display.topLevelNodes())
         takeStanding(*root, "/");
-    _message = Message{display.time(), 0, std::nullopt, _next};
+    _message = Message{display.time(), std::nullopt, _next};
     end();
     std::erase_if(_new, [](const Event& event) { return event.kind != EventKind::Technology; });
 }
@@ -369,10 +368,7 @@ void EventLog::Follower::takeStanding(const VentrikModelNode& node, const std::s
 
 void EventLog::Follower::changed(const StoredChange& change)
 {
-    const bool isOfMessage =
-        _message && (_message->record == change.record ||
-                     (_message->time == change.time && _message->logCode == change.logCode));
-    if (!isOfMessage)
+    if (!_message || _message->record != change.record)
         begin(change);
     _message->end = change.number + 1;
     const Use use = useOf(change.place);
@@ -390,7 +386,7 @@ void EventLog::Follower::begin(const StoredChange& change)
 {
     end();
     addChannelEvents(change.number);
-    _message = Message{change.time, change.logCode, change.record, change.number + 1};
+    _message = Message{change.time, change.record, change.number + 1};
     useTechnology(_store.technologyAt(change.number + 1));
 }
 

@@ -75,6 +75,10 @@ std::string CaptureReport::page(ReportFacts facts) const
     facts.technology = _technology.displayName;
     facts.recordCount = _recordCount;
     facts.decodedCount = _decodedCount;
+    if (_store.lateCount() > 0)
+        facts.notes.push_back(
+            fmt::format("{} records are older than one before them: they are shown at its time",
+                        _store.lateCount()));
     const ReportRange shown = range();
     const ReportTimes times(facts.secondsFromUtc, shown.first, shown.last);
     const auto events = EventLog(_store).update();

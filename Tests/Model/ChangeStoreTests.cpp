@@ -236,6 +236,15 @@ TEST_F(ChangeStoreTest, TakesWhatIsOlderThanTheLastAsIfItCameThen)
     EXPECT_EQ(treeAt(10s), "Ventrik\n  a: 2\n");
 }
 
+TEST_F(ChangeStoreTest, CountsWhatIsOlderThanTheLastByMoreThanASecond)
+{
+    for (const auto second : {0s, 100s, 101s, 100s, 99s, 50s, 102s}) {
+        time = start + second;
+        take();
+    }
+    EXPECT_EQ(store.lateCount(), 2U);
+}
+
 TEST_F(ChangeStoreTest, KeepsTheMessageOfAChange)
 {
     show(PlistDictionary{{"a", "1"}});

@@ -334,6 +334,18 @@ TEST_F(EventLogTest, ReturnsOnlyWhatIsNewAndKeepsAll)
     EXPECT_EQ(log.events().size(), 3U);
 }
 
+TEST_F(EventLogTest, TellsEachOfSeveralMessagesOfOneTime)
+{
+    use("lte");
+    show(lteCell("301", "1300"));
+    log.update();
+    for (const char* identity : {"302", "303"}) {
+        time = start + 1s;
+        show(lteCell(identity, "1300"));
+    }
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Cell: PCI 301 → 302", "Cell: PCI 302 → 303"));
+}
+
 TEST_F(EventLogTest, KeepsTheNewestWhenThereAreTooMany)
 {
     use("lte");

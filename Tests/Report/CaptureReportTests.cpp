@@ -117,4 +117,15 @@ TEST_F(CaptureReportTest, StaysBelowFiveMegabytesWhateverComes)
     EXPECT_THAT(page(), HasSubstr("left out"));
 }
 
+TEST_F(CaptureReportTest, SaysHowManyRecordsAreOlderThanOneBeforeThem)
+{
+    take(serving("301", "-90 dBm"));
+    take(serving("302", "-90 dBm"), -20s);
+    EXPECT_THAT(page(), Not(HasSubstr("older than one before")));
+    take(serving("301", "-90 dBm"));
+    take(serving("302", "-90 dBm"));
+    EXPECT_THAT(page(), HasSubstr("2 records are older than one before them: they are shown at "
+                                  "its time"));
+}
+
 } // namespace ventrik

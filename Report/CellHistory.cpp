@@ -83,6 +83,8 @@ void CellLevels::stay(std::chrono::nanoseconds duration)
 
 void CellHistory::update()
 {
+    if (_store.isEmpty() && !_time)
+        return; // nothing shows yet
     const Clock::TimePoint now = _store.lastTime();
     pass(now);
     if (now - _lastLook >= longestUnseen || (_next != _store.present() && isRelevant()))
@@ -97,6 +99,7 @@ void CellHistory::pass(Clock::TimePoint now)
 {
     const Clock::TimePoint before = _time.value_or(now);
     _time = now;
+    _whole += now - before;
     if (now - before > longestHold) {
         _silence += now - before;
         return;

@@ -42,7 +42,7 @@ struct SeenCell {
     CellLevels quality = {};
 };
 
-/// All cells of a display over time, from its first message on. A cell counts for as long as it is
+/// All cells of a display over time, from its first value on. A cell counts for as long as it is
 /// told, and for as long after as a value is held good; nothing counts while messages stay away for
 /// longer than that.
 class CellHistory
@@ -58,6 +58,8 @@ class CellHistory
 
     /// Those that served longest first, then by when they were seen first.
     std::vector<SeenCell> cells() const;
+    /// From the first value that the store took to the last message, whatever has gone from it.
+    std::chrono::nanoseconds whole() const { return _whole; }
     /// For how long no messages came.
     std::chrono::nanoseconds silence() const { return _silence; }
     /// More than `mostCells` came: the others are left out.
@@ -93,6 +95,7 @@ class CellHistory
     std::optional<Clock::TimePoint> _time; // of the last message
     bool _isOutdated = false;              // something changed since the last look
     Clock::TimePoint _lastLook = {};
+    std::chrono::nanoseconds _whole = {};
     std::chrono::nanoseconds _silence = {};
     std::chrono::nanoseconds _step = {};
     std::size_t _spent = 0; // places looked at with the present step

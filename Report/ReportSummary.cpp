@@ -122,7 +122,7 @@ void writeSummary(HtmlWriter& html, const ReportFacts& facts, const ReportRange&
                                  : facts.technology,
                  R"(class="subtitle")");
     writeFacts(html, facts, range, times);
-    writeServingCells(html, history, range.last - range.first);
+    writeServingCells(html, history, history.whole());
     writeNotes(html, facts, range, history);
     if (!range.hasValues)
         html.element("p", "The capture shows no values.", R"(class="warning")");

@@ -1,6 +1,7 @@
 #include "Charts/ChartTexts.h"
 #include "Report/CellHistory.h"
 #include "Report/ReportLists.h"
+#include "Report/ReportSummary.h"
 #include "Tests/Report/ReportFixture.h"
 
 namespace ventrik
@@ -58,6 +59,30 @@ TEST_F(CellHistoryTest, TellsForHowLongEachCellServed)
                             "LTE 1300 (B3) PCI 302 Serving 5-15 served 10.0 s RSRP -80 "
                             "-80"));
     EXPECT_EQ(history.silence(), 0s);
+    EXPECT_EQ(history.whole(), 22s);
+}
+
+TEST_F(CellHistoryTest, CountsTheWholeTimeAlsoWhereTheStoreLostItsBeginning)
+{
+    ChangeStore small(RecordsMode::Base, {.bytes = 65536});
+    small.useGenerator(&generator, "lte");
+    CellHistory all(small);
+    PlistDictionary display = serving("301", "-90 dBm");
+    for (int i = 0; i <= 10000; ++i) {
+        display.set("Count", fmt::format("{}", i));
+        state.set(StateKey::display, display);
+        small.messageTaken(start + i * 1s, {}, state);
+        all.update();
+    }
+    ASSERT_GT(small.firstMoment(), 0U);
+    EXPECT_EQ(all.whole(), 10000s);
+    ASSERT_EQ(all.cells().size(), 1U);
+    EXPECT_EQ(all.cells()[0].served, 10000s);
+
+    HtmlWriter html;
+    const ReportTimes times(0, small.firstTime(), small.lastTime());
+    writeSummary(html, {}, {small.firstTime(), small.lastTime()}, times, all);
+    EXPECT_THAT(html.written(), testing::HasSubstr("100.0 %"));
 }
 
 TEST_F(CellHistoryTest, HasTheBestLevelAndTheMeanOverTheTimeThatEachStood)

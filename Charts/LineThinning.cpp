@@ -31,6 +31,7 @@ class ColumnRun
         ++_count;
     }
 
+    bool isEmpty() const { return _count == 0 && _kept.empty(); }
     bool isIn(double column) const { return _count > 0 && column == _column; }
 
     /// What has been kept; the next run begins.
@@ -119,15 +120,16 @@ class Thinning
             _before = _within = &point;
             return;
         }
+        addWithin();
         if (std::isfinite(point.value))
             addCorners(point);
+        _before = &point; // no line leads on from what is no number
     }
 
     LineRuns finish()
     {
         addWithin();
-        if (_before)
-            _runs.push_back(_run.finish());
+        endRun();
         return std::move(_runs);
     }
 
@@ -138,19 +140,23 @@ class Thinning
         return std::clamp(_times.x(time), _times.left() - 1, _times.right() + 1);
     }
 
+    void endRun()
+    {
+        if (!_run.isEmpty())
+            _runs.push_back(_run.finish());
+    }
+
     void addCorners(const SeriesPoint& point)
     {
-        addWithin();
         const double from = xOf(point.from);
         if (_before && leadsOn(*_before, point))
             _run.add({from, _values.y(_before->value)});
         else if (_before && !_run.isIn(std::floor(from)))
-            _runs.push_back(_run.finish());
+            endRun();
         const double until = xOf(point.until);
         _run.add({from, _values.y(point.value)});
         _run.add({until, _values.y(point.value)});
         _column.add(until, point.value, _times);
-        _before = &point;
     }
 
     // Of the points within a column only the newest is a corner: the line goes on from there.

@@ -56,8 +56,15 @@ TEST(LineThinningTest, NoLineLeadsOnFromAnEnd)
 
 TEST(LineThinningTest, NoLineLeadsThroughWhatIsNoNumber)
 {
-    const std::vector points{point(10, 12, -20), point(13, 14, std::nan("")), point(50, 52, -30)};
-    EXPECT_THAT(thinned(points), SizeIs(2));
+    const std::vector points{point(10, 12, -20), point(13, 14, std::nan("")), point(16, 20, -30)};
+    EXPECT_THAT(thinned(points), ElementsAre(ElementsAre(Point{10, 20}, Point{12, 20}),
+                                             ElementsAre(Point{16, 30}, Point{20, 30})));
+}
+
+TEST(LineThinningTest, WhatIsNoNumberOnlyIsNoRun)
+{
+    EXPECT_THAT(thinned(std::vector{point(10, 12, INFINITY), point(13, 14, std::nan(""))}),
+                IsEmpty());
 }
 
 TEST(LineThinningTest, APeakOfAColumnStays)

@@ -84,6 +84,24 @@ Clock::TimePoint inRange(Clock::TimePoint time)
     return std::clamp(time, Clock::TimePoint::min() + margin, Clock::TimePoint::max() - margin);
 }
 
+std::vector<TimeTick> ticksOf(Clock::TimePoint first, Clock::TimePoint last, int most,
+                              std::int32_t secondsFromUtc)
+{
+    const nanoseconds zone = seconds(secondsFromUtc);
+    const auto start = inRange(first);
+    const auto end = inRange(last);
+    const double span = static_cast<double>(end.time_since_epoch().count()) -
+                        static_cast<double>(start.time_since_epoch().count());
+    const nanoseconds step = timeStep(span, std::max(1, most));
+    auto tick = start + zone;
+    const auto over = ((tick.time_since_epoch() % step) + step) % step;
+    tick += over == 0ns ? 0ns : step - over;
+    std::vector<TimeTick> ticks;
+    for (; tick - zone <= end && static_cast<int>(ticks.size()) < most; tick += step)
+        ticks.push_back({tick - zone, labelOf(tick - zone, step, secondsFromUtc)});
+    return ticks;
+}
+
 } // namespace
 
 ValueAxis valueAxis(double least, double greatest, double span, int most)
@@ -109,19 +127,12 @@ ValueAxis valueAxis(double least, double greatest, double span, int most)
 std::vector<TimeTick> timeTicks(Clock::TimePoint first, Clock::TimePoint last, int most,
                                 std::int32_t secondsFromUtc)
 {
-    const nanoseconds zone = seconds(secondsFromUtc);
-    const auto start = inRange(first);
-    const auto end = inRange(last);
-    const double span = static_cast<double>(end.time_since_epoch().count()) -
-                        static_cast<double>(start.time_since_epoch().count());
-    const nanoseconds step = timeStep(span, std::max(1, most));
-    auto tick = start + zone;
-    const auto over = ((tick.time_since_epoch() % step) + step) % step;
-    tick += over == 0ns ? 0ns : step - over;
-    std::vector<TimeTick> ticks;
-    for (; tick - zone <= end && static_cast<int>(ticks.size()) < most; tick += step)
-        ticks.push_back({tick - zone, labelOf(tick - zone, step, secondsFromUtc)});
-    return ticks;
+    if (most != 1)
+        return ticksOf(first, last, most, secondsFromUtc);
+    // A step with one tick at most may well have none: of some, that in the middle stays.
+    constexpr int some = 4;
+    const auto ticks = ticksOf(first, last, some, secondsFromUtc);
+    return ticks.empty() ? ticks : std::vector{ticks[ticks.size() / 2]};
 }
 
 } // namespace ventrik

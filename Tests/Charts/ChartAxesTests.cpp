@@ -111,6 +111,13 @@ TEST(TimeTicksTest, MidnightShowsTheDate)
     EXPECT_THAT(timeTexts(0, 3 * 86400, 4), ElementsAre("23 Nov", "24 Nov", "25 Nov"));
 }
 
+TEST(TimeTicksTest, AreOneWhereThereIsRoomForNoMore)
+{
+    EXPECT_THAT(timeTexts(3, 44, 1), ElementsAre("10:00:30"));
+    for (double span = 0.5; span < 4e8; span *= 1.7)
+        EXPECT_THAT(timeTicks(at(0.05), at(0.05 + span), 1, 3600), SizeIs(1)) << span;
+}
+
 TEST(TimeTicksTest, NeverAreMoreThanAsked)
 {
     for (double span = 0.5; span < 4e8; span *= 1.7)

@@ -57,8 +57,8 @@ class StoreVisitor
 struct ChannelEvent {
     Clock::TimePoint time;
     std::uint64_t number; ///< so many changes came before
-    enum class Kind { Opened, Lost, Technology } kind;
-    std::string text; ///< of a technology its name, of a loss the reason
+    enum class Kind { Opened, Lost } kind;
+    std::string text; ///< of a loss the reason
 };
 
 /// Keeps what changed in the display, up to a size and an age, so that it can be shown as it stood

@@ -330,8 +330,6 @@ void EventLog::Follower::addChannelEvents(std::uint64_t number)
 void EventLog::Follower::addChannelEvent(const ChannelEvent& event)
 {
     std::string text = "Opened";
-    if (event.kind == ChannelEvent::Kind::Technology)
-        return;
     if (event.kind == ChannelEvent::Kind::Lost)
         text = event.text.empty() ? "Lost" : "Lost: " + event.text;
     _new.push_back({event.time, event.number, EventKind::Channel, text, std::string(channelPane),

@@ -1,10 +1,7 @@
 #include "Model/EventLog.h"
 
-#include "Model/DisplayMoment.h"
 #include "Model/DisplayNames.h"
 #include "Model/EventPlaces.h"
-#include "Model/NodeRows.h"
-#include "Model/PathIndex.h"
 #include "Platform/Technology.h"
 
 #include <algorithm>
@@ -236,10 +233,11 @@ class EventLog::Follower : public StoreVisitor
     void addChannelEvents(std::uint64_t number);
     void addChannelEvent(const ChannelEvent& event);
     void takeStanding();
-    void takeStanding(const VentrikModelNode& node, const std::string& path);
+    void forgetWhatCanGo();
     void begin(const StoredChange& change);
     const Use& useOf(PlaceId place);
     Use findUse(std::string_view path) const;
+    void takeShown(const StoredChange& change);
     void takeShown(const Use& use, std::string_view path, std::string_view text);
     void takeValue(std::size_t index, std::string_view path, std::string_view text);
     void takeGone(std::string_view path);
@@ -342,24 +340,28 @@ void EventLog::Follower::addChannelEvent(const ChannelEvent& event)
 void EventLog::Follower::takeStanding()
 {
     _next = _store.firstMoment();
-    DisplayMoment display = _store.at(_next);
-    if (display.technology().empty())
+    const std::string_view technology = _store.technologyAt(_next);
+    if (technology.empty())
         return;
-    useTechnology(display.technology());
-    if (const ModelNodePointer root = display.topLevelNodes())
-        takeStanding(*root, "/");
-    _message = Message{display.time(), std::nullopt, _next};
+    useTechnology(technology);
+    forgetWhatCanGo();
+    for (const StoredChange& standing : _store.standing())
+        takeShown(standing);
+    _message = Message{_store.timeOf(_next), std::nullopt, _next};
     end();
     std::erase_if(_new, [](const Event& event) { return event.kind != EventKind::Technology; });
 }
 
-void EventLog::Follower::takeStanding(const VentrikModelNode& node, const std::string& path)
+// What went unseen is not there any more.
+void EventLog::Follower::forgetWhatCanGo()
 {
-    if (node.value())
-        takeShown(findUse(path), path, *node.value());
-    if (node.childNodes())
-        for (const ModelNodePointer& child : *node.childNodes())
-            takeStanding(*child, pathJoining(path, child->displayName()));
+    for (Value& value : _values) {
+        value.isPresent = false;
+        value.isTouched = true;
+        if (!value.listed.empty())
+            value.text.set(textOf({}));
+        value.listed.clear();
+    }
 }
 
 // ---- Changes
@@ -369,15 +371,18 @@ void EventLog::Follower::changed(const StoredChange& change)
     if (!_message || _message->record != change.record)
         begin(change);
     _message->end = change.number + 1;
-    const Use use = useOf(change.place);
-    if (change.kind == DisplayChange::Kind::Shown) {
-        takeShown(use,
-                  use.value == Use::none ? std::string() : _store.places().pathOf(change.place),
-                  change.value.text);
-        takeAlerts(change);
-    } else if (change.kind == DisplayChange::Kind::Gone && use.isHolder) {
+    if (change.kind == DisplayChange::Kind::Shown)
+        takeShown(change);
+    else if (change.kind == DisplayChange::Kind::Gone && useOf(change.place).isHolder)
         takeGone(_store.places().pathOf(change.place));
-    }
+}
+
+void EventLog::Follower::takeShown(const StoredChange& change)
+{
+    const Use use = useOf(change.place);
+    takeShown(use, use.value == Use::none ? std::string() : _store.places().pathOf(change.place),
+              change.value.text);
+    takeAlerts(change);
 }
 
 void EventLog::Follower::begin(const StoredChange& change)

@@ -385,6 +385,16 @@ class SmallStoreEventLogTest : public testing::Test
         store.messageTaken(time, Bytes(13), state);
         time += 1s;
     }
+    /// Until what came before has gone, and a little more.
+    void showForLong(PlistDictionary display)
+    {
+        const auto first = store.present();
+        for (int i = 0; i < 20000; ++i) {
+            display.set("Count", fmt::format("{}", i));
+            show(display);
+        }
+        ASSERT_GT(store.firstMoment(), first + 5);
+    }
 
     IdleGenerator generator;
     ChangeStore store{RecordsMode::Base, {.bytes = 65536}};
@@ -411,6 +421,53 @@ TEST_F(SmallStoreEventLogTest, TakesWhatStandsWhereTheChangesBeforeAreGone)
     display.set("Serving Cell Info", *lteCell("303", "1300").find("Serving Cell Info"));
     show(display);
     EXPECT_THAT(linesOf(log.update()), ElementsAre("Cell: PCI 302 → 303"));
+}
+
+TEST_F(SmallStoreEventLogTest, FiresAnAlertOfANumberThatStandsSinceBeforeTheFirstMoment)
+{
+    EventLog log(store, {*parseAlert("/Level < -110").alert});
+    store.useGenerator(&generator, "lte");
+    showForLong(PlistDictionary{{"Level", "-109"}});
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Technology: LTE"));
+    show(PlistDictionary{{"Level", "-111"}});
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Alert: Level is -111 (< -110)"));
+}
+
+TEST_F(SmallStoreEventLogTest, FiresNoAlertForWhatCrossedUnseen)
+{
+    EventLog log(store, {*parseAlert("/Level < -110").alert});
+    store.useGenerator(&generator, "lte");
+    show(PlistDictionary{{"Level", "-109"}});
+    log.update();
+    showForLong(PlistDictionary{{"Level", "-111"}});
+    EXPECT_THAT(linesOf(log.update()), IsEmpty());
+    show(PlistDictionary{{"Level", "-112"}});
+    EXPECT_THAT(linesOf(log.update()), IsEmpty());
+}
+
+TEST_F(SmallStoreEventLogTest, KnowsWhatWentUnseen)
+{
+    EventLog log(store);
+    store.useGenerator(&generator, "lte");
+    show(sessions({"ims", "internet"}));
+    log.update();
+    showForLong(sessions({"mms"}));
+    EXPECT_THAT(linesOf(log.update()), IsEmpty());
+    show(sessions({"xcap"}));
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Data: Contexts mms → xcap"));
+}
+
+TEST_F(SmallStoreEventLogTest, TellsACallThatBeganAfterOneThatEndedUnseen)
+{
+    EventLog log(store);
+    const PlistDictionary busy{{"Call", PlistDictionary{{"Channel", "TCH/F"}}}};
+    store.useGenerator(&generator, "ifx");
+    show(busy);
+    log.update();
+    showForLong({});
+    EXPECT_THAT(linesOf(log.update()), IsEmpty());
+    show(busy);
+    EXPECT_THAT(linesOf(log.update()), ElementsAre("Call: Call began"));
 }
 
 TEST_F(SmallStoreEventLogTest, TellsTheTechnologyThatCameUnseen)

@@ -489,7 +489,7 @@ void EventLog::Follower::takeAlerts(const StoredChange& change)
         if (_alerts[i].take(change.place, places, change.value))
             _fired.push_back(
                 {i,
-                 fmt::format("{} is {} ({})", places.nameOf(change.place),
+                 fmt::format("{} is {} ({})", shortened(places.nameOf(change.place)),
                              shortened(change.value.text), _alerts[i].alert().condition),
                  places.pathOf(places[change.place].holder)});
 }

@@ -372,6 +372,19 @@ TEST_F(EventLogTest, CutsTextsThatAreLongerThanALine)
     EXPECT_TRUE(line.ends_with("ä…"));
 }
 
+TEST_F(EventLogTest, CutsTheNameInAnAlertThatIsLongerThanALine)
+{
+    EventLog alerts(store, {*parseAlert("/** < 5").alert});
+    use("lte");
+    const std::string name(1000, 'x');
+    show(PlistDictionary{{name, "6"}});
+    show(PlistDictionary{{name, "4"}});
+    const auto events = alerts.update();
+    ASSERT_FALSE(events.empty());
+    EXPECT_THAT(events.back().text, testing::EndsWith("x… is 4 (< 5)"));
+    EXPECT_LT(events.back().text.size(), 200U);
+}
+
 namespace
 {
 

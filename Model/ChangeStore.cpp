@@ -128,7 +128,7 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     _lastTime = std::max(_lastTime, time);
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);
-    const bool isNoted = noteLayout();
+    const bool isNoted = noteLayout(!changes.empty());
     if (changes.empty()) {
         if (hear(logCode) || isNoted)
             keepSmall(state);
@@ -159,7 +159,7 @@ void ChangeStore::keepSmall(const PlistDictionary& state)
 }
 
 // Only where it is another one than before. True where that took room, as `hear` says it.
-bool ChangeStore::noteLayout()
+bool ChangeStore::noteLayout(bool isOfChanges)
 {
     const ReadLayout* read = _generator->lastRead();
     if (!read)
@@ -174,9 +174,25 @@ bool ChangeStore::noteLayout()
             sections.emplace_back(section);
     if (_chunks.empty())
         return false;
+    if (!isOfChanges)
+        return noteOfLastChange(*read);
     Chunk& chunk = *_chunks.back();
     chunk.layouts.push_back({static_cast<std::uint32_t>(chunk.changes.size()), *read});
     return true;
+}
+
+// What changes nothing makes no moment of its own: it belongs to the one that is there.
+bool ChangeStore::noteOfLastChange(const ReadLayout& layout)
+{
+    for (auto chunk = _chunks.rbegin(); chunk != _chunks.rend(); ++chunk) {
+        const auto changes = static_cast<std::uint32_t>((*chunk)->changes.size());
+        if (changes > 0) {
+            (*chunk)->layouts.push_back({changes - 1, layout});
+            return true;
+        }
+        (*chunk)->layoutsBefore[layout.logCode] = layout;
+    }
+    return false;
 }
 
 // A moment is made of the key state before it and the changes since then: of few enough that it

@@ -152,7 +152,7 @@ class ChangeStore : public MessageObserver
         std::uint32_t change; // so many of the chunk's came before
     };
     struct NotedLayout {
-        std::uint32_t change; // so many of the chunk's came before
+        std::uint32_t change; // so many of the chunk's came before the one that it belongs to
         ReadLayout layout;
     };
     struct Standing {
@@ -202,7 +202,8 @@ class ChangeStore : public MessageObserver
     std::uint32_t codeOf(ByteView message) const;
     bool isFarFromKeyState() const;
     bool hear(std::uint32_t logCode);
-    bool noteLayout();
+    bool noteLayout(bool isOfChanges);
+    bool noteOfLastChange(const ReadLayout& layout);
     void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
                    const PlistDictionary& state);
     void beginMessage(ByteView message, std::uint32_t logCode);

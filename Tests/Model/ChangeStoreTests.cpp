@@ -459,6 +459,38 @@ TEST_F(ChangeStoreNotesTest, TellsItOfThePresentAsWell)
     EXPECT_EQ(warningsAt(store.present(), "/Section").size(), 1U);
 }
 
+TEST_F(ChangeStoreNotesTest, TellsOfThePastWhatItToldWhileThatWasThePresent)
+{
+    show("1");
+    reading.read.kind = LayoutKind::NotKnown;
+    take(); // which changes nothing
+    const auto moment = store.present();
+    const auto then = warningsAt(moment, "/Section");
+    show("2");
+    EXPECT_EQ(warningsAt(moment, "/Section"), then);
+    EXPECT_EQ(then.size(), 1U);
+}
+
+TEST_F(ChangeStoreNotesTest, TellsItOfThePastAlsoAtTheEdgeOfItsParts)
+{
+    ChangeStore small(RecordsMode::Newer, smallLimits);
+    small.useGenerator(&reading, "lte");
+    PlistDictionary counter{{"a", "0"}};
+    state.set(StateKey::display, PlistDictionary{{"Section", counter}});
+    std::map<std::uint64_t, bool> warned;
+    for (int i = 0; i < 3000; ++i) {
+        const bool isKnown = i % 3 == 0;
+        reading.read.kind = isKnown ? LayoutKind::Base : LayoutKind::NotKnown;
+        if (i % 3 != 1)
+            counter.set("a", std::to_string(i));
+        small.messageTaken(start + i * 1s, message, state);
+        warned[small.present()] = !small.at(small.present()).layoutWarningsAt("/Section").empty();
+    }
+    std::erase_if(warned, [&](const auto& known) { return known.first <= small.firstMoment(); });
+    for (const auto& [moment, isWarned] : warned)
+        EXPECT_EQ(!small.at(moment).layoutWarningsAt("/Section").empty(), isWarned) << moment;
+}
+
 TEST_F(ChangeStoreNotesTest, StaysWithinItsSizeWhileOnlyLayoutsChange)
 {
     ChangeStore small(RecordsMode::Newer, smallLimits);

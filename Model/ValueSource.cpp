@@ -143,7 +143,8 @@ ValueSources::ValueSources(const Resources& resources, const Clock& clock, Recor
 ValueSources::~ValueSources() = default;
 
 std::optional<ValueSource> ValueSources::find(const DisplayMoment& display,
-                                              const ChangeStore& store, const std::string& path)
+                                              const ChangeStore& store,
+                                              const std::string& path) const
 {
     const DisplayMoment::Value* value = display.valueAt(path);
     if (!value)
@@ -166,19 +167,22 @@ std::optional<ValueSource> ValueSources::find(const DisplayMoment& display,
     return source;
 }
 
-// What another packet has told is not taken for it: field and number are those of the value.
+// By a generator that has seen no other packet. What this one did not tell is not taken for it:
+// field and number are those of the value.
 void ValueSources::locate(ValueSource& source, const StoredValue& value,
-                          const std::vector<std::string_view>& keys, const std::string& technology)
+                          const std::vector<std::string_view>& keys,
+                          const std::string& technology) const
 {
-    LogGenerator* generator = source.packet.empty() ? nullptr : generatorOf(technology);
+    const auto generator = source.packet.empty() ? nullptr : generatorOf(technology);
     if (!generator)
         return;
+    PlistDictionary state;
     try {
-        generator->updateState(_state, source.packet);
+        generator->updateState(state, source.packet);
     } catch (const AssertionFailure&) {
         return;
     }
-    const auto origin = generator->originOf(_state, keys);
+    const auto origin = generator->originOf(state, keys);
     if (!origin || origin->field != value.field || origin->raw != value.raw ||
         origin->firstByte() + origin->field->place.bytes() > source.packet.size())
         return;
@@ -187,19 +191,14 @@ void ValueSources::locate(ValueSource& source, const StoredValue& value,
         source.record->version = origin->version;
 }
 
-LogGenerator* ValueSources::generatorOf(const std::string& technology)
+std::unique_ptr<LogGenerator> ValueSources::generatorOf(const std::string& technology) const
 {
-    if (_generator && technology == _technology)
-        return _generator.get();
     const auto known = technologyNamed(technology);
     if (!known)
         return nullptr;
-    _technology = technology;
-    _state = PlistDictionary();
-    _generator = LogGenerator::generatorFromTechnology(
+    return LogGenerator::generatorFromTechnology(
         known->identifier,
         {*_log, _resources, _clock, AssertionPolicy::Throw, _records, RawPackets::Dropped});
-    return _generator.get();
 }
 
 } // namespace ventrik

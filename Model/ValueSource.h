@@ -53,22 +53,19 @@ class ValueSources
 
     /// None where no value stands at the path.
     std::optional<ValueSource> find(const DisplayMoment& display, const ChangeStore& store,
-                                    const std::string& path);
+                                    const std::string& path) const;
 
   private:
     class Silence;
 
     void locate(ValueSource& source, const StoredValue& value,
-                const std::vector<std::string_view>& keys, const std::string& technology);
-    LogGenerator* generatorOf(const std::string& technology);
+                const std::vector<std::string_view>& keys, const std::string& technology) const;
+    std::unique_ptr<LogGenerator> generatorOf(const std::string& technology) const;
 
     const Resources& _resources;
     const Clock& _clock;
     RecordsMode _records;
     std::unique_ptr<Silence> _log;
-    std::string _technology; // of the generator
-    std::unique_ptr<LogGenerator> _generator;
-    PlistDictionary _state;
 };
 
 } // namespace ventrik

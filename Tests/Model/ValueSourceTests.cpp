@@ -155,6 +155,24 @@ TEST_F(ValueSourceTest, OfAValueThatNoRecordToldHasNoBits)
     EXPECT_FALSE(source->raw);
 }
 
+TEST_F(ValueSourceTest, HasNoBitsInAPacketThatDidNotTellIt)
+{
+    take(cellInfo(301));
+    ASSERT_TRUE(find(identity)->bits);
+    // A store that begins now takes all for told by the next packet.
+    ChangeStore later(RecordsMode::Newer);
+    later.useGenerator(generator.get(), "lte");
+    const Bytes other = PacketBuilder(0xB17F).size(60).build();
+    generator->updateState(state, other);
+    later.messageTaken(fake.clock.now(), other, state);
+    DisplayMoment now = later.at(later.present());
+    const auto source = sources.find(now, later, identity);
+    ASSERT_TRUE(source);
+    EXPECT_EQ(source->text, "301");
+    EXPECT_EQ(source->packet, other);
+    EXPECT_FALSE(source->bits);
+}
+
 TEST_F(ValueSourceTest, SaysWhereThePacketIsNotKept)
 {
     ValueSource source{"/a", "1", {}, {}};

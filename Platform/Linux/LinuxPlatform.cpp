@@ -24,7 +24,8 @@ LinuxPlatform::LinuxPlatform(const LinuxPlatformOptions& options)
       _resources(options.resourceDirectories.empty() ? LinuxResources::defaultDirectories()
                                                      : options.resourceDirectories,
                  options.version),
-      _preferences(_log)
+      _preferences(_log),
+      _notices(_log)
 {
 }
 

@@ -1,6 +1,7 @@
 #include "Platform/Linux/SessionBus.h"
 
 #include "Platform/Linux/Socket.h"
+#include "PropertyList/XmlText.h"
 
 #include <cstring>
 #include <memory>
@@ -133,7 +134,8 @@ std::optional<std::string> sendBusSignal(const std::string& address, const BusSi
 std::optional<std::string> sendBusNotice(const std::string& address, const std::string& text,
                                          std::chrono::milliseconds longestWait)
 {
-    return sendOnBus(address, text, longestWait);
+    std::size_t replaced = 0;
+    return sendOnBus(address, replaceUnfit(text, replaced), longestWait);
 }
 
 } // namespace ventrik

@@ -27,7 +27,8 @@ std::optional<std::string> sessionBusAddress();
 std::optional<std::string> sendBusSignal(const std::string& address, const BusSignal& signal,
                                          std::chrono::milliseconds longestWait);
 
-/// Has the desktop show a notice, in the same manner; nobody waits for its answer.
+/// Has the desktop show a notice, in the same manner; nobody waits for its answer. What a bus does
+/// not take, bytes that are not UTF-8, becomes U+FFFD.
 std::optional<std::string> sendBusNotice(const std::string& address, const std::string& text,
                                          std::chrono::milliseconds longestWait);
 

@@ -1,6 +1,7 @@
 #include "Platform/Linux/LinuxNotices.h"
 #include "Platform/Linux/SessionBus.h"
 #include "Platform/Linux/Socket.h"
+#include "Tests/Support/CapturingSystemLog.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -40,9 +41,11 @@ class FakeBus
     }
     ~FakeBus() { _thread.join(); }
 
+    std::string address() const { return "unix:path=" + _path; }
+
     std::optional<std::string> send(std::chrono::milliseconds longestWait) const
     {
-        return sendBusSignal("unix:path=" + _path, someSignal, longestWait);
+        return sendBusSignal(address(), someSignal, longestWait);
     }
 
   private:
@@ -104,15 +107,25 @@ TEST(SessionBus, ThatDoesNotAnswerIsNotWaitedForByNotices)
     const std::string path = directory.filePath("bus").toStdString();
     const FileDescriptor listener = listenSocket(path);
     qputenv("DBUS_SESSION_BUS_ADDRESS", QByteArray::fromStdString("unix:path=" + path));
+    CapturingSystemLog log;
     const auto start = std::chrono::steady_clock::now();
     {
-        LinuxNotices notices;
+        LinuxNotices notices(log);
         notices.post("RSRP is -112 dBm");
         notices.post("RSRP is -113 dBm");
         EXPECT_LT(std::chrono::steady_clock::now() - start, LinuxNotices::longestWait / 2);
     }
     EXPECT_LT(std::chrono::steady_clock::now() - start, 2 * LinuxNotices::longestWait);
+    EXPECT_THAT(
+        log.texts(LogPriority::error),
+        testing::ElementsAre("The session bus did not take the notice: it does not answer"));
     qunsetenv("DBUS_SESSION_BUS_ADDRESS");
+}
+
+TEST(SessionBus, IsAskedToShowNoticesThatAreNotUtf8)
+{
+    const FakeBus bus("");
+    EXPECT_EQ(sendBusNotice(bus.address(), "RSRP \xff", 20ms), "it does not answer");
 }
 
 TEST(SessionBus, IsWhereTheEnvironmentSays)

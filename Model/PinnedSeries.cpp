@@ -18,16 +18,22 @@ struct DefaultPin {
     std::string_view path;
     std::string_view name;
     bool leavesOutSign = false;
+    std::string_view unit = {};
 };
 
+// A code's power is told in dB by some records, as the display shows it: one lane has them all.
 constexpr std::array defaults = {
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRP", "RSRP"},
     DefaultPin{"lte", "/Neighbors/Neighbor Cells List/*/Measured RSRP", "Best neighbor RSRP"},
+    DefaultPin{"lte", "/Neighbors/Measured Neighbor Cells/*/Filtered RSRP",
+               "Best connected neighbor RSRP"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRQ", "RSRQ"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSSI", "RSSI"},
-    DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI", true},
-    DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor GSM RSSI", true},
-    DefaultPin{"gsm", "/Neighbors/UMTS Set/*/RSCP", "Best RSCP"},
+    DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI", true, "dBm"},
+    DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor GSM RSSI", true, "dBm"},
+    DefaultPin{"gsm", "/Serving Cell/Active Set/*/RSCP", "Active set RSCP", false, "dBm"},
+    DefaultPin{"gsm", "/Serving Cell/Active Set/*/Energy Per Chip", "Active set Ec/Io"},
+    DefaultPin{"gsm", "/Neighbors/UMTS Set/*/RSCP", "Best RSCP", false, "dBm"},
     DefaultPin{"gsm", "/Neighbors/UMTS Set/*/Energy Per Chip", "Best Ec/Io"},
     DefaultPin{"utran", "/Neighbor Cell List/*/Filter RSCP", "Best RSCP"},
     DefaultPin{"utran", "/GSM Neighbor Cell List/*/RSSI", "Best GSM RSSI"},
@@ -57,7 +63,7 @@ bool isPathOf(std::string_view path, std::string_view valuePath)
 
 Pin pinOf(const DefaultPin& pin)
 {
-    return {std::string(pin.path), std::string(pin.name), pin.leavesOutSign};
+    return {std::string(pin.path), std::string(pin.name), pin.leavesOutSign, std::string(pin.unit)};
 }
 
 } // namespace
@@ -70,8 +76,8 @@ Pin Pin::of(std::string path)
     const std::string last = path.substr(path.rfind('/') + 1);
     const bool isOfList = path.find(anyElement) != path.npos;
     if (isLevelWithoutSign(path))
-        return {std::move(path), "GSM " + last, true};
-    return {std::move(path), isOfList ? "Best " + last : last, false};
+        return {std::move(path), "GSM " + last, true, "dBm"};
+    return {std::move(path), isOfList ? "Best " + last : last};
 }
 
 bool Pin::matches(std::string_view valuePath) const
@@ -182,8 +188,10 @@ void PinnedSeries::take(std::size_t pin, const StoredChange& change)
     follower.logCode = change.logCode;
     if (follower.numbers.empty())
         return takeNumber(series.points, change.time, std::nullopt);
-    if (!change.value.unit.empty() || series.pin.leavesOutSign)
-        series.unit = change.value.unit.empty() ? "dBm" : change.value.unit;
+    if (!series.pin.unit.empty())
+        series.unit = series.pin.unit;
+    else if (!change.value.unit.empty())
+        series.unit = change.value.unit;
     const double value = std::ranges::max_element(follower.numbers, {}, [](const auto& number) {
                              return number.second;
                          })->second;

@@ -21,6 +21,8 @@ struct Pin {
     std::string name; ///< in the chart
     /// A level in dBm that some records tell without its sign: it is drawn below 0.
     bool leavesOutSign = false;
+    /// That it is drawn with, where records differ in it; empty: as they tell it.
+    std::string unit = {};
 
     /// What is pinned from the start stays what it is. Else with the name that the path has: that
     /// of the value; for a list's, "Best" before it; for a level without its sign, "GSM".

@@ -1,9 +1,16 @@
 #include "LogGenerator/Core/StateKeys.h"
 #include "Model/PinnedSeries.h"
+#include "Platform/Technology.h"
+#include "TelephonyService/Scenarios.h"
+#include "Tests/Support/FakePlatform.h"
 #include "Tests/Support/FixedClock.h"
 #include "Tests/Support/IdleGenerator.h"
+#include "Tests/Support/ResourceFiles.h"
 
+#include <algorithm>
 #include <chrono>
+#include <map>
+#include <set>
 
 #include <fmt/format.h>
 #include <gmock/gmock.h>
@@ -174,11 +181,13 @@ TEST_F(PinnedSeriesTest, DrawsALevelThatLeavesOutItsSignBelowZero)
     EXPECT_THAT(points(), ElementsAre("0-0: -80", "1-1: -75"));
 }
 
-TEST_F(PinnedSeriesTest, OfALevelThatLeavesOutItsSignHasTheUnitOfLevels)
+TEST_F(PinnedSeriesTest, HasTheUnitOfItsPinWhateverARecordTells)
 {
-    series.setPins({{"/Cell/Level", "GSM RSSI", true}});
-    show(PlistDictionary{{"Cell", level("90")}});
+    series.setPins({{"/Cell/Level", "RSCP", false, "dBm"}});
+    show(PlistDictionary{{"Cell", level("-90")}});
     EXPECT_THAT(points(), ElementsAre("0-0: -90"));
+    EXPECT_EQ(series.series()[0].unit, "dBm");
+    show(PlistDictionary{{"Cell", level("-90 dB")}});
     EXPECT_EQ(series.series()[0].unit, "dBm");
 }
 
@@ -295,6 +304,17 @@ TEST_F(PinnedSeriesOfALaterStoreTest, GoesOnWithWhatWasNotToldForAsLongAsTheStor
     EXPECT_EQ(series.series()[0].points[0].from, time - 1s);
 }
 
+TEST(PinTest, AreOfTheServingSetAndOfConnectedNeighborsFromTheStart)
+{
+    const auto isPinned = [](std::string_view technology, std::string_view path) {
+        return std::ranges::any_of(defaultPins(technology),
+                                   [path](const Pin& pin) { return pin.matches(path); });
+    };
+    EXPECT_TRUE(isPinned("gsm", "/Serving Cell/Active Set/0/RSCP"));
+    EXPECT_TRUE(isPinned("gsm", "/Serving Cell/Active Set/0/Energy Per Chip"));
+    EXPECT_TRUE(isPinned("lte", "/Neighbors/Measured Neighbor Cells/0/Filtered RSRP"));
+}
+
 TEST(PinTest, OfAPathOfADefaultIsThatDefault)
 {
     for (const char* technology : {"lte", "gsm", "utran", "c2k", "ifx"})
@@ -307,6 +327,7 @@ TEST(PinTest, OfAnElementLeavesOutTheSignWhereTheDefaultOfItsListDoes)
     const Pin pin = Pin::of("/Neighbors/Neighboring Cells/0/RSSI");
     EXPECT_EQ(pin.name, "GSM RSSI");
     EXPECT_TRUE(pin.leavesOutSign);
+    EXPECT_EQ(pin.unit, "dBm") << "some records tell none, and bands are of levels";
     const Pin other = Pin::of("/Neighbors/Neighbor Cells List/0/Measured RSRP");
     EXPECT_EQ(other.name, "Measured RSRP");
     EXPECT_FALSE(other.leavesOutSign);
@@ -328,6 +349,49 @@ TEST(PinTest, IsOfEachTechnologyFromTheStart)
         EXPECT_FALSE(defaultPins(technology).empty()) << technology;
     EXPECT_TRUE(defaultPins("other").empty());
 }
+
+namespace
+{
+
+/// What is pinned from the start, as a technology's scenario moves it.
+class DefaultPinsTest : public testing::TestWithParam<std::string_view>
+{
+  protected:
+    DefaultPinsTest() { addTemplates(fake.resources, VENTRIK_RESOURCES); }
+
+    FakePlatform fake;
+};
+
+} // namespace
+
+TEST_P(DefaultPinsTest, FindTheirPlaces)
+{
+    const Technology technology = *technologyNamed(GetParam());
+    const auto generator = LogGenerator::generatorsReading(RecordsMode::Extended)(
+        technology.identifier, {fake.log, fake.resources, fake.clock});
+    ChangeStore store(RecordsMode::Extended);
+    store.useGenerator(generator.get(), technology.name);
+    PinnedSeries series(store);
+    series.setPins(defaultPins(technology.name));
+    const auto scenario = makeScenario(technology, 5, RecordsMode::Extended);
+    PlistDictionary state;
+    for (int i = 0; i < 2000; ++i) {
+        const auto message = scenario->next();
+        generator->updateState(state, message->data);
+        store.messageTaken(start + message->due, message->data, state);
+    }
+    series.update();
+    std::map<std::string, std::set<std::string>> units; // by the last word of their names
+    for (const PinnedSeries::Series& each : series.series()) {
+        EXPECT_FALSE(each.points.empty()) << each.pin.name;
+        units[each.pin.name.substr(each.pin.name.rfind(' ') + 1)].insert(each.unit);
+    }
+    for (const auto& [quantity, different] : units)
+        EXPECT_EQ(different.size(), 1U) << quantity << " has more than a lane";
+}
+
+INSTANTIATE_TEST_SUITE_P(OfScenarios, DefaultPinsTest, testing::Values("lte", "gsm", "c2k"),
+                         [](const auto& name) { return std::string(name.param); });
 
 TEST(MeasurementTest, IsANumberWithAUnitOfLevels)
 {

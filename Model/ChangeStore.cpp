@@ -129,24 +129,25 @@ void ChangeStore::messageTaken(Clock::TimePoint time, ByteView message,
     const auto changes = _changes->take(state);
     const std::uint32_t logCode = codeOf(message);
     const bool isNoted = noteLayout(!changes.empty());
-    if (changes.empty()) {
-        if (hear(logCode) || isNoted)
-            keepSmall(state);
-        return;
-    }
+    if (!changes.empty())
+        takeAll(changes, message, logCode, state);
+    const bool isHeard = hear(logCode);
+    if (!changes.empty() || isNoted || isHeard)
+        keepSmall(state);
+}
+
+void ChangeStore::takeAll(std::span<const DisplayChange> changes, ByteView message,
+                          std::uint32_t logCode, const PlistDictionary& state)
+{
     if (_chunks.empty())
         beginChunk();
-    if (std::exchange(_isFirstDisplay, false)) {
-        takeFirst(changes, message, logCode, state);
-    } else {
-        beginMessage(message, logCode);
-        for (const DisplayChange& change : changes)
-            take(change, state);
-        if (_changes->takeReordered() || isFarFromKeyState())
-            writeKeyState(state);
-    }
-    hear(logCode);
-    keepSmall(state);
+    if (std::exchange(_isFirstDisplay, false))
+        return takeFirst(changes, message, logCode, state);
+    beginMessage(message, logCode);
+    for (const DisplayChange& change : changes)
+        take(change, state);
+    if (_changes->takeReordered() || isFarFromKeyState())
+        writeKeyState(state);
 }
 
 // What is heard takes room, too. A display that was not taken yet begins no chunk.

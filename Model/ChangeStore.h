@@ -204,6 +204,8 @@ class ChangeStore : public MessageObserver
     bool hear(std::uint32_t logCode);
     bool noteLayout(bool isOfChanges);
     bool noteOfLastChange(const ReadLayout& layout);
+    void takeAll(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
+                 const PlistDictionary& state);
     void takeFirst(std::span<const DisplayChange> changes, ByteView message, std::uint32_t logCode,
                    const PlistDictionary& state);
     void beginMessage(ByteView message, std::uint32_t logCode);

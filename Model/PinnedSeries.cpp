@@ -24,10 +24,14 @@ struct DefaultPin {
 // A code's power is told in dB by some records, as the display shows it: one lane has them all.
 constexpr std::array defaults = {
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRP", "RSRP"},
+    DefaultPin{"lte", "/Connected mode LTE Intra-frequency Measurement/Serving Filtered RSRP",
+               "Connected RSRP"},
     DefaultPin{"lte", "/Neighbors/Neighbor Cells List/*/Measured RSRP", "Best neighbor RSRP"},
     DefaultPin{"lte", "/Neighbors/Measured Neighbor Cells/*/Filtered RSRP",
                "Best connected neighbor RSRP"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSRQ", "RSRQ"},
+    DefaultPin{"lte", "/Connected mode LTE Intra-frequency Measurement/Serving Filtered RSRQ",
+               "Connected RSRQ"},
     DefaultPin{"lte", "/Serving Cell Measurements/Measured RSSI", "RSSI"},
     DefaultPin{"gsm", "/Serving Cell/GSM Serving Cell/RSSI", "GSM RSSI", true, "dBm"},
     DefaultPin{"gsm", "/Neighbors/Neighboring Cells/*/RSSI", "Best neighbor GSM RSSI", true, "dBm"},

@@ -1,5 +1,7 @@
 #include "Report/NumberSeries.h"
 
+#include "Model/PinnedSeries.h"
+
 #include <algorithm>
 
 namespace ventrik
@@ -70,18 +72,23 @@ void NumberSeries::take(PlaceId place, const StoredChange& change)
         _lineAt[place] = static_cast<std::uint32_t>(_lines.size());
         _lines.push_back({place, {}, 0, {}});
         _codes.push_back(change.logCode);
+        _leaveOutSign.push_back(isLevelWithoutSign(_places.pathOf(place)));
     }
     const std::size_t index = _lineAt[place];
     NumberLine& line = _lines[index];
     settle(index);
     _codes[index] = change.logCode;
     _heard.emplace(change.logCode, change.time);
-    if (!change.value.unit.empty())
+    if (_leaveOutSign[index])
+        line.unit = "dBm";
+    else if (!change.value.unit.empty())
         line.unit = change.value.unit;
-    if (change.value.number && !line.points.empty() &&
-        line.points.back().value != *change.value.number)
+    std::optional<double> number = change.value.number;
+    if (number && _leaveOutSign[index])
+        number = drawnLevel(*number);
+    if (number && !line.points.empty() && line.points.back().value != *number)
         ++line.changeCount;
-    takeNumber(line.points, change.time, change.value.number);
+    takeNumber(line.points, change.time, number);
 }
 
 // What its record told again, without a gap, before another one changes it.

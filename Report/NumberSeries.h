@@ -47,6 +47,7 @@ class NumberSeries : private StoreVisitor
     const PlaceTable& _places;
     std::vector<NumberLine> _lines;
     std::vector<std::uint32_t> _codes;                // of each line's last change
+    std::vector<bool> _leaveOutSign;                  // of each line: a level, drawn below 0
     std::vector<std::uint32_t> _lineAt;               // by place
     std::map<std::uint32_t, Clock::TimePoint> _heard; // last, by code
     std::size_t _pointsBehindGaps = 0;

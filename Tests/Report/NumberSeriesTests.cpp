@@ -55,6 +55,19 @@ TEST_F(NumberSeriesTest, CountsOnlyOtherNumbersAsChanges)
     EXPECT_THAT(lines(), ElementsAre("/Cell/Level dBm 0: 0-1 -70. 2-2 -70"));
 }
 
+TEST_F(NumberSeriesTest, DrawsLevelsBelowZeroThatLeaveOutTheirSign)
+{
+    const auto serving = [](std::string_view level) {
+        return PlistDictionary{
+            {"Serving Cell",
+             PlistDictionary{{"GSM Serving Cell", PlistDictionary{{"RSSI", level}, {"BCC", "a"}}},
+                             {"More", "b"}}}};
+    };
+    show(serving("54"));
+    show(serving("60"));
+    EXPECT_THAT(lines(), ElementsAre("/Serving Cell/GSM Serving Cell/RSSI dBm 1: 0-0 -54 1-1 -60"));
+}
+
 TEST_F(NumberSeriesTest, StandsUntilItWasToldLast)
 {
     show(cell("-70 dBm"));

@@ -175,6 +175,7 @@ void TimeLineView::update()
     updateStrip();
     _cells->setCells(cellsOf(_timeLine.shown(), _timeLine.pausedAt().value_or(_timeLine.end())));
     _events->setEvents(_timeLine.events());
+    _events->setMoment(_timeLine.pausedAt());
 }
 
 // A dragged cursor asks often, and there may be millions of points.

@@ -14,6 +14,7 @@
 #include <QVBoxLayout>
 
 #include <algorithm>
+#include <optional>
 #include <utility>
 
 namespace ventrik
@@ -32,6 +33,9 @@ class EventLines : public QStyledItemDelegate
 {
   public:
     using QStyledItemDelegate::QStyledItemDelegate;
+
+    /// What happened later is fainter.
+    void setMoment(std::optional<Clock::TimePoint> moment) { _moment = moment; }
 
     static int rowHeight(int width)
     {
@@ -75,17 +79,17 @@ class EventLines : public QStyledItemDelegate
                          painter.fontMetrics().elidedText(text, mode, area.width()));
     }
 
-    static void drawEventText(QPainter& painter, const QRect& area,
-                              const QStyleOptionViewItem& option, const Event& event)
+    void drawEventText(QPainter& painter, const QRect& area, const QStyleOptionViewItem& option,
+                       const Event& event) const
     {
         const auto weight = event.kind == EventKind::Alert ? FontWeight::Bold : FontWeight::Regular;
         painter.setFont(systemFont(listFont().pixelSize(), weight));
-        painter.setPen(textColor(option));
+        painter.setPen(_moment && event.time > *_moment ? quiet(option) : textColor(option));
         drawText(painter, area, listText(event.text));
     }
 
-    static void drawLine(QPainter& painter, const QRect& area, const QStyleOptionViewItem& option,
-                         const Event& event)
+    void drawLine(QPainter& painter, const QRect& area, const QStyleOptionViewItem& option,
+                  const Event& event) const
     {
         const QString time = timeTextOf(event);
         const int timeWidth = measured(time, listFont()).width() + 2 * listMargin;
@@ -96,8 +100,8 @@ class EventLines : public QStyledItemDelegate
         drawEventText(painter, area.adjusted(timeWidth + kindWidth, 0, 0, 0), option, event);
     }
 
-    static void drawTwoLines(QPainter& painter, const QRect& area,
-                             const QStyleOptionViewItem& option, const Event& event)
+    void drawTwoLines(QPainter& painter, const QRect& area, const QStyleOptionViewItem& option,
+                      const Event& event) const
     {
         constexpr int margin = 5;
         const QRect upper(area.left(), area.top() + margin, area.width(), area.height() * 2 / 5);
@@ -109,6 +113,8 @@ class EventLines : public QStyledItemDelegate
                  timeTextOf(event) + QStringLiteral("   ") + listText(nameOf(event.kind)));
         drawEventText(painter, lower, option, event);
     }
+
+    std::optional<Clock::TimePoint> _moment;
 };
 
 } // namespace
@@ -121,7 +127,7 @@ class EventsView::List : public QListView
     {
         makePlain(*this);
         setModel(&model);
-        setItemDelegate(new EventLines(this));
+        setItemDelegate(_lines);
         setUniformItemSizes(true);
         setResizeMode(QListView::Adjust);
         setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
@@ -130,6 +136,7 @@ class EventsView::List : public QListView
 
     void setOnOpen(std::function<void(int row)> onOpen) { _onOpen = std::move(onOpen); }
     void setEvents(const std::deque<Event>& events);
+    void setMoment(std::optional<Clock::TimePoint> moment);
 
   protected:
     void keyPressEvent(QKeyEvent* event) override;
@@ -141,6 +148,8 @@ class EventsView::List : public QListView
     void keepInPlace(const Change& change);
 
     EventsModel& _model;
+    EventLines* _lines = new EventLines(this);
+    std::optional<Clock::TimePoint> _moment;
     std::function<void(int)> _onOpen;
 };
 
@@ -161,6 +170,18 @@ void EventsView::List::keepInPlace(const Change& change)
 void EventsView::List::setEvents(const std::deque<Event>& events)
 {
     keepInPlace([&] { _model.setEvents(events); });
+}
+
+void EventsView::List::setMoment(std::optional<Clock::TimePoint> moment)
+{
+    if (std::exchange(_moment, moment) == moment)
+        return;
+    _lines->setMoment(moment);
+    int row = 0;
+    while (moment && row < _model.rowCount() - 1 && _model.event(row).time > *moment)
+        ++row;
+    scrollTo(_model.index(row), moment ? EnsureVisible : PositionAtTop);
+    viewport()->update();
 }
 
 // Another width may make the rows higher or lower.
@@ -207,6 +228,11 @@ EventsView::~EventsView() = default;
 void EventsView::setEvents(const EventLog& log)
 {
     _list->setEvents(log.events());
+}
+
+void EventsView::setMoment(std::optional<Clock::TimePoint> moment)
+{
+    _list->setMoment(moment);
 }
 
 void EventsView::setOnEvent(std::function<void(const Event& event)> onEvent)

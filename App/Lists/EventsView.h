@@ -5,6 +5,7 @@
 #include <QWidget>
 
 #include <functional>
+#include <optional>
 
 class QListView;
 
@@ -22,6 +23,9 @@ class EventsView : public QWidget
     ~EventsView() override;
 
     void setEvents(const EventLog& log);
+    /// The moment that is shown elsewhere; none for the present. What came later is fainter, and
+    /// what happened last until then comes into view.
+    void setMoment(std::optional<Clock::TimePoint> moment);
     void setOnEvent(std::function<void(const Event& event)> onEvent);
 
     QListView& list() const;

@@ -168,6 +168,46 @@ TEST_F(EventsViewTest, ShowsAnotherLogAnew)
     EXPECT_EQ(textAt(0), "Opened");
 }
 
+TEST_F(EventsViewTest, BringsIntoViewWhatHappenedUntilTheMomentThatIsShown)
+{
+    goOn(60);
+    const auto moment = view.model().event(40).time + 500ms;
+    view.setMoment(moment);
+    EXPECT_TRUE(view.list().viewport()->rect().contains(middleOf(40)));
+    view.setMoment(std::nullopt);
+    EXPECT_EQ(atTop(), std::pair(textAt(0), 0));
+}
+
+TEST_F(EventsViewTest, WhatOneReadsStaysWhileTheMomentIsTheSame)
+{
+    goOn(60);
+    const auto moment = view.model().event(40).time;
+    view.setMoment(moment);
+    view.list().scrollToTop();
+    view.setMoment(moment);
+    EXPECT_EQ(atTop().first, textAt(0));
+}
+
+TEST_F(EventsViewTest, WhatHappenedLaterIsFainter)
+{
+    goOn(3);
+    const auto darkest = [this](int row) {
+        const QImage image = view.list()
+                                 .viewport()
+                                 ->grab(view.list().visualRect(view.model().index(row, 0)))
+                                 .toImage();
+        int lightness = 255;
+        for (int y = 0; y < image.height(); ++y)
+            for (int x = 0; x < image.width(); ++x)
+                lightness = std::min(lightness, image.pixelColor(x, y).lightness());
+        return lightness;
+    };
+    view.setMoment(view.model().event(1).time);
+    EXPECT_GT(darkest(0), darkest(1) + 30);
+    view.setMoment(view.model().event(0).time);
+    EXPECT_EQ(darkest(0), darkest(1));
+}
+
 TEST_F(EventsViewTest, ShowsAnEventOnOneLineWhereThereIsRoom)
 {
     goOn(2);

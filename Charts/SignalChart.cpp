@@ -80,6 +80,8 @@ double SignalChart::leftWidth(const TextMeasure& measure) const
 
 double SignalChart::labelWidth(const TextMeasure& measure) const
 {
+    if (_looks.labelRoom > 0)
+        return _looks.labelRoom;
     double widest = 0;
     for (const ChartLane& lane : _lanes)
         for (const std::size_t line : lane.lines)

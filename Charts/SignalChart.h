@@ -25,6 +25,7 @@ struct ChartLooks {
     QualityBands bands = {};
     std::int32_t secondsFromUtc = 0; ///< of the times' labels
     double textSize = 11;            ///< pixels
+    double labelRoom = 0;            ///< for the current values; 0: as much as they need
 };
 
 /// Lines over time, a lane for each unit, above a common axis of time: bands of quality behind,

@@ -2,6 +2,7 @@
 
 #include "Charts/SignalChart.h"
 #include "Charts/SvgCanvas.h"
+#include "Model/PinnedSeries.h"
 #include "Report/ReportNames.h"
 
 #include <algorithm>
@@ -16,7 +17,8 @@ namespace ventrik
 namespace
 {
 
-constexpr double width = 960; ///< pixels, as all heights
+constexpr double width = 960;        ///< pixels, as all heights
+constexpr double roomOfLabels = 190; // the same for all: their times stand below each other
 constexpr double heightOfLane = 130;
 constexpr double heightOfPlainLane = 62;
 constexpr double heightOfAxis = 52;
@@ -121,9 +123,8 @@ std::string ReportCharts::pictureOf(const LineGroup& group) const
 {
     std::vector<ChartLine> lines;
     for (const NumberLine* line : group.lines)
-        lines.push_back(
-            {std::string(_store.places().nameOf(line->place)), line->unit, line->points});
-    const ChartLooks looks{.secondsFromUtc = _times.secondsFromUtc()};
+        lines.push_back({nameOf(*line), line->unit, line->points});
+    const ChartLooks looks{.secondsFromUtc = _times.secondsFromUtc(), .labelRoom = roomOfLabels};
     const auto lanes = static_cast<double>(lanesOf(lines, looks.bands).size());
     const double height =
         heightOfAxis + lanes * (group.unit.empty() ? heightOfPlainLane : heightOfLane);
@@ -134,6 +135,13 @@ std::string ReportCharts::pictureOf(const LineGroup& group) const
     const ChartContent content{lines, marks, _store.firstTime(), _store.lastTime()};
     SignalChart(content, looks, width, height, canvas).draw(canvas);
     return canvas.document();
+}
+
+// A level that leaves out its sign is GSM's, by which its bands are known.
+std::string ReportCharts::nameOf(const NumberLine& line) const
+{
+    const std::string name(_store.places().nameOf(line.place));
+    return isLevelWithoutSign(_store.places().pathOf(line.place)) ? "GSM " + name : name;
 }
 
 std::string ReportCharts::sectionOf(const LineGroup& group) const
@@ -190,9 +198,9 @@ void ReportCharts::writeNotes(HtmlWriter& html) const
         note += fmt::format(" {} of them, in {} charts, are left out: those that changed least.",
                             changed - drawn, _groups.size() - _charts.size());
     if (!_charts.empty() && _cellChangeCount > 0)
-        note += fmt::format(" Upright lines: changes of the serving cell ({}).", _cellChangeCount);
+        note += fmt::format(" Marks: changes of the serving cell ({}).", _cellChangeCount);
     if (_marks.size() < _cellChangeCount)
-        note += " Those that would stand in one place are one line.";
+        note += " Those that would stand in one place are one.";
     html.element("p", note, R"(class="note")");
 }
 

@@ -50,6 +50,7 @@ class ReportCharts
     void draw();
     std::string pictureOf(const LineGroup& group) const;
     std::string titleOf(const LineGroup& group) const;
+    std::string nameOf(const NumberLine& line) const;
     std::string sectionOf(const LineGroup& group) const;
     void writeChart(HtmlWriter& html, const Chart& chart) const;
     void writeNotes(HtmlWriter& html) const;

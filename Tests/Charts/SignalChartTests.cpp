@@ -256,6 +256,15 @@ TEST_F(SignalChartTest, MarksStayWhereTheirLabelsHaveNoRoom)
         EXPECT_GE(uprightsAt(canvas, chart(600, 300).times().x(mark.time)), 1);
 }
 
+TEST_F(SignalChartTest, ARoomThatIsGivenToLabelsIsTheSameForAllNames)
+{
+    looks.labelRoom = 190;
+    addConstant("RSRP", "dBm", -90);
+    const double right = chart().plot().right();
+    addConstant("A name that would want more room than the others", "dBm", -80);
+    EXPECT_EQ(chart().plot().right(), right);
+}
+
 TEST_F(SignalChartTest, AMarkGoesAcrossTheLanes)
 {
     addConstant("RSRP", "dBm", -90);

@@ -106,8 +106,19 @@ TEST_F(ReportChartsTest, MarksChangesOfTheServingCell)
 {
     show(serving("301", "-90 dBm"));
     show(serving("302", "-80 dBm"));
-    EXPECT_THAT(page(), HasSubstr("Upright lines: changes of the serving cell (1)."));
+    EXPECT_THAT(page(), HasSubstr("Marks: changes of the serving cell (1)."));
     EXPECT_THAT(page(), HasSubstr("PCI 301 → 302"));
+}
+
+TEST_F(ReportChartsTest, NamesALevelOfGSMByWhichItsBandsAreKnown)
+{
+    for (const char* level : {"54", "60"})
+        show(PlistDictionary{
+            {"Serving Cell",
+             PlistDictionary{{"GSM Serving Cell", PlistDictionary{{"RSSI", level}, {"BCC", "a"}}},
+                             {"More", "b"}}}});
+    EXPECT_THAT(page(), HasSubstr(">GSM RSSI</text>"));
+    EXPECT_THAT(page(), HasSubstr(">excellent</text>"));
 }
 
 TEST_F(ReportChartsTest, EscapesNames)

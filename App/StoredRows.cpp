@@ -2,6 +2,7 @@
 
 #include "Capture/RowWriter.h"
 
+#include <memory>
 #include <optional>
 #include <vector>
 
@@ -47,11 +48,11 @@ class RowsOfChanges : public StoreVisitor
     std::string _text;
     std::vector<std::string> _placeParts; // of values, by place
     std::string _technology;
-    std::optional<RowWriter> _writer; // of that technology
+    std::unique_ptr<RowWriter> _writer; // of that technology
     // Of the record that the last row told of.
     std::optional<std::uint64_t> _record;
     std::uint32_t _logCode = 0;
-    std::string _recordPart;
+    RecordPart _recordPart;
 };
 
 void RowsOfChanges::changed(const StoredChange& change)
@@ -60,7 +61,7 @@ void RowsOfChanges::changed(const StoredChange& change)
         return;
     if (_record != change.record || _logCode != change.logCode)
         useRecordOf(change);
-    _text += _recordPart;
+    _text += _recordPart.front;
     if (change.kind == DisplayChange::Kind::Shown) {
         std::string& part = _placeParts[change.place];
         if (part.empty())
@@ -70,6 +71,7 @@ void RowsOfChanges::changed(const StoredChange& change)
         _text += placePart(change);
     }
     addValue(change);
+    _text += _recordPart.back;
     if (_text.size() >= blockSize)
         flush();
 }
@@ -86,7 +88,7 @@ void RowsOfChanges::useTechnologyOf(const StoredChange& change)
     if (_writer && technology == _technology)
         return;
     _technology = technology;
-    _writer.emplace(format, _capture, technology);
+    _writer = RowWriter::create(format, _capture, technology);
 }
 
 void RowsOfChanges::useRecordOf(const StoredChange& change)

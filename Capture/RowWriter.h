@@ -3,13 +3,12 @@
 #include "Packets/RecordCensus.h"
 #include "Platform/Clock.h"
 
-#include <chrono>
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace ventrik
 {
@@ -60,65 +59,35 @@ struct RowClosing {
     std::uint64_t bytes = 0; ///< of the records
 };
 
-/// Writes the rows of one capture. A row is the parts of its record, its place and its value, one
-/// behind the other, of a point the record behind the others: whoever has many rows keeps the parts
-/// that they share.
+/// What a row tells of its record: what its first columns are in one format is its end in another.
+struct RecordPart {
+    std::string_view front = {};
+    std::string_view back = {};
+};
+
+/// Writes the rows of one capture, one kind of them for each format. A row is the front of its
+/// record's part, its place, its value and the back of its record's part, one behind the other:
+/// whoever has many rows keeps the parts that they share.
 class RowWriter
 {
   public:
     /// The technology is empty where it is not known.
-    RowWriter(RowFormat format, std::string_view capture, std::string_view technology);
+    static std::unique_ptr<RowWriter> create(RowFormat format, std::string_view capture,
+                                             std::string_view technology);
 
-    bool isRecordLast() const { return _format == RowFormat::Influx; }
+    virtual ~RowWriter() = default;
+    RowWriter(const RowWriter&) = delete;
+    RowWriter& operator=(const RowWriter&) = delete;
 
-    /// The columns from the first one to the record's layout; of a point its time. It lives until
-    /// the next one.
-    std::string_view recordPart(const RowRecord& record);
-    /// Those of a value's place.
-    std::string placePart(const RowPlace& place) const;
-    /// Adds the others, and the line's end.
-    void addValue(std::string& row, const RowValue& value) const;
+    /// It lives until the next one.
+    virtual RecordPart recordPart(const RowRecord& record) = 0;
+    virtual std::string placePart(const RowPlace& place) const = 0;
+    /// Adds the part that tells the value.
+    virtual void addValue(std::string& row, const RowValue& value) const = 0;
+    virtual void appendClosing(std::string& rows, const RowClosing& closing) const = 0;
 
-    void appendClosing(std::string& rows, const RowClosing& closing) const;
-
-  private:
-    /// The columns that tell the kind of a record, behind the end of the time.
-    struct KindPart {
-        std::optional<std::uint32_t> subscription;
-        std::optional<RecordKind> kind;
-        std::string text;       ///< empty: nothing yet
-        std::size_t serial = 0; ///< another text has another one
-    };
-
-    bool isJson() const { return _format == RowFormat::JsonLines; }
-    bool isPoint() const { return _format == RowFormat::Influx; }
-    std::string_view timePart(Clock::TimePoint time);
-    std::string tagsOf(const RowPlace& place) const;
-    void addFields(std::string& point, const RowValue& value) const;
-    void appendClosingPoint(std::string& rows, const RowClosing& closing) const;
-    const KindPart& kindPart(const RowRecord& record);
-    /// A column's name, in JSON, and a text. Names come as `,"name":`.
-    void addText(std::string& row, std::string_view column, std::string_view text) const;
-    void addNull(std::string& row, std::string_view column) const;
-    void addTextOrNull(std::string& row, std::string_view column, std::string_view text) const;
-    /// A number, or a text that needs no quotes in CSV and is one in JSON.
-    template <typename Number>
-    void addNumber(std::string& row, std::string_view column, const Number& number) const;
-    void addName(std::string& row, std::string_view column) const;
-
-    RowFormat _format;
-    std::string _capture; // the column of that name
-    std::string _technology;
-    std::string _csvEnd;              // of a row
-    std::vector<KindPart> _kindParts; // each where its kind leads
-    std::string _recordPart;          // of the last record; empty while there is none
-    std::chrono::sys_seconds _second{};
-    std::string _secondPart;      // of that second; empty while there is none
-    std::size_t _kind = 0;        // its part's serial
-    std::size_t _lastKind = 0;    // that was given
-    std::size_t _numberStart = 0; // of what changes in that part
-    std::size_t _numberSize = 0;
-    std::size_t _fractionStart = 0;
+  protected:
+    RowWriter() = default;
 };
 
 } // namespace ventrik

@@ -26,7 +26,7 @@ CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
       _records(records),
       _generator(generator),
       _changes(generator),
-      _writer(options.format, capture, technology.name),
+      _writer(RowWriter::create(options.format, capture, technology.name)),
       _wanted(generator.getStartCommand())
 {
     _values.resize(std::size_t{1} << knownValueBits);
@@ -72,23 +72,20 @@ void CaptureRows::finish(const PlistDictionary& state)
 void CaptureRows::close(const RowClosing& closing)
 {
     std::string row;
-    _writer.appendClosing(row, closing);
-    append(row, {}, {});
+    _writer->appendClosing(row, closing);
+    append({}, {}, row);
 }
 
-void CaptureRows::append(std::string_view recordPart, std::string_view placePart,
+void CaptureRows::append(const RecordPart& recordPart, std::string_view placePart,
                          std::string_view valuePart)
 {
-    const std::size_t size = _used + recordPart.size() + placePart.size() + valuePart.size();
+    const std::size_t size = _used + recordPart.front.size() + placePart.size() + valuePart.size() +
+                             recordPart.back.size();
     if (size > _text.size())
         _text.resize(std::max(2 * size, firstRoom));
     char* end = _text.data() + _used;
-    if (!_writer.isRecordLast())
-        end = std::copy_n(recordPart.data(), recordPart.size(), end);
-    end = std::copy_n(placePart.data(), placePart.size(), end);
-    end = std::copy_n(valuePart.data(), valuePart.size(), end);
-    if (_writer.isRecordLast())
-        std::copy_n(recordPart.data(), recordPart.size(), end);
+    for (const std::string_view part : {recordPart.front, placePart, valuePart, recordPart.back})
+        end = std::copy_n(part.data(), part.size(), end);
     _used = size;
 }
 
@@ -111,11 +108,11 @@ void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictio
     if (!std::exchange(_hasDisplay, true)) {
         // It also shows what no record told.
         for (const DisplayChange& change : changes)
-            writeRow(_writer.recordPart(_changes.cellAt(*change.place, state) ? record : none),
+            writeRow(_writer->recordPart(_changes.cellAt(*change.place, state) ? record : none),
                      change, state);
         return;
     }
-    const std::string_view part = _writer.recordPart(record);
+    const RecordPart part = _writer->recordPart(record);
     for (const DisplayChange& change : changes)
         writeRow(part, change, state);
 }
@@ -123,13 +120,13 @@ void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictio
 void CaptureRows::writeState(Clock::TimePoint time, const PlistDictionary& state)
 {
     _changes.take(state);
-    const std::string_view part =
-        _writer.recordPart({_closing.records == 0 ? 0 : _closing.records - 1, time, {}, {}});
+    const RecordPart part =
+        _writer->recordPart({_closing.records == 0 ? 0 : _closing.records - 1, time, {}, {}});
     for (const DisplayPlace* place : _changes.values())
         writeRow(part, {DisplayChange::Kind::Shown, place}, state);
 }
 
-void CaptureRows::writeRow(std::string_view recordPart, const DisplayChange& change,
+void CaptureRows::writeRow(const RecordPart& recordPart, const DisplayChange& change,
                            const PlistDictionary& state)
 {
     if (change.kind != DisplayChange::Kind::Shown)
@@ -160,13 +157,13 @@ std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& cell, st
     known.workedOut = cell ? cell->workedOut : std::nullopt;
     known.text = text;
     known.part.clear();
-    _writer.addValue(known.part, cell ? RowValue{cell->number(), field->shown.unit, text}
-                                      : RowValue{plainNumber(text), {}, text});
+    _writer->addValue(known.part, cell ? RowValue{cell->number(), field->shown.unit, text}
+                                       : RowValue{plainNumber(text), {}, text});
     return known.part;
 }
 
 // What goes takes with it what is below.
-void CaptureRows::writeHolder(std::string_view recordPart, const DisplayChange& change,
+void CaptureRows::writeHolder(const RecordPart& recordPart, const DisplayChange& change,
                               const PlistDictionary& state)
 {
     const bool isGone = change.kind == DisplayChange::Kind::Gone;
@@ -176,9 +173,9 @@ void CaptureRows::writeHolder(std::string_view recordPart, const DisplayChange& 
         return;
     const std::string path = isGone ? description.path : description.path + "/";
     const std::string part =
-        _writer.placePart({description.section, path, description.index, description.name});
+        _writer->placePart({description.section, path, description.index, description.name});
     std::string value;
-    _writer.addValue(value, isGone ? RowValue{} : RowValue{.text = std::string_view()});
+    _writer->addValue(value, isGone ? RowValue{} : RowValue{.text = std::string_view()});
     append(recordPart, part, value);
     ++_closing.rows;
 }
@@ -202,7 +199,7 @@ void CaptureRows::describe(KnownPlace& known, const DisplayPlace& place,
     known.serial = place.serial;
     known.isSelected = _options.selection.selects(description.path);
     if (known.isSelected)
-        known.part = _writer.placePart(
+        known.part = _writer->placePart(
             {description.section, description.path, description.index, description.name});
 }
 

@@ -9,6 +9,7 @@
 #include "Platform/Technology.h"
 
 #include <chrono>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -67,13 +68,13 @@ class CaptureRows
     };
 
     std::optional<RecordKind> kindOf(const CapturedMessage& message) const;
-    void append(std::string_view recordPart, std::string_view placePart,
+    void append(const RecordPart& recordPart, std::string_view placePart,
                 std::string_view valuePart);
     void writeChanges(const CapturedMessage& message, const PlistDictionary& state);
     void writeState(Clock::TimePoint time, const PlistDictionary& state);
-    void writeRow(std::string_view recordPart, const DisplayChange& change,
+    void writeRow(const RecordPart& recordPart, const DisplayChange& change,
                   const PlistDictionary& state);
-    void writeHolder(std::string_view recordPart, const DisplayChange& change,
+    void writeHolder(const RecordPart& recordPart, const DisplayChange& change,
                      const PlistDictionary& state);
     std::string_view valuePart(const std::optional<ShownCell>& cell, std::string_view text);
     const KnownPlace& knownPlace(const DisplayPlace& place, const PlistDictionary& state);
@@ -83,7 +84,7 @@ class CaptureRows
     RecordsMode _records;
     const LogGenerator& _generator;
     DisplayChanges _changes;
-    RowWriter _writer;
+    std::unique_ptr<RowWriter> _writer;
     std::string _text; // with room behind what is used, so that rows need not make some
     std::size_t _used = 0;
     RowClosing _closing;

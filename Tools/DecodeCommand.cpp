@@ -407,8 +407,8 @@ int refuse(const DecodeOptions& options, const std::string& reason, int status, 
     complain(reason);
     if (options.format == DecodeFormat::Rows) {
         std::string row;
-        RowWriter(options.rows.format, options.capture, {})
-            .appendClosing(row, {.status = "damaged", .reason = reason});
+        RowWriter::create(options.rows.format, options.capture, {})
+            ->appendClosing(row, {.status = "damaged", .reason = reason});
         std::fwrite(row.data(), 1, row.size(), output);
     }
     return status;

@@ -56,7 +56,7 @@ void LiveRows::endRows()
 void LiveRows::close()
 {
     endRows();
-    RowWriter(_options.format, captureName, {}).appendClosing(_text, _closing);
+    RowWriter::create(_options.format, captureName, {})->appendClosing(_text, _closing);
 }
 
 } // namespace ventrik

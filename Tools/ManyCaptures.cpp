@@ -172,7 +172,8 @@ class Jobs
         closing.status = "damaged";
         closing.reason = reason;
         std::string row;
-        RowWriter(_options.decode.rows.format, job.capture, {}).appendClosing(row, closing);
+        RowWriter::create(_options.decode.rows.format, job.capture, {})
+            ->appendClosing(row, closing);
         take(DecodeStatus::badInput);
         return std::fwrite(row.data(), 1, row.size(), _output) == row.size() || !failOutput();
     }

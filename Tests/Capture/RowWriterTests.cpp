@@ -24,10 +24,10 @@ class RowWriterTest : public testing::Test
     static std::string rowOf(RowFormat format, const RowRecord& record, const RowPlace& place,
                              const RowValue& value)
     {
-        RowWriter writer(format, "drive, \"one\".pcap", "lte");
-        const std::string ofRecord(writer.recordPart(record));
-        const std::string rest = writer.placePart(place) + valueOf(writer, value);
-        return writer.isRecordLast() ? rest + ofRecord : ofRecord + rest;
+        const auto writer = RowWriter::create(format, "drive, \"one\".pcap", "lte");
+        const RecordPart part = writer->recordPart(record);
+        return std::string(part.front) + writer->placePart(place) + valueOf(*writer, value) +
+               std::string(part.back);
     }
     static std::string valueOf(const RowWriter& writer, const RowValue& value)
     {
@@ -38,7 +38,7 @@ class RowWriterTest : public testing::Test
     static std::string closingOf(RowFormat format, const RowClosing& closing)
     {
         std::string row;
-        RowWriter(format, "drive.pcap", "lte").appendClosing(row, closing);
+        RowWriter::create(format, "drive.pcap", "lte")->appendClosing(row, closing);
         return row;
     }
     /// A row of a value with a number.
@@ -183,54 +183,57 @@ TEST_F(RowWriterTest, HasATableWithAsManyNamesAsFields)
 {
     const auto commas = [](const std::string& line) { return std::ranges::count(line, ','); };
     const auto inHeading = commas(rowHeading(RowFormat::Csv));
-    RowWriter writer(RowFormat::Csv, "c", "lte");
-    EXPECT_EQ(commas(std::string(writer.recordPart(wholeRecord)) + writer.placePart(wholePlace) +
-                     valueOf(writer, wholeValue)),
+    const auto writer = RowWriter::create(RowFormat::Csv, "c", "lte");
+    EXPECT_EQ(commas(std::string(writer->recordPart(wholeRecord).front) +
+                     writer->placePart(wholePlace) + valueOf(*writer, wholeValue)),
               inHeading);
     EXPECT_EQ(commas(closingOf(RowFormat::Csv, {"ok"})), inHeading);
 }
 
 TEST_F(RowWriterTest, TellsARecordBehindAnother)
 {
-    RowWriter writer(RowFormat::Csv, "c", "lte");
-    EXPECT_EQ(writer.recordPart({0, moment, 1U, RecordKind{0xB17F, 3, 33, LayoutKind::Base}}),
-              "c,0,2001-09-09T01:46:40.000250Z,1,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({1, moment + 2s, 2U, RecordKind{0xB17F, 3, 33, LayoutKind::Base}}),
-              "c,1,2001-09-09T01:46:42.000250Z,2,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({2, moment, {}, RecordKind{0xB17F, 4, 33, LayoutKind::NotKnown}}),
-              "c,2,2001-09-09T01:46:40.000250Z,,lte,0xB17F,4,not known");
+    const auto writer = RowWriter::create(RowFormat::Csv, "c", "lte");
+    EXPECT_EQ(
+        writer->recordPart({0, moment, 1U, RecordKind{0xB17F, 3, 33, LayoutKind::Base}}).front,
+        "c,0,2001-09-09T01:46:40.000250Z,1,lte,0xB17F,3,base");
+    EXPECT_EQ(
+        writer->recordPart({1, moment + 2s, 2U, RecordKind{0xB17F, 3, 33, LayoutKind::Base}}).front,
+        "c,1,2001-09-09T01:46:42.000250Z,2,lte,0xB17F,3,base");
+    EXPECT_EQ(
+        writer->recordPart({2, moment, {}, RecordKind{0xB17F, 4, 33, LayoutKind::NotKnown}}).front,
+        "c,2,2001-09-09T01:46:40.000250Z,,lte,0xB17F,4,not known");
 }
 
 TEST_F(RowWriterTest, TellsEachRecordAnewThatIsMuchLikeTheLast)
 {
     const RecordKind kind{0xB17F, 3, 33, LayoutKind::Base};
-    RowWriter writer(RowFormat::Csv, "c", "lte");
-    EXPECT_EQ(writer.recordPart({9, moment, 1U, kind}),
+    const auto writer = RowWriter::create(RowFormat::Csv, "c", "lte");
+    EXPECT_EQ(writer->recordPart({9, moment, 1U, kind}).front,
               "c,9,2001-09-09T01:46:40.000250Z,1,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({10, moment + 1us, 1U, kind}),
+    EXPECT_EQ(writer->recordPart({10, moment + 1us, 1U, kind}).front,
               "c,10,2001-09-09T01:46:40.000251Z,1,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({11, moment + 999ms, 1U, kind}),
+    EXPECT_EQ(writer->recordPart({11, moment + 999ms, 1U, kind}).front,
               "c,11,2001-09-09T01:46:40.999250Z,1,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({12, moment + 1s, 1U, kind}),
+    EXPECT_EQ(writer->recordPart({12, moment + 1s, 1U, kind}).front,
               "c,12,2001-09-09T01:46:41.000250Z,1,lte,0xB17F,3,base");
-    EXPECT_EQ(writer.recordPart({12, moment + 1s, 2U, kind}),
+    EXPECT_EQ(writer->recordPart({12, moment + 1s, 2U, kind}).front,
               "c,12,2001-09-09T01:46:41.000250Z,2,lte,0xB17F,3,base");
 }
 
 // More kinds than are kept take each other's place.
 TEST_F(RowWriterTest, TellsRecordsOfManyKinds)
 {
-    RowWriter writer(RowFormat::Csv, "c", "lte");
+    const auto writer = RowWriter::create(RowFormat::Csv, "c", "lte");
     for (int round = 0; round < 2; ++round)
         for (std::uint32_t code = 0x1000; code < 0x1400; ++code)
-            EXPECT_EQ(writer.recordPart({7, moment, {}, RecordKind{code, {}, 33, {}}}),
+            EXPECT_EQ(writer->recordPart({7, moment, {}, RecordKind{code, {}, 33, {}}}).front,
                       fmt::format("c,7,2001-09-09T01:46:40.000250Z,,lte,0x{:04X},,", code));
 }
 
 TEST_F(RowWriterTest, TellsTimesBefore1970)
 {
-    RowWriter writer(RowFormat::Csv, "c", "lte");
-    EXPECT_EQ(writer.recordPart({0, Clock::TimePoint(-1us)}),
+    const auto writer = RowWriter::create(RowFormat::Csv, "c", "lte");
+    EXPECT_EQ(writer->recordPart({0, Clock::TimePoint(-1us)}).front,
               "c,0,1969-12-31T23:59:59.999999Z,,lte,,,");
 }
 

@@ -189,7 +189,9 @@ class Decoding
             ++_oversizedCount;
         else if (_capture)
             _capture->write(message.time, message.data);
-        if (_options.records != RecordsMode::Extended && message.data.size() >= logPacketHeaderSize)
+        const bool mayBeExtension =
+            _options.records != RecordsMode::Extended && !_decoder.generator().lastRead();
+        if (mayBeExtension && message.data.size() >= logPacketHeaderSize)
             _extensionCount += isExtensionOnly(LogPacket(stripPrefix(message.data))) ? 1 : 0;
     }
 

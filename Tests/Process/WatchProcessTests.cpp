@@ -9,6 +9,7 @@ namespace ventrik
 namespace
 {
 
+using testing::AllOf;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::StartsWith;
@@ -90,6 +91,31 @@ TEST_F(WatchProcess, WritesMetricsAlsoWhenTheServiceIsGone)
     EXPECT_TRUE(holds("ventrik_channel_open 0\n"));
     watch->send(SIGTERM);
     EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+}
+
+TEST_F(WatchProcess, OnceLeavesTheMetricsOfTheTreeThatItPrints)
+{
+    const auto capture = PcapBytes(lteLinkType)
+                             .record(captureStart, 0, cellInfoMessage(301))
+                             .record(captureStart, 1, cellInfoMessage(302));
+    const auto service = startReplay("cells.pcap", capture.bytes());
+    const auto watch = start("ventrik-watch", {"--once", "--metrics-file", path("metrics")});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("    Physical Cell ID: 302\n"));
+    EXPECT_THAT(readFile(path("metrics")),
+                AllOf(HasSubstr("path=\"/Serving Cell Info/Physical Cell ID\"} 302\n"),
+                      HasSubstr("\nventrik_channel_messages_total 2\n")));
+}
+
+TEST_F(WatchProcess, OncePrintsItsTreeAlsoWhereNoMetricsCanBeWrittenAndSaysSo)
+{
+    const auto service = startScenario();
+    const auto watch =
+        start("ventrik-watch", {"--once", "--metrics-file", path("nowhere/metrics")});
+    EXPECT_EQ(watch->waitForEnd(), 0) << watch->errors();
+    EXPECT_THAT(watch->output(), HasSubstr("\n  Serving Cell Info\n"));
+    EXPECT_EQ(watch->errors(),
+              "ventrik-watch: " + path("nowhere/metrics") + ": No such file or directory\n");
 }
 
 TEST_F(WatchProcess, PrintsPointsWhereThatIsAskedFor)

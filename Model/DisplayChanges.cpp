@@ -36,14 +36,14 @@ std::string_view shownText(const PlistValue& value)
     return value.string() ? std::string_view(*value.string()) : notText;
 }
 
-const PlistValue& valueAt(const PlistArray& array, std::size_t index)
+const PlistValue& valueOf(const PlistValue& element)
 {
-    return array[index];
+    return element;
 }
 
-const PlistValue& valueAt(const PlistDictionary& dictionary, std::size_t place)
+const PlistValue& valueOf(const PlistDictionary::Entry& entry)
 {
-    return dictionary.entryAt(place)->value;
+    return entry.value;
 }
 
 std::string_view nameOf(const DisplayPlace& place)
@@ -124,8 +124,8 @@ std::span<const DisplayChange> DisplayChanges::take(const PlistDictionary& state
     }
     _log->takeInto(_tokens);
     for (const std::size_t token : _tokens)
-        if (_groups[token].isUsed)
-            compare(_groups[token]);
+        if (DisplayGroup& group = _groups[token]; group.isUsed)
+            compare(group);
     return _changes;
 }
 
@@ -153,36 +153,51 @@ void DisplayChanges::prepareForChanges()
 
 void DisplayChanges::compare(DisplayGroup& group)
 {
-    if (auto array = group.container.array())
+    if (!group.isList) {
+        if (auto dictionary = group.container.dictionary())
+            compareWith(group, *dictionary);
+    } else if (auto array = group.container.array()) {
         compareWith(group, *array);
-    else if (auto dictionary = group.container.dictionary())
-        compareWith(group, *dictionary);
+    }
 }
 
 template <typename Container>
 void DisplayChanges::compareWith(DisplayGroup& group, Container& container)
 {
-    std::vector<std::size_t> entries = std::exchange(_entries, {});
-    const bool isNew = std::exchange(group.isNew, false);
-    const bool areOnlyValues = !isNew && container.watch().takeOnlyValuesChanged(entries);
-    container.watch().add(_log, group.token);
-    if (areOnlyValues && !group.hasDoubles)
-        compareValues(group, container, entries);
+    ContainerWatch& watch = container.watch();
+    const auto* places = group.isNew ? nullptr : watch.changedValues();
+    group.isNew = false;
+    if (places && !group.hasDoubles)
+        compareValues(group, container, *places);
     else
         compareAll(group, container);
-    _entries = std::move(entries);
+    watch.add(_log, group.token);
+}
+
+// Nearly all changes are of one text to another.
+inline void DisplayChanges::compareValue(DisplayGroup::Entry& entry, const PlistValue& value,
+                                         bool isNew)
+{
+    const std::string* text = value.string();
+    if (!text || entry.group || isNew)
+        return compareAnyValue(entry, value, isNew);
+    if (entry.place->text == *text)
+        return;
+    keepText(entry.place->text, *text);
+    add(DisplayChange::Kind::Shown, *entry.place);
 }
 
 template <typename Container>
 void DisplayChanges::compareValues(DisplayGroup& group, const Container& container,
-                                   const std::vector<std::size_t>& entries)
+                                   const std::vector<std::size_t>& places)
 {
-    for (const std::size_t place : entries) {
+    const auto* const values = container.begin();
+    for (const std::size_t place : places) {
         if (group.isSorted && place == group.markerPlace)
             continue;
         const std::size_t entry = place - (group.isSorted && place > group.markerPlace ? 1 : 0);
         if (entry < group.entries.size())
-            compareValue(group.entries[entry], valueAt(container, place), false);
+            compareValue(group.entries[entry], valueOf(values[place]), false);
     }
 }
 
@@ -306,7 +321,8 @@ void DisplayChanges::noteOrder(const std::vector<DisplayGroup::Entry>& former,
         _isReordered = true;
 }
 
-void DisplayChanges::compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew)
+void DisplayChanges::compareAnyValue(DisplayGroup::Entry& entry, const PlistValue& value,
+                                     bool isNew)
 {
     if (isContainer(value))
         return compareContainer(entry, value, isNew);
@@ -418,11 +434,6 @@ void DisplayChanges::release(DisplayGroup& group)
     _goneGroups.push_back(group.token);
 }
 
-void DisplayChanges::add(DisplayChange::Kind kind, const DisplayPlace& place)
-{
-    _changes.push_back({kind, &place});
-}
-
 std::vector<const DisplayGroup::Entry*> DisplayChanges::entries() const
 {
     std::vector<const DisplayGroup::Entry*> entries;
@@ -474,15 +485,12 @@ DisplayPlaceDescription DisplayChanges::describe(const DisplayPlace& place,
     return {std::move(path), std::string(nameOf(place)), std::move(section), indexOf(place)};
 }
 
-std::optional<ShownCell> DisplayChanges::cellAt(const DisplayPlace& place,
-                                                const PlistDictionary& state) const
+bool DisplayChanges::findCell(const DisplayPlace& place, const PlistDictionary& state) const
 {
-    if (!place.cell) {
-        place.cell = _generator.cellPlaceAt(state, keysOf(place));
-        if (place.cell)
-            place.cell->key = place.key;
-    }
-    return place.cell ? _generator.cellAt(*place.cell) : std::nullopt;
+    place.cell = _generator.cellPlaceAt(state, keysOf(place));
+    if (place.cell)
+        place.cell->key = place.key;
+    return place.cell.has_value();
 }
 
 } // namespace ventrik

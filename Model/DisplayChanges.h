@@ -102,7 +102,10 @@ class DisplayChanges
 
     DisplayPlaceDescription describe(const DisplayPlace& place, const PlistDictionary& state) const;
     /// What a value shows, before the next message is decoded; none where no field does.
-    std::optional<ShownCell> cellAt(const DisplayPlace& place, const PlistDictionary& state) const;
+    std::optional<ShownCell> cellAt(const DisplayPlace& place, const PlistDictionary& state) const
+    {
+        return place.cell || findCell(place, state) ? _generator.cellAt(*place.cell) : std::nullopt;
+    }
 
   private:
     void compare(DisplayGroup& group);
@@ -112,7 +115,7 @@ class DisplayChanges
     void compareWith(DisplayGroup& group, Container& container);
     template <typename Container>
     void compareValues(DisplayGroup& group, const Container& container,
-                       const std::vector<std::size_t>& entries);
+                       const std::vector<std::size_t>& places);
     void compareAll(DisplayGroup& group, const PlistArray& array);
     void compareAll(DisplayGroup& group, const PlistDictionary& dictionary);
     void findDoubles(DisplayGroup& group) const;
@@ -122,6 +125,7 @@ class DisplayChanges
     void noteOrder(const std::vector<DisplayGroup::Entry>& former, const DisplayGroup& group,
                    const std::vector<bool>& areNew);
     void compareValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
+    void compareAnyValue(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void compareContainer(DisplayGroup::Entry& entry, const PlistValue& value, bool isNew);
     void goBeforeAnotherKind(const DisplayPlace& place);
     void follow(DisplayGroup& group, const PlistValue& container);
@@ -131,7 +135,12 @@ class DisplayChanges
     void remove(const DisplayGroup::Entry& entry);
     void release(const DisplayGroup::Entry& entry);
     void release(DisplayGroup& group);
-    void add(DisplayChange::Kind kind, const DisplayPlace& place);
+    void add(DisplayChange::Kind kind, const DisplayPlace& place)
+    {
+        _changes.push_back({kind, &place});
+    }
+    /// Where to look for what the value shows; false where that is not known yet.
+    bool findCell(const DisplayPlace& place, const PlistDictionary& state) const;
     /// The way to a place, from the outside in; lives until it is asked for another one.
     std::span<const std::string_view> keysOf(const DisplayPlace& place) const;
 
@@ -152,9 +161,8 @@ class DisplayChanges
     bool _isReordered = false;
 
     mutable std::vector<std::string_view> _keys;
-    std::vector<std::size_t> _entries; // room for those that changed
-    std::vector<std::size_t> _tokens;  // likewise
-    std::size_t _displayPlace = 0;     // in the state, as far as is known
+    std::vector<std::size_t> _tokens; // room for those of the groups that changed
+    std::size_t _displayPlace = 0;    // in the state, as far as is known
 };
 
 } // namespace ventrik

@@ -57,15 +57,13 @@ class ContainerWatch
             std::erase(_watching->tokens, token);
     }
 
-    /// Whether nothing but values changed, and the places of those, some of them more than once;
-    /// they are told but once. Of what stands at several places that is not known.
-    bool takeOnlyValuesChanged(std::vector<std::size_t>& entries)
+    /// The places of the values that changed, some of them more than once, until it is added anew;
+    /// null where more than values changed. Of what stands at several places that is not known.
+    const std::vector<std::size_t>* changedValues() const
     {
-        entries.clear();
-        if (!_watching || _watching->haveAllChanged || _watching->tokens.size() != 1)
-            return false;
-        entries.swap(_watching->entries);
-        return true;
+        const bool areKnown =
+            _watching && !_watching->haveAllChanged && _watching->tokens.size() == 1;
+        return areKnown ? &_watching->entries : nullptr;
     }
 
     /// The container changes.

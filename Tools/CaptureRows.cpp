@@ -1,6 +1,7 @@
 #include "Tools/CaptureRows.h"
 
 #include <algorithm>
+#include <cstring>
 #include <functional>
 #include <utility>
 
@@ -15,7 +16,27 @@ namespace
 constexpr std::size_t maximumKnownPlaces = 65536;
 constexpr std::size_t firstRoom = 4096;
 constexpr unsigned knownValueBits = 13;
-constexpr unsigned knownValueShift = 64 - knownValueBits;
+
+// Fields lie side by side and their numbers are small: each is spread by itself, so that the sums
+// of no two of them meet.
+std::size_t placeOf(const ShownCell& shown)
+{
+    constexpr std::uint64_t spreadsFields = 0x9E3779B97F4A7C15U;
+    constexpr std::uint64_t spreadsNumbers = 0xC2B2AE3D27D4EB4FU;
+    return (std::hash<const Field*>{}(shown.field) * spreadsFields +
+            static_cast<std::uint64_t>(shown.raw) * spreadsNumbers) >>
+           (64 - knownValueBits);
+}
+
+// Most texts are short: their bytes are number enough.
+std::int64_t hashOf(std::string_view text)
+{
+    std::int64_t number = 0;
+    if (text.size() > sizeof(number))
+        return static_cast<std::int64_t>(std::hash<std::string_view>{}(text));
+    std::memcpy(&number, text.data(), text.size());
+    return number;
+}
 
 } // namespace
 
@@ -30,6 +51,61 @@ CaptureRows::CaptureRows(const RowOptions& options, std::string_view capture,
       _wanted(generator.getStartCommand())
 {
     _values.resize(std::size_t{1} << knownValueBits);
+}
+
+// Every row goes this way; the compiler makes one function of it.
+
+inline void CaptureRows::append(const RecordPart& recordPart, std::string_view placePart,
+                                std::string_view valuePart)
+{
+    const std::size_t size = _used + recordPart.front.size() + placePart.size() + valuePart.size() +
+                             recordPart.back.size();
+    if (size > _text.size())
+        _text.resize(std::max(2 * size, firstRoom));
+    char* end = _text.data() + _used;
+    end = std::copy_n(recordPart.front.data(), recordPart.front.size(), end);
+    end = std::copy_n(placePart.data(), placePart.size(), end);
+    end = std::copy_n(valuePart.data(), valuePart.size(), end);
+    std::copy_n(recordPart.back.data(), recordPart.back.size(), end);
+    _used = size;
+}
+
+inline const CaptureRows::KnownPlace& CaptureRows::knownPlace(const DisplayPlace& place,
+                                                              const PlistDictionary& state)
+{
+    const bool isKept = place.number < maximumKnownPlaces;
+    if (isKept && place.number >= _places.size())
+        _places.resize(place.number + 1);
+    KnownPlace& known = isKept ? _places[place.number] : _otherPlace;
+    if (known.serial != place.serial)
+        describe(known, place, state);
+    return known;
+}
+
+// Values come again and again. Two that lead to one place stand side by side.
+inline std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& cell,
+                                               std::string_view text)
+{
+    const ShownCell shown = cell ? *cell : ShownCell{nullptr, hashOf(text)};
+    const std::size_t place = placeOf(shown);
+    for (const std::size_t known : {place, place ^ 1})
+        if (_values[known].isOf(shown, text))
+            return _values[known].part;
+    return keepValue(_values[_values[place].part.empty() ? place : place ^ 1], shown, text);
+}
+
+void CaptureRows::writeRow(const RecordPart& recordPart, const DisplayChange& change,
+                           const PlistDictionary& state)
+{
+    if (change.kind != DisplayChange::Kind::Shown)
+        return writeHolder(recordPart, change, state);
+    const KnownPlace& known = knownPlace(*change.place, state);
+    if (!known.isSelected)
+        return;
+    const std::string_view value =
+        valuePart(_changes.cellAt(*change.place, state), change.place->text);
+    append(recordPart, known.part, value);
+    ++_closing.rows;
 }
 
 void CaptureRows::runStepsBefore(Clock::TimePoint time, const PlistDictionary& state)
@@ -76,19 +152,6 @@ void CaptureRows::close(const RowClosing& closing)
     append({}, {}, row);
 }
 
-void CaptureRows::append(const RecordPart& recordPart, std::string_view placePart,
-                         std::string_view valuePart)
-{
-    const std::size_t size = _used + recordPart.front.size() + placePart.size() + valuePart.size() +
-                             recordPart.back.size();
-    if (size > _text.size())
-        _text.resize(std::max(2 * size, firstRoom));
-    char* end = _text.data() + _used;
-    for (const std::string_view part : {recordPart.front, placePart, valuePart, recordPart.back})
-        end = std::copy_n(part.data(), part.size(), end);
-    _used = size;
-}
-
 // The generator knows it as a rule.
 std::optional<RecordKind> CaptureRows::kindOf(const CapturedMessage& message) const
 {
@@ -102,19 +165,23 @@ void CaptureRows::writeChanges(const CapturedMessage& message, const PlistDictio
     const auto changes = _changes.take(state);
     if (changes.empty())
         return;
-    const RowRecord none{_closing.records, message.time, message.subscription, {}};
-    RowRecord record = none;
-    record.kind = kindOf(message);
-    if (!std::exchange(_hasDisplay, true)) {
-        // It also shows what no record told.
-        for (const DisplayChange& change : changes)
-            writeRow(_writer->recordPart(_changes.cellAt(*change.place, state) ? record : none),
-                     change, state);
-        return;
-    }
+    const RowRecord record{_closing.records, message.time, message.subscription, kindOf(message)};
+    if (!std::exchange(_hasDisplay, true))
+        return writeFirst(record, changes, state);
     const RecordPart part = _writer->recordPart(record);
     for (const DisplayChange& change : changes)
         writeRow(part, change, state);
+}
+
+// The first display also shows what no record told.
+void CaptureRows::writeFirst(const RowRecord& record, std::span<const DisplayChange> changes,
+                             const PlistDictionary& state)
+{
+    RowRecord none = record;
+    none.kind.reset();
+    for (const DisplayChange& change : changes)
+        writeRow(_writer->recordPart(_changes.cellAt(*change.place, state) ? record : none), change,
+                 state);
 }
 
 void CaptureRows::writeState(Clock::TimePoint time, const PlistDictionary& state)
@@ -126,39 +193,17 @@ void CaptureRows::writeState(Clock::TimePoint time, const PlistDictionary& state
         writeRow(part, {DisplayChange::Kind::Shown, place}, state);
 }
 
-void CaptureRows::writeRow(const RecordPart& recordPart, const DisplayChange& change,
-                           const PlistDictionary& state)
+std::string_view CaptureRows::keepValue(KnownValue& known, const ShownCell& shown,
+                                        std::string_view text) const
 {
-    if (change.kind != DisplayChange::Kind::Shown)
-        return writeHolder(recordPart, change, state);
-    const KnownPlace& known = knownPlace(*change.place, state);
-    if (!known.isSelected)
-        return;
-    const std::string_view value =
-        valuePart(_changes.cellAt(*change.place, state), change.place->text);
-    append(recordPart, known.part, value);
-    ++_closing.rows;
-}
-
-// Values come again and again.
-std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& cell, std::string_view text)
-{
-    const Field* field = cell ? cell->field : nullptr;
-    const auto number = static_cast<std::uint64_t>(
-        cell ? cell->raw : static_cast<std::int64_t>(std::hash<std::string_view>{}(text)));
-    const std::uint64_t hash =
-        (std::hash<const Field*>{}(field) + number) * 0x9E3779B97F4A7C15U; // spreads neighbors
-    KnownValue& known = _values[hash >> knownValueShift];
-    if (known.field == field && known.raw == number && known.text == text && !known.part.empty() &&
-        known.workedOut == (cell ? cell->workedOut : std::nullopt))
-        return known.part;
-    known.field = field;
-    known.raw = number;
-    known.workedOut = cell ? cell->workedOut : std::nullopt;
+    known.field = shown.field;
+    known.raw = shown.raw;
+    known.isWorkedOut = shown.workedOut.has_value();
     known.text = text;
     known.part.clear();
-    _writer->addValue(known.part, cell ? RowValue{cell->number(), field->shown.unit, text}
-                                       : RowValue{plainNumber(text), {}, text});
+    _writer->addValue(known.part, shown.field
+                                      ? RowValue{shown.number(), shown.field->shown.unit, text}
+                                      : RowValue{plainNumber(text), {}, text});
     return known.part;
 }
 
@@ -178,18 +223,6 @@ void CaptureRows::writeHolder(const RecordPart& recordPart, const DisplayChange&
     _writer->addValue(value, isGone ? RowValue{} : RowValue{.text = std::string_view()});
     append(recordPart, part, value);
     ++_closing.rows;
-}
-
-const CaptureRows::KnownPlace& CaptureRows::knownPlace(const DisplayPlace& place,
-                                                       const PlistDictionary& state)
-{
-    const bool isKept = place.number < maximumKnownPlaces;
-    if (isKept && place.number >= _places.size())
-        _places.resize(place.number + 1);
-    KnownPlace& known = isKept ? _places[place.number] : _otherPlace;
-    if (known.serial != place.serial)
-        describe(known, place, state);
-    return known;
 }
 
 void CaptureRows::describe(KnownPlace& known, const DisplayPlace& place,

@@ -11,6 +11,7 @@
 #include <chrono>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -61,22 +62,32 @@ class CaptureRows
     /// The part of a row that tells a value.
     struct KnownValue {
         const Field* field = nullptr;
-        std::uint64_t raw = 0; ///< of a text that no field shows something of its own
-        std::optional<double> workedOut;
+        std::int64_t raw = 0; ///< of a text that no field shows something of its own
+        bool isWorkedOut = false;
         std::string text;
-        std::string part;
+        std::string part; ///< empty while there is none
+
+        bool isOf(const ShownCell& shown, std::string_view itsText) const
+        {
+            return field == shown.field && raw == shown.raw &&
+                   isWorkedOut == shown.workedOut.has_value() && text == itsText && !part.empty();
+        }
     };
 
     std::optional<RecordKind> kindOf(const CapturedMessage& message) const;
     void append(const RecordPart& recordPart, std::string_view placePart,
                 std::string_view valuePart);
     void writeChanges(const CapturedMessage& message, const PlistDictionary& state);
+    void writeFirst(const RowRecord& record, std::span<const DisplayChange> changes,
+                    const PlistDictionary& state);
     void writeState(Clock::TimePoint time, const PlistDictionary& state);
     void writeRow(const RecordPart& recordPart, const DisplayChange& change,
                   const PlistDictionary& state);
     void writeHolder(const RecordPart& recordPart, const DisplayChange& change,
                      const PlistDictionary& state);
     std::string_view valuePart(const std::optional<ShownCell>& cell, std::string_view text);
+    std::string_view keepValue(KnownValue& known, const ShownCell& shown,
+                               std::string_view text) const;
     const KnownPlace& knownPlace(const DisplayPlace& place, const PlistDictionary& state);
     void describe(KnownPlace& known, const DisplayPlace& place, const PlistDictionary& state) const;
 
@@ -91,7 +102,7 @@ class CaptureRows
     WantedCodes _wanted; ///< what the decoders ask for; all where messages are property lists
     std::vector<KnownPlace> _places; // by number, as far as they are kept
     KnownPlace _otherPlace;
-    std::vector<KnownValue> _values; // each where its field and its number lead
+    std::vector<KnownValue> _values; // each where its field and its number lead, or beside it
     bool _hasDisplay = false;        // there were changes already
     // Where values are told at steps.
     std::optional<Clock::TimePoint> _nextStep;

@@ -160,7 +160,7 @@ std::optional<ShownCell> Base::cellAt(CellPlace& place) const
     if (!place.row)
         return _fields.cellOf(place.key, place.slot);
     const RowList* rows = rowsUnder(place.list);
-    return rows ? rows->cellOf(*place.row, place.key) : std::nullopt;
+    return rows ? rows->cellOf(*place.row, place.key, place.slot) : std::nullopt;
 }
 
 std::vector<ReadLayout> Base::layouts() const

@@ -1,7 +1,6 @@
 #include "LogGenerator/Orbel/FieldMemory.h"
 
 #include <algorithm>
-#include <bit>
 #include <functional>
 
 namespace ventrik
@@ -65,29 +64,14 @@ std::optional<ValueOrigin> FieldMemory::originOf(std::string_view key) const
     return slot ? originOf(*slot) : std::nullopt;
 }
 
-std::optional<ShownCell> FieldMemory::cellOf(std::size_t slot) const
+bool FieldMemory::find(std::string_view& key, std::size_t& slot) const
 {
-    const Slot& known = _slots[slot];
-    if (!known.field)
-        return std::nullopt;
-    const auto workedOut =
-        known.isWorkedOut ? std::optional(std::bit_cast<double>(known.raw)) : std::nullopt;
-    return ShownCell{known.field, known.raw, workedOut};
-}
-
-std::optional<ShownCell> FieldMemory::cellOf(std::string_view& key, std::size_t& slot) const
-{
-    // Once found, the two are one text.
-    const bool isKnown = slot < _slots.size() && _slots[slot].key.data() == key.data() &&
-                         _slots[slot].key.size() == key.size();
-    if (!isKnown) {
-        const auto known = knownSlotOf(key);
-        if (!known)
-            return std::nullopt;
-        slot = *known;
-        key = _slots[slot].key;
-    }
-    return cellOf(slot);
+    const auto known = knownSlotOf(key);
+    if (!known)
+        return false;
+    slot = *known;
+    key = _slots[slot].key;
+    return true;
 }
 
 std::optional<std::size_t> FieldMemory::knownSlotOf(std::string_view key) const

@@ -3,7 +3,10 @@
 #include "LogGenerator/Core/ValueOrigin.h"
 
 #include <array>
+#include <bit>
+#include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <string_view>
 #include <vector>
 
@@ -40,10 +43,21 @@ class FieldMemory
     /// None for a key that no field shows.
     std::optional<ShownCell> cellOf(std::size_t slot) const;
     /// The slot is where to look first. The key becomes that of the field.
-    std::optional<ShownCell> cellOf(std::string_view& key, std::size_t& slot) const;
+    std::optional<ShownCell> cellOf(std::string_view& key, std::size_t& slot) const
+    {
+        return isAt(slot, key) || find(key, slot) ? cellOf(slot) : std::nullopt;
+    }
 
   private:
     std::optional<std::size_t> knownSlotOf(std::string_view key) const;
+    /// Whether the key is that slot's own text.
+    bool isAt(std::size_t slot, std::string_view key) const
+    {
+        return slot < _slots.size() && _slots[slot].key.data() == key.data() &&
+               _slots[slot].key.size() == key.size();
+    }
+    /// Brings slot and key to where the key shows; false where it does not.
+    bool find(std::string_view& key, std::size_t& slot) const;
 
     struct Slot {
         std::string_view key;
@@ -58,5 +72,15 @@ class FieldMemory
     std::vector<Slot> _slots;
     std::array<std::uint16_t, 64> _guesses{}; // the slots of fields, each where its address leads
 };
+
+inline std::optional<ShownCell> FieldMemory::cellOf(std::size_t slot) const
+{
+    const Slot& known = _slots[slot];
+    if (!known.field)
+        return std::nullopt;
+    const auto workedOut =
+        known.isWorkedOut ? std::optional(std::bit_cast<double>(known.raw)) : std::nullopt;
+    return ShownCell{known.field, known.raw, workedOut};
+}
 
 } // namespace ventrik

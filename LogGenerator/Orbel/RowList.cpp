@@ -1,5 +1,6 @@
 #include "LogGenerator/Orbel/RowList.h"
 
+#include <algorithm>
 #include <bit>
 #include <utility>
 
@@ -31,16 +32,28 @@ std::optional<ValueOrigin> RowList::originOf(std::size_t row, std::string_view k
     return std::nullopt;
 }
 
-std::optional<ShownCell> RowList::cellOf(std::size_t row, std::string_view key) const
+std::optional<ShownCell> RowList::cellOf(std::size_t row, std::string_view& key,
+                                         std::size_t& slot) const
 {
     if (row >= _rows.size())
         return std::nullopt;
-    for (const Cell& cell : _rows[row].cells)
-        if (cell.field && cell.field->key == key)
-            return ShownCell{cell.field, cell.raw,
-                             cell.isWorkedOut ? std::optional(static_cast<double>(cell.raw))
-                                              : std::nullopt};
-    return std::nullopt;
+    const std::vector<Cell>& cells = _rows[row].cells;
+    // Once found, the two are one text.
+    const bool isThere = slot < cells.size() && cells[slot].field &&
+                         cells[slot].field->key.data() == key.data() &&
+                         cells[slot].field->key.size() == key.size();
+    if (!isThere) {
+        const auto found = std::ranges::find_if(
+            cells, [key](const Cell& known) { return known.field && known.field->key == key; });
+        if (found == cells.end())
+            return std::nullopt;
+        slot = static_cast<std::size_t>(found - cells.begin());
+        key = found->field->key;
+    }
+    const Cell& cell = cells[slot];
+    return ShownCell{cell.field, cell.raw,
+                     cell.isWorkedOut ? std::optional(static_cast<double>(cell.raw))
+                                      : std::nullopt};
 }
 
 const FieldBytes& RowList::tableOf(std::span<const Field> fields)

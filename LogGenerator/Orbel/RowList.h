@@ -33,8 +33,10 @@ class RowList
 
     /// None for a key that the row does not show. The version is for the caller to fill in.
     std::optional<ValueOrigin> originOf(std::size_t row, std::string_view key) const;
-    /// None for a key that no field of the row shows.
-    std::optional<ShownCell> cellOf(std::size_t row, std::string_view key) const;
+    /// None for a key that no field of the row shows. The slot is where to look first; the key
+    /// becomes that of the field.
+    std::optional<ShownCell> cellOf(std::size_t row, std::string_view& key,
+                                    std::size_t& slot) const;
 
   private:
     struct Cell {

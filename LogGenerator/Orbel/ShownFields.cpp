@@ -71,11 +71,6 @@ std::optional<ValueOrigin> ShownFields::originOf(std::string_view key) const
     return _memory.originOf(key);
 }
 
-std::optional<ShownCell> ShownFields::cellOf(std::string_view& key, std::size_t& slot) const
-{
-    return _memory.cellOf(key, slot);
-}
-
 // A key's place stays until one is removed, and then all is forgotten.
 PlistValue& ShownFields::valueOf(PlistDictionary& dictionary, std::size_t slot,
                                  std::string_view key)

@@ -38,7 +38,10 @@ class ShownFields
     /// None for a key that no field shows. The version is for the caller to fill in.
     std::optional<ValueOrigin> originOf(std::string_view key) const;
     /// None for a key that no field shows. The slot is where to look first.
-    std::optional<ShownCell> cellOf(std::string_view& key, std::size_t& slot) const;
+    std::optional<ShownCell> cellOf(std::string_view& key, std::size_t& slot) const
+    {
+        return _memory.cellOf(key, slot);
+    }
 
   private:
     void showIn(PlistDictionary& dictionary, std::size_t slot, const Field& field, std::int64_t raw,

@@ -55,6 +55,26 @@ TEST_F(RowListTest, ShowsARowForEachElement)
     EXPECT_EQ(rows, (PlistArray{row("7", "-70 dBm"), row("8", "-80 dBm")}));
 }
 
+TEST_F(RowListTest, FindsWhatAKeyShowsAlsoWhereItStoodElsewhereBefore)
+{
+    const std::string name = "Level";
+    std::string_view key = name;
+    std::size_t slot = 0;
+    showCells({7, 0xBA});
+    ASSERT_TRUE(list.cellOf(0, key, slot));
+    EXPECT_EQ(list.cellOf(0, key, slot)->raw, -70);
+    {
+        RowList::Rewrite rewrite(list, rows, record);
+        rewrite.nextRow();
+        rewrite.show(cellFields[1], -80);
+        rewrite.show(cellFields[0], 7);
+    }
+    ASSERT_TRUE(list.cellOf(0, key, slot));
+    EXPECT_EQ(list.cellOf(0, key, slot)->raw, -80);
+    std::string_view other = "Loss";
+    EXPECT_FALSE(list.cellOf(0, other, slot));
+}
+
 TEST_F(RowListTest, RowsThatAreNotWrittenAnewGo)
 {
     showCells({7, 1, 8, 2, 9, 3});

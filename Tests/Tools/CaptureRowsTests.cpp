@@ -97,6 +97,19 @@ TEST_F(CaptureRowsTest, TellWhatEachMessageChanged)
     EXPECT_THAT(lines(), ElementsAre("2 00.3 /a/x=2"));
 }
 
+TEST_F(CaptureRowsTest, TellEachOfMoreValuesThanAreKept)
+{
+    select("/a/x");
+    for (int round = 0; round < 2; ++round)
+        for (int i = 0; i < 20000; ++i) {
+            const std::string value = fmt::format("{}{}", i % 2 == 0 ? "v" : "a longer value ", i);
+            take(0ms, value);
+            const auto taken = lines();
+            ASSERT_EQ(taken.size(), 1U);
+            ASSERT_TRUE(taken.front().ends_with("/a/x=" + value)) << taken.front();
+        }
+}
+
 TEST_F(CaptureRowsTest, AreOnlyThoseThatAreSelected)
 {
     select("/*/x");

@@ -142,7 +142,9 @@ const ColumnRowWriter::KindPart& ColumnRowWriter::kindPart(const RowRecord& reco
 
 std::string ColumnRowWriter::placePart(const RowPlace& place) const
 {
+    constexpr std::size_t names = 64;
     std::string row;
+    row.reserve(names + place.section.size() + place.path.size() + place.name.size());
     addColumn(row, R"(,"section":)", place.section);
     addColumn(row, R"(,"path":)", place.path);
     addNumber(row, R"(,"index":)", place.index);

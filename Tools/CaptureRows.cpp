@@ -88,10 +88,13 @@ inline std::string_view CaptureRows::valuePart(const std::optional<ShownCell>& c
 {
     const ShownCell shown = cell ? *cell : ShownCell{nullptr, hashOf(text)};
     const std::size_t place = placeOf(shown);
-    for (const std::size_t known : {place, place ^ 1})
-        if (_values[known].isOf(shown, text))
-            return _values[known].part;
-    return keepValue(_values[_values[place].part.empty() ? place : place ^ 1], shown, text);
+    KnownValue& first = _values[place];
+    if (first.isOf(shown, text))
+        return first.part;
+    KnownValue& second = _values[place ^ 1];
+    if (second.isOf(shown, text))
+        return second.part;
+    return keepValue(first.part.empty() ? first : second, shown, text);
 }
 
 void CaptureRows::writeRow(const RecordPart& recordPart, const DisplayChange& change,

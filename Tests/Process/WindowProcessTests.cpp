@@ -230,8 +230,9 @@ TEST_F(WindowProcess, OpensACaptureWithoutAService)
         start("ventrik-telephony", {"--technology", "lte", "--write", capture, "--count", "500"});
     EXPECT_EQ(writer->waitForEnd(), 0) << writer->errors();
     const auto window = startReadWindow({"--open", capture});
-    EXPECT_TRUE(waitUntil([&] { return window->says("Ventrik – drive.pcap | drive.pcap at 20"); }))
-        << window->errors();
+    EXPECT_TRUE(waitUntil([&] {
+        return window->says("Ventrik – drive.pcap – LTE | drive.pcap at 20");
+    })) << window->errors();
     window->send(SIGTERM);
     EXPECT_EQ(window->waitForEnd(), 0) << window->errors();
 }

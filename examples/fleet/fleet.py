@@ -39,21 +39,19 @@ def ask(server, query, body=None):
     return text
 
 
-def blocks(lines, load, closing):
+def blocks(stream, load, closing):
     """The rows with their load, in large blocks; what closes the capture is put aside."""
-    start = b'{"load":%d,' % load
-    block = bytearray()
-    for line in lines:
-        if b'","status":"' in line and b',"path":' not in line:
-            closing.append(start + line[1:])
-            continue
-        block += start
-        block += memoryview(line)[1:]
-        if len(block) >= BLOCK:
-            yield bytes(block)
-            block.clear()
-    if block:
-        yield bytes(block)
+    first = b'{"capture":'  # of a row; within texts quotes are escaped
+    start = b'{"load":%d,"capture":' % load
+    rest = b""
+    while chunk := stream.read(BLOCK):
+        rest += chunk
+        last = rest.rfind(b"\n", 0, -1) + 1  # the last line may be the closing one
+        if last:
+            yield rest[:last].replace(first, start)
+            rest = rest[last:]
+    if rest.endswith(b"\n") and b',"path":' not in rest:
+        closing.append(rest.replace(first, start))
 
 
 def load_capture(capture, server, decoder):
@@ -67,7 +65,7 @@ def load_capture(capture, server, decoder):
                 blocks(program.stdout, load, closing))
         finally:
             program.kill()
-    if len(closing) != 1:
+    if not closing:
         raise RuntimeError(f"{capture}: the decoder ended before its closing row")
     # From now on these rows count, and those of former loads do not.
     ask(server, "INSERT INTO captures FORMAT JSONEachRow", iter(closing))

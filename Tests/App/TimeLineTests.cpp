@@ -312,6 +312,14 @@ class OpenedWindowTest : public AppFixture
         options.opened = std::move(opened);
         return options;
     }
+    /// Of which only the newest state is kept.
+    VentrikAppOptions shortHistory() const
+    {
+        VentrikAppOptions options =
+            optionsOf(std::make_shared<TwoTurns>(fake, std::string(40000, 'x')));
+        options.historyLimits.bytes = 16384;
+        return options;
+    }
     VentrikPaneController& root()
     {
         return static_cast<VentrikPaneController&>(*window.navController()->screens().front());
@@ -354,10 +362,7 @@ TEST_F(OpenedWindowTest, GoesBackInTheCaptureAndToItsEnd)
 
 TEST_F(OpenedWindowTest, ShowsWhatStandsWhereTheHistoryHasNoChangeLeft)
 {
-    VentrikAppOptions options =
-        optionsOf(std::make_shared<TwoTurns>(fake, std::string(40000, 'x')));
-    options.historyLimits.bytes = 16384;
-    VentrikApp small(fake.platform(), options);
+    VentrikApp small(fake.platform(), shortHistory());
     small.applicationDidFinishLaunching();
     fake.mainQueue.run();
     const ChangeStore& store = small.timeLine().store();
@@ -385,10 +390,7 @@ TEST_F(OpenedWindowTest, AMomentThatWasChosenStaysWhileItIsRead)
 
 TEST_F(OpenedWindowTest, TellsWhatTheHistoryHasNotKept)
 {
-    VentrikAppOptions options =
-        optionsOf(std::make_shared<TwoTurns>(fake, std::string(40000, 'x')));
-    options.historyLimits.bytes = 16384;
-    VentrikApp small(fake.platform(), options);
+    VentrikApp small(fake.platform(), shortHistory());
     small.applicationDidFinishLaunching();
     fake.mainQueue.run();
     EXPECT_EQ(small.statusNote().text, "it ends too early; what was before 2026-11-16 06:12:28 is "

@@ -5,6 +5,7 @@
 #include "App/Toolkit/PlainText.h"
 #include "Model/ChannelNote.h"
 #include "Model/NodeRows.h"
+#include "Model/SeriesPoint.h"
 #include "Platform/Technology.h"
 
 #include <QGuiApplication>
@@ -28,7 +29,6 @@ constexpr std::string_view showGSMRSSIKey = "HSShowGSMRSSI";
 constexpr auto noteInterval = 1s;
 constexpr auto channelInterval = 2s;
 constexpr auto savedMessageTime = 8s;
-constexpr auto staleAge = 10s;
 
 constexpr std::string_view timeLineKey = "TimeLine";
 constexpr std::string_view timeLineShown = "shown";
@@ -265,7 +265,7 @@ bool VentrikApp::isStale(const std::string& path)
         return false;
     const DisplayMoment::Value* value = _timeLine.shown().valueAt(path);
     const Clock::TimePoint now = _timeLine.pausedAt().value_or(_timeLine.end());
-    return value && value->logCode != 0 && now - value->written > staleAge;
+    return value && value->logCode != 0 && now - value->written > longestHold;
 }
 
 std::string VentrikApp::briefSourceOf(const std::string& path)

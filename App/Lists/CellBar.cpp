@@ -3,6 +3,7 @@
 #include "App/Lists/CellsModel.h"
 #include "App/Lists/ListLook.h"
 #include "App/Toolkit/Fonts.h"
+#include "Model/SeriesPoint.h"
 
 #include <QPainter>
 
@@ -15,12 +16,9 @@ namespace ventrik
 namespace
 {
 
-using namespace std::chrono_literals;
-
 constexpr int barHeight = 8;
 constexpr int barGap = 8; // between bar and number
 constexpr int longestBar = 200;
-constexpr auto staleAge = 10s;
 
 /// What levels of a name lie between, from none to all of a bar.
 struct LevelRange {
@@ -100,7 +98,7 @@ void CellBar::paint(QPainter* painter, const QStyleOptionViewItem& option,
     const CellRow& cell = static_cast<const CellsModel*>(index.model())->cell(index.row());
     const QString text = index.data().toString();
     const bool isSelected = option.state.testFlag(QStyle::State_Selected);
-    const bool isStale = cell.age > staleAge;
+    const bool isStale = cell.age > longestHold;
     QFont font = listFont();
     font.setBold(cell.kind == CellKind::Serving);
 

@@ -146,6 +146,22 @@ ByteView ByteSource::peekSome(std::size_t size)
     return ByteView(_buffer).subspan(_start, std::min(size, _end - _start));
 }
 
+std::size_t ByteSource::read(std::span<std::uint8_t> room)
+{
+    if (_start < _end) {
+        const ByteView bytes = peekSome(room.size());
+        std::copy(bytes.begin(), bytes.end(), room.begin());
+        skip(bytes.size());
+        return bytes.size();
+    }
+    if (_isAtEnd || room.empty())
+        return 0;
+    const std::size_t count = _read(room, _error);
+    _isAtEnd = count == 0;
+    _offset += count;
+    return count;
+}
+
 void ByteSource::skip(std::size_t size)
 {
     const std::size_t taken = std::min(size, _end - _start);

@@ -31,6 +31,9 @@ class ByteSource
     ByteView peek(std::size_t size);
     /// Likewise, but what is there without waiting for more: one byte at least, but at the end.
     ByteView peekSome(std::size_t size);
+    /// Takes bytes into the room: what is there without waiting for more, one byte at least, but at
+    /// the end. Gives how many.
+    std::size_t read(std::span<std::uint8_t> room);
     /// Takes bytes that were peeked.
     void skip(std::size_t size);
     /// Of the next byte, in the uncompressed capture.

@@ -35,10 +35,8 @@ constexpr std::array<std::array<std::uint8_t, 4>, 5> magics{{
 ssize_t readFromSource(void* cookie, char* room, std::size_t size)
 {
     auto& source = *static_cast<ByteSource*>(cookie);
-    const ByteView bytes = source.peekSome(size);
-    std::copy(bytes.begin(), bytes.end(), reinterpret_cast<std::uint8_t*>(room));
-    source.skip(bytes.size());
-    return bytes.empty() && !source.error().empty() ? -1 : static_cast<ssize_t>(bytes.size());
+    const std::size_t count = source.read({reinterpret_cast<std::uint8_t*>(room), size});
+    return count == 0 && !source.error().empty() ? -1 : static_cast<ssize_t>(count);
 }
 
 } // namespace

@@ -123,6 +123,37 @@ TEST(ByteSource, PeekingSomeWaitsForOneByteOnly)
     EXPECT_EQ(reads, 1);
 }
 
+TEST(ByteSource, ReadingTakesWhatWasPeekedFirst)
+{
+    ByteSource source({1, 2, 3, 4, 5}, 2);
+    source.peek(3); // and so has four
+    Bytes room(10);
+    EXPECT_EQ(source.read(room), 4U);
+    EXPECT_EQ(source.read(std::span(room).subspan(4)), 1U);
+    EXPECT_EQ(source.read(std::span(room).subspan(5)), 0U);
+    EXPECT_EQ(room, (Bytes{1, 2, 3, 4, 5, 0, 0, 0, 0, 0}));
+    EXPECT_EQ(source.offset(), 5U);
+    EXPECT_TRUE(source.peek(1).empty());
+}
+
+TEST(ByteSource, ReadingNothingIsNotItsEnd)
+{
+    ByteSource source({1}, 1);
+    EXPECT_EQ(source.read({}), 0U);
+    EXPECT_EQ(copyOf(source.peek(1)), (Bytes{1}));
+}
+
+TEST(ByteSource, ReadingTellsWhyItEnds)
+{
+    ByteSource source([](std::span<std::uint8_t>, std::string& error) {
+        error = "broken";
+        return std::size_t{0};
+    });
+    Bytes room(10);
+    EXPECT_EQ(source.read(room), 0U);
+    EXPECT_EQ(source.error(), "broken");
+}
+
 TEST(ByteSource, TellsAMissingFileInOneLine)
 {
     std::string error;

@@ -230,6 +230,28 @@ constexpr std::uint32_t codeOf(const Layout& layout)
 
 static_assert(std::ranges::is_sorted(layouts, {}, codeOf));
 
+constexpr bool tellsVersion(const Record& record)
+{
+    return record.version || record.subpacket;
+}
+
+// So that it is read once for all of them.
+constexpr bool tellVersionsAlike()
+{
+    for (const Layout& layout : layouts) {
+        const Record& record = *layout.record;
+        const Record& first = *std::ranges::find(layouts, codeOf(layout), codeOf)->record;
+        if (tellsVersion(record) &&
+            (record.version != first.version || record.subpacket != first.subpacket))
+            return false;
+        if (!layout.isOfAnyVersion() && !tellsVersion(record))
+            return false;
+    }
+    return true;
+}
+
+static_assert(tellVersionsAlike());
+
 } // namespace
 
 std::string_view nameOf(RecordsMode mode)
@@ -246,15 +268,12 @@ std::optional<RecordsMode> recordsModeNamed(std::string_view name)
     return std::nullopt;
 }
 
-bool Layout::isOf(const LogPacket& packet) const
+bool Layout::isOf(const LogPacket& packet, std::optional<std::uint8_t> version) const
 {
     if (packet.size() < minimumSize || packet.size() > maximumSize)
         return false;
-    if (firstVersion > 0 || lastVersion < 255) {
-        const auto version = versionOf(*record, packet);
-        if (!version || *version < firstVersion || *version > lastVersion)
-            return false;
-    }
+    if (!isOfAnyVersion() && (!version || *version < firstVersion || *version > lastVersion))
+        return false;
     return !fits || fits(*record, packet);
 }
 
@@ -278,12 +297,18 @@ std::span<const Layout> layoutsOf(std::uint32_t logCode)
 ChosenLayout chooseLayout(const Record& base, std::span<const Layout> layouts,
                           const LogPacket& packet)
 {
+    if (layouts.empty())
+        return {&base, LayoutKind::Base, versionOf(base, packet)};
+    const auto version = versionOf(*layouts.front().record, packet);
+    const auto chosen = [&](const Record& record, LayoutKind kind) {
+        return ChosenLayout{&record, kind, tellsVersion(record) ? version : std::nullopt};
+    };
     for (const Layout& layout : layouts)
-        if (layout.isOf(packet)) {
+        if (layout.isOf(packet, version)) {
             const bool isBase = layout.record == &base && !base.isExtension;
-            return {layout.record, isBase ? LayoutKind::Base : LayoutKind::Newer};
+            return chosen(*layout.record, isBase ? LayoutKind::Base : LayoutKind::Newer);
         }
-    return {&base, layouts.empty() ? LayoutKind::Base : LayoutKind::NotKnown};
+    return chosen(base, LayoutKind::NotKnown);
 }
 
 std::string_view nameOf(LayoutKind kind)

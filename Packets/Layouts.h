@@ -41,7 +41,9 @@ struct Layout {
     bool (*fits)(const Record& record, const LogPacket& packet) = nullptr;
     std::string_view condition = {}; ///< what that asks, for people
 
-    bool isOf(const LogPacket& packet) const;
+    constexpr bool isOfAnyVersion() const { return firstVersion == 0 && lastVersion == 255; }
+    /// The packet carries that version.
+    bool isOf(const LogPacket& packet, std::optional<std::uint8_t> version) const;
 };
 
 /// The version that a record, or the subpacket that tells it, carries; none where it has none.
@@ -55,8 +57,10 @@ std::span<const Layout> layoutsOf(std::uint32_t logCode);
 struct ChosenLayout {
     const Record* record;
     LayoutKind kind;
+    std::optional<std::uint8_t> version; ///< none where that record tells none
 };
-/// Of a code's layouts. The packet is as long as the base record asks for.
+/// Of a code's layouts. All records of a code that tell a version tell it in one place. The packet
+/// is as long as the base record asks for.
 ChosenLayout chooseLayout(const Record& base, std::span<const Layout> layouts,
                           const LogPacket& packet);
 

@@ -18,6 +18,8 @@ struct Place {
 
     /// How many bytes from `offset` on the bits reach into.
     constexpr std::size_t bytes() const { return (std::size_t{bit} + width + 7) / 8; }
+
+    bool operator==(const Place&) const = default;
 };
 
 // How tables say a place.

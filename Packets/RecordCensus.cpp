@@ -67,7 +67,7 @@ std::optional<RecordKind> recordKindOf(ByteView message, RecordsMode mode)
     if (!base)
         return kind;
     const ChosenLayout chosen = chooseLayoutOf(*base, packet, mode);
-    kind.version = versionOf(*chosen.record, packet);
+    kind.version = chosen.version;
     if (!base->isExtension || mode == RecordsMode::Extended)
         kind.layout = chosen.kind;
     return kind;

@@ -96,7 +96,7 @@ void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     if (packet.size() < base.minimumSize && !_table.decodesShortRecords)
         return;
     const ChosenLayout chosen = chooseLayout(base, known->layouts, packet);
-    known->last = {logCode, versionOf(*chosen.record, packet), packet.size(), chosen.kind};
+    known->last = {logCode, chosen.version, packet.size(), chosen.kind};
     if (base.isExtension && chosen.kind == LayoutKind::NotKnown)
         return; // it has no base layout to fall back on
     _lastRead = &*known->last;

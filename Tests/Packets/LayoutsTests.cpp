@@ -77,6 +77,25 @@ const std::vector<PlainLayout>& plainLayouts()
 
 } // namespace
 
+TEST(Layouts, OfACodeTellTheirVersionWhereItsBaseRecordDoes)
+{
+    for (const Record* base : allRecords()) {
+        const auto layouts = layoutsOf(base->logCode);
+        if (layouts.empty() || (!base->version && !base->subpacket))
+            continue;
+        EXPECT_EQ(layouts.front().record->version, base->version) << base->name;
+        EXPECT_EQ(layouts.front().record->subpacket, base->subpacket) << base->name;
+    }
+}
+
+TEST(Layouts, ARecordThatTellsNoVersionHasNone)
+{
+    const auto choice = chosenFor(sized(0x4005, 40).u8(13, 7));
+    EXPECT_EQ(choice.record, &GSMRecords::rankedCells);
+    EXPECT_EQ(choice.version, std::nullopt);
+    EXPECT_EQ(chosenFor(versioned(0xB17F, 77, 45)).version, 77);
+}
+
 TEST(Layouts, VersionAndSizeTellTheLayout)
 {
     for (const PlainLayout& plain : plainLayouts())

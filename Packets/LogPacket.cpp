@@ -42,6 +42,17 @@ LogPacket LogPacket::from(std::size_t offset) const
     return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));
 }
 
+void LogPacket::u32s(std::size_t offset, std::span<std::uint32_t> numbers) const
+{
+    const std::size_t end = offset + numbers.size_bytes();
+    if (std::endian::native == std::endian::little && end <= size()) {
+        std::memcpy(numbers.data(), _bytes.data() + offset, numbers.size_bytes());
+        return;
+    }
+    for (std::size_t i = 0; i < numbers.size(); ++i)
+        numbers[i] = u32(offset + sizeof(std::uint32_t) * i);
+}
+
 std::size_t RecordElements::completeIn(const LogPacket& packet) const
 {
     if (packet.size() < offset + needed)

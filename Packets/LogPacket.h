@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <span>
 #include <vector>
 
 namespace ventrik
@@ -81,6 +82,9 @@ class LogPacket
     std::int8_t i8(std::size_t offset) const { return static_cast<std::int8_t>(u8(offset)); }
     std::int16_t i16(std::size_t offset) const { return static_cast<std::int16_t>(u16(offset)); }
     std::int32_t i32(std::size_t offset) const { return static_cast<std::int32_t>(u32(offset)); }
+
+    /// Numbers of 32 bits that stand side by side from an offset on.
+    void u32s(std::size_t offset, std::span<std::uint32_t> numbers) const;
 
     /// The eight bytes from an offset on, for numbers of any width.
     std::uint64_t littleEndianWord(std::size_t offset) const;

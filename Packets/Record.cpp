@@ -77,12 +77,17 @@ std::optional<std::string> Shown::textOf(std::int64_t raw) const
 std::string Shown::textOfNumber(double number) const
 {
     std::string shown;
-    appendNumber(shown, digits, number);
-    if (!unit.empty()) {
-        shown += ' ';
-        shown += unit;
-    }
+    appendTextOfNumber(shown, number);
     return shown;
+}
+
+void Shown::appendTextOfNumber(std::string& shown, double number) const
+{
+    appendNumber(shown, digits, number);
+    if (unit.empty())
+        return;
+    shown += ' ';
+    shown += unit;
 }
 
 RecordElements List::elementsOf(const LogPacket& packet) const

@@ -70,6 +70,7 @@ struct Shown {
     std::optional<std::string> textOf(std::int64_t raw) const;
     /// The text of a number that was already scaled.
     std::string textOfNumber(double number) const;
+    void appendTextOfNumber(std::string& shown, double number) const;
 };
 
 /// A field of a record: the key of the display under which it shows, or, in lower case, the name of
@@ -131,12 +132,14 @@ struct Record {
 /// The first field of that name in the groups, or null.
 const Field* findField(std::span<const std::span<const Field>> groups, std::string_view key);
 
-/// The number at a place of the packet; bytes past its end read as 0.
-inline std::int64_t numberAt(const LogPacket& packet, const Place& place)
+/// The number at a place that counts from `start` on; bytes past the packet's end read as 0. In its
+/// caller a place that is a constant leaves a load and a mask of it.
+[[gnu::always_inline]] inline std::int64_t numberAt(const LogPacket& packet, const Place& place,
+                                                    std::size_t start = 0)
 {
-    const std::uint64_t word = place.isBigEndian
-                                   ? packet.bigEndianWord(place.offset, place.bytes())
-                                   : packet.littleEndianWord(place.offset) >> place.bit;
+    const std::size_t offset = start + place.offset;
+    const std::uint64_t word = place.isBigEndian ? packet.bigEndianWord(offset, place.bytes())
+                                                 : packet.littleEndianWord(offset) >> place.bit;
     const std::uint64_t sign = std::uint64_t{1} << (place.width - 1);
     const std::uint64_t number = word & (2 * sign - 1);
     // Subtracting the sign bit twice spreads it over all bits above.
@@ -144,7 +147,7 @@ inline std::int64_t numberAt(const LogPacket& packet, const Place& place)
                                                                        : number);
 }
 
-inline std::int64_t numberOf(const LogPacket& packet, const Field& field)
+[[gnu::always_inline]] inline std::int64_t numberOf(const LogPacket& packet, const Field& field)
 {
     return numberAt(packet, field.place);
 }

@@ -193,6 +193,18 @@ PlistValue* PlistDictionary::find(std::string_view key)
     return &_storage->entries[*place].value;
 }
 
+PlistValue* PlistDictionary::find(std::string_view key, std::size_t& place)
+{
+    const auto& entries = _storage->entries;
+    if (place >= entries.size() || !isSame(entries[place].key, key)) {
+        const auto found = _storage->place(key);
+        if (!found)
+            return nullptr;
+        place = *found;
+    }
+    return &entryAt(place)->value;
+}
+
 std::optional<std::size_t> PlistDictionary::placeOf(std::string_view key) const
 {
     return _storage->place(key);

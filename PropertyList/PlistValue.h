@@ -107,6 +107,9 @@ class PlistDictionary
     /// The value under the key, or null. Valid until the dictionary changes.
     const PlistValue* find(std::string_view key) const;
     PlistValue* find(std::string_view key);
+    /// Likewise, without a search while the key is at the place where it was the last time: 0 at
+    /// first, then what the last call left.
+    PlistValue* find(std::string_view key, std::size_t& place);
 
     /// The key's place in the order. It stays that of the key until a key before it is removed, so
     /// a caller that keeps it gets at the entry without a search: `entryAt`, then look at its key.
@@ -185,6 +188,23 @@ class PlistValue
     PlistArray* array() { return std::get_if<PlistArray>(&_value); }
     const PlistDictionary* dictionary() const { return std::get_if<PlistDictionary>(&_value); }
     PlistDictionary* dictionary() { return std::get_if<PlistDictionary>(&_value); }
+
+    /// Becomes a number, without the detour over a value of its own.
+    template <std::integral T>
+    requires(!std::same_as<T, bool>) PlistValue& operator=(T number)
+    {
+        return *this = PlistInteger(number);
+    }
+    PlistValue& operator=(PlistInteger number)
+    {
+        _value = number;
+        return *this;
+    }
+    PlistValue& operator=(std::same_as<double> auto number)
+    {
+        _value = number;
+        return *this;
+    }
 
     /// Becomes a text, in the room of the one that it is.
     void setText(std::string_view text)

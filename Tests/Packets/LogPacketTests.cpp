@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 
 namespace ventrik
 {
@@ -54,6 +55,26 @@ TEST(LogPacket, ReadsZeroPastTheEnd)
     EXPECT_EQ(packet.u16(1), 0x0022);
     EXPECT_EQ(packet.u32(1), 0x00000022U);
     EXPECT_EQ(packet.u16BigEndian(1), 0x2200);
+}
+
+TEST(LogPacket, ReadsNumbersThatStandSideBySide)
+{
+    const Bytes bytes{0xFF, 1, 0, 0, 0x80, 2, 3, 0, 0, 4};
+    std::array<std::uint32_t, 2> numbers{};
+    LogPacket(bytes).u32s(1, numbers);
+    EXPECT_THAT(numbers, testing::ElementsAre(0x80000001U, 0x00000302U));
+    LogPacket(bytes).u32s(2, numbers);
+    EXPECT_THAT(numbers, testing::ElementsAre(0x02800000U, 0x04000003U));
+}
+
+TEST(LogPacket, ReadsZeroForTheNumbersPastTheEnd)
+{
+    const Bytes bytes{1, 2, 3, 4, 5, 6};
+    std::array<std::uint32_t, 3> numbers{9, 9, 9};
+    LogPacket(bytes).u32s(1, numbers);
+    EXPECT_THAT(numbers, testing::ElementsAre(0x05040302U, 0x00000006U, 0U));
+    LogPacket(bytes).u32s(100, numbers);
+    EXPECT_THAT(numbers, testing::Each(0U));
 }
 
 TEST(LogPacket, HasNoPayloadWhenItIsShorterThanItsHeader)

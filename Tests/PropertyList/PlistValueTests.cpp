@@ -76,6 +76,19 @@ TEST(PlistValue, BecomesAText)
     EXPECT_EQ(before, "one");
 }
 
+TEST(PlistValue, BecomesANumber)
+{
+    PlistValue value = "text";
+    value = 7;
+    EXPECT_EQ(value, PlistValue(7));
+    value = PlistInteger(std::uint64_t{1} << 63);
+    EXPECT_EQ(value, PlistValue(std::uint64_t{1} << 63));
+    value = 2.5;
+    EXPECT_EQ(value, PlistValue(2.5));
+    value = true;
+    EXPECT_EQ(value.kind(), PlistValue::Kind::Boolean);
+}
+
 TEST(PlistValue, CountsWhoSharesAnArray)
 {
     const PlistArray array;
@@ -212,6 +225,30 @@ TEST(PlistDictionary, GivesTheEntryAtAPlaceForChange)
     EXPECT_EQ(entry->key, "b");
     entry->value = 3;
     EXPECT_EQ(*dictionary.find("b"), PlistValue(3));
+}
+
+TEST(PlistDictionary, FindsAKeyWhereItWasTheLastTime)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}, {"c", 3}};
+    std::size_t place = 0;
+    ASSERT_NE(dictionary.find("c", place), nullptr);
+    EXPECT_EQ(*dictionary.find("c", place), PlistValue(3));
+    EXPECT_EQ(place, 2U);
+    dictionary.remove("a"); // the place is past the end now
+    EXPECT_EQ(*dictionary.find("c", place), PlistValue(3));
+    EXPECT_EQ(place, 1U);
+    dictionary.set("d", 4);
+    dictionary.remove("b"); // and another key's now
+    EXPECT_EQ(*dictionary.find("c", place), PlistValue(3));
+    EXPECT_EQ(place, 0U);
+}
+
+TEST(PlistDictionary, LeavesThePlaceOfAKeyThatItDoesNotHave)
+{
+    PlistDictionary dictionary{{"a", 1}, {"b", 2}};
+    std::size_t place = 1;
+    EXPECT_EQ(dictionary.find("c", place), nullptr);
+    EXPECT_EQ(place, 1U);
 }
 
 TEST(PlistDictionary, HasNoEntryPastTheEnd)

@@ -86,8 +86,6 @@ inline constexpr Record forwardPackets{
 // payload sizes 24 bytes, of which the first 16 are four counters
 inline constexpr std::array<Field, 1> reversePacketsUnshown{{{"sequence number", u32(14)}}};
 inline constexpr std::size_t payloadSizeCount = 12;
-inline constexpr std::array<Field, 4> payloadCounterFields{
-    {{"packets", u32(0)}, {"packets", u32(4)}, {"packets", u32(8)}, {"packets", u32(12)}}};
 inline constexpr std::size_t countersForPayloadSize = 4;
 inline constexpr RecordElements reverseCounters{18, 24, 6 * payloadSizeCount, 16};
 inline constexpr Record reversePackets{

@@ -3,6 +3,8 @@
 #include "LogGenerator/C2K/C2KOutput.h"
 #include "Packets/C2KRecords.h"
 
+#include <utility>
+
 namespace ventrik
 {
 
@@ -15,11 +17,12 @@ void decodeActiveSetPilots(const LogPacket& packet, const C2KOutput& output)
         return;
     }
     std::vector<ShownPilot> pilots;
+    pilots.reserve(elements.count);
     for (std::size_t i = 0; i < elements.count; ++i) {
         const LogPacket pilot = elements.element(packet, i);
         pilots.push_back(shownPilot(i, pilot, C2KRecords::pilotPNOffset, C2KRecords::pilotLevel));
     }
-    output.publish(C2KRecords::activeSetPilotGroup, pilots, "(none)");
+    output.publish(C2KRecords::activeSetPilotGroup, std::move(pilots), "(none)");
 }
 
 } // namespace ventrik

@@ -21,10 +21,11 @@ constexpr Shown pilotLevel{.digits = Digits::SignedTwoDecimals, .unit = "dB"};
 // Levels are worked out from several fields.
 constexpr Field pilotLevelField{"level", {}, pilotLevel};
 
-std::string textOf(const ShownPilot& pilot)
+// In the room that the text has.
+void setTextOf(std::string& text, const ShownPilot& pilot)
 {
-    std::string level = pilotLevel.textOfNumber(pilot.level);
-    return pilot.isReference ? "(ref pilot) " + level : level;
+    text = pilot.isReference ? "(ref pilot) " : "";
+    pilotLevel.appendTextOfNumber(text, pilot.level);
 }
 
 std::string keyOf(const ShownPilot& pilot)
@@ -51,17 +52,22 @@ void update(PlistDictionary& group, const std::vector<ShownPilot>& pilotsBefore,
     constexpr std::string_view marker = "_sorted"; // the display sorts the group
     if (group.empty())
         group.set(marker, marker);
+    std::string text;
     std::size_t i = 0;
     for (; i < pilots.size() && i < pilotsBefore.size(); ++i) {
         if (pilots[i].index != pilotsBefore[i].index ||
             pilots[i].pnOffset != pilotsBefore[i].pnOffset)
             break;
-        if (!(pilots[i] == pilotsBefore[i]))
-            group.entryAt(i + 1)->value = textOf(pilots[i]);
+        if (pilots[i] == pilotsBefore[i])
+            continue;
+        setTextOf(text, pilots[i]);
+        group.entryAt(i + 1)->value.setText(text);
     }
     group.truncate(i + 1);
-    for (; i < pilots.size(); ++i)
-        group.set(keyOf(pilots[i]), textOf(pilots[i]));
+    for (; i < pilots.size(); ++i) {
+        setTextOf(text, pilots[i]);
+        group.set(keyOf(pilots[i]), text);
+    }
 }
 
 } // namespace
@@ -106,10 +112,10 @@ void C2KLabels::publish(std::span<const Field> fields, const Record* record, con
 void C2KLabels::publish(std::size_t slot, const Field& field, const Record* record,
                         std::int64_t raw)
 {
+    _tables.noteWriter(slot);
     if (_memory.shows(slot, field, raw, false))
         return;
     _memory.keep(slot, field, record, raw, false);
-    _tables.noteWriter(slot);
     Labels& labels = labelsOf(slot, field);
     labels.text.clear();
     const auto& text = _texts.textOf(field, raw);
@@ -119,28 +125,37 @@ void C2KLabels::publish(std::size_t slot, const Field& field, const Record* reco
 void C2KLabels::publish(const Field& field, std::string_view text)
 {
     const std::size_t slot = _memory.slotOf(field);
+    _tables.noteWriter(slot);
     Labels& labels = labelsOf(slot, field);
     if (labels.text == text && !text.empty() && !labels.isGroup)
         return;
     _memory.keepNone(slot);
-    _tables.noteWriter(slot);
     labels.text = text;
     labels.isGroup = false;
     store(labels, text);
 }
 
-void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilots,
+void C2KLabels::publish(std::span<const Field> fields, std::string_view text)
+{
+    _tables.visit(fields, text, [&](const Field& field) { publish(field, text); });
+}
+
+void C2KLabels::publish(const Field& field, std::vector<ShownPilot> pilots,
                         std::string_view textOfNone)
 {
     if (pilots.empty() && !textOfNone.empty())
         return publish(field, textOfNone);
+    showPilots(field, std::move(pilots)).source.clear();
+}
+
+C2KLabels::Labels& C2KLabels::showPilots(const Field& field, std::vector<ShownPilot> pilots)
+{
     const std::size_t slot = _memory.slotOf(field);
-    Labels& labels = labelsOf(slot, field);
-    labels.source.clear();
-    if (labels.isGroup && labels.pilots == pilots)
-        return;
-    _memory.keepNone(slot);
     _tables.noteWriter(slot);
+    Labels& labels = labelsOf(slot, field);
+    if (labels.isGroup && labels.pilots == pilots)
+        return labels;
+    _memory.keepNone(slot);
     // Whoever else holds the group keeps it as it was.
     const bool wasShown = std::exchange(labels.isGroup, true);
     const std::size_t ours = 1 + (wasShown ? labels.targets.size() : 0);
@@ -148,9 +163,10 @@ void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilot
     if (isShared)
         labels.group = labels.group.copy();
     update(labels.group, labels.pilots, pilots);
-    labels.pilots = pilots;
+    labels.pilots = std::move(pilots);
     if (isShared || !wasShown)
         store(labels, labels.group);
+    return labels;
 }
 
 bool C2KLabels::showsPilotsOf(const Field& field, ByteView source)
@@ -159,10 +175,9 @@ bool C2KLabels::showsPilotsOf(const Field& field, ByteView source)
     return labels.isGroup && !source.empty() && std::ranges::equal(labels.source, source);
 }
 
-void C2KLabels::publish(const Field& field, const std::vector<ShownPilot>& pilots, ByteView source)
+void C2KLabels::publish(const Field& field, std::vector<ShownPilot> pilots, ByteView source)
 {
-    publish(field, pilots, std::string_view());
-    labelsOf(_memory.slotOf(field), field).source.assign(source.begin(), source.end());
+    showPilots(field, std::move(pilots)).source.assign(source.begin(), source.end());
 }
 
 std::optional<ValueOrigin> C2KLabels::originOf(const PlistDictionary& group,
@@ -212,13 +227,13 @@ std::optional<ShownCell> C2KLabels::cellOfPilot(std::size_t slot, std::string_vi
     return ShownCell{&pilotLevelField, std::bit_cast<std::int64_t>(level), level};
 }
 
-C2KLabels::Labels& C2KLabels::labelsOf(std::size_t slot, const Field& field)
+C2KLabels::Labels& C2KLabels::lookUpLabels(std::size_t slot, const Field& field)
 {
     if (slot >= _labels.size())
         _labels.resize(slot + 1);
     Labels& labels = _labels[slot];
-    if (!std::exchange(labels.hasTargets, true))
-        labels.targets = targetsOf(field.key);
+    labels.targets = targetsOf(field.key);
+    labels.hasTargets = true;
     return labels;
 }
 
@@ -236,21 +251,21 @@ std::vector<C2KLabels::Target> C2KLabels::targetsOf(std::string_view lookupKey) 
         const PlistValue* group = entry ? entry->find("dict") : nullptr;
         if (!label || !label->string() || !group || !group->dictionary())
             break;
-        targets.push_back({*group->dictionary(), *label->string(), 0});
+        targets.push_back({*group->dictionary(), *label->string()});
     }
     return targets;
 }
 
+// A label's place stays until one is removed.
 PlistValue& C2KLabels::valueOf(Target& target)
 {
-    PlistDictionary::Entry* entry = target.group.entryAt(target.place);
-    if (!entry || entry->key != target.label) {
+    if (!target.place || target.removals != target.group.removalCount()) {
         if (!target.group.contains(target.label))
             target.group.set(target.label, "");
-        target.place = target.group.placeOf(target.label).value_or(0);
-        entry = target.group.entryAt(target.place);
+        target.place = target.group.placeOf(target.label);
+        target.removals = target.group.removalCount();
     }
-    return entry->value;
+    return target.group.entryAt(*target.place)->value;
 }
 
 void C2KLabels::store(Labels& labels, std::string_view text)

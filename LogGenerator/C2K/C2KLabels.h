@@ -41,13 +41,14 @@ class C2KLabels
     void publish(std::span<const Field> fields, const Record* record, const LogPacket& part);
     /// A text in the place of the field's number.
     void publish(const Field& field, std::string_view text);
+    /// A text, a constant, in the place of each number of a table of fields.
+    void publish(std::span<const Field> fields, std::string_view text);
     /// A group of pilots, or the text while there is none; an empty one means the empty group.
-    void publish(const Field& field, const std::vector<ShownPilot>& pilots,
-                 std::string_view textOfNone);
+    void publish(const Field& field, std::vector<ShownPilot> pilots, std::string_view textOfNone);
     /// Whether the group shows the pilots that were worked out from those bytes.
     bool showsPilotsOf(const Field& field, ByteView source);
     /// A group of pilots that were worked out from those bytes, and from nothing else.
-    void publish(const Field& field, const std::vector<ShownPilot>& pilots, ByteView source);
+    void publish(const Field& field, std::vector<ShownPilot> pilots, ByteView source);
 
     /// Where the value under a label of a group comes from; none where no field shows there.
     std::optional<ValueOrigin> originOf(const PlistDictionary& group, std::string_view label) const;
@@ -65,7 +66,8 @@ class C2KLabels
     struct Target {
         PlistDictionary group;
         std::string label;
-        std::size_t place; // of the label in the group, as far as is known
+        std::optional<std::size_t> place = {}; // of the label in the group, as far as is known
+        std::size_t removals = 0;              // of the group, as far as is known
     };
     struct Labels {
         std::vector<Target> targets;
@@ -78,7 +80,13 @@ class C2KLabels
     };
 
     void publish(std::size_t slot, const Field& field, const Record* record, std::int64_t raw);
-    Labels& labelsOf(std::size_t slot, const Field& field);
+    Labels& showPilots(const Field& field, std::vector<ShownPilot> pilots);
+    Labels& labelsOf(std::size_t slot, const Field& field)
+    {
+        const bool areKnown = slot < _labels.size() && _labels[slot].hasTargets;
+        return areKnown ? _labels[slot] : lookUpLabels(slot, field);
+    }
+    Labels& lookUpLabels(std::size_t slot, const Field& field);
     std::vector<Target> targetsOf(std::string_view lookupKey) const;
     static PlistValue& valueOf(Target& target);
     static void store(Labels& labels, std::string_view text);

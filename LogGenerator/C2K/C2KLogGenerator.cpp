@@ -13,6 +13,7 @@
 
 #include <algorithm>
 #include <array>
+#include <utility>
 
 namespace ventrik
 {
@@ -80,7 +81,7 @@ PlistDictionary C2KLogGenerator::getStartCommand() const
 void C2KLogGenerator::updateState(PlistDictionary& state, ByteView data)
 {
     ensureDisplay(state);
-    const PlistDictionary::Entry* entry = state.entryAt(_lookupPlace);
+    const PlistDictionary::Entry* entry = std::as_const(state).entryAt(_lookupPlace);
     const PlistValue* lookup =
         entry && entry->key == StateKey::lookup ? &entry->value : state.find(StateKey::lookup);
     updateFromLog(data, lookup ? lookup->dictionary() : nullptr, state);
@@ -105,7 +106,7 @@ void C2KLogGenerator::updateFromLog(ByteView data, const PlistDictionary* lookup
     if (hasItsSize(packet, *decoder, log())) {
         _lastRead = {decoder->record->logCode, versionOf(*decoder->record, packet), packet.size(),
                      LayoutKind::Base};
-        decoder->decode(packet, C2KOutput(_labels, state, log(), decoder->record));
+        decoder->decode(packet, C2KOutput(_labels, _totals, state, log(), decoder->record));
     }
     keepPacket(packet.bytes());
 }
@@ -152,7 +153,7 @@ std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& 
 
 const PlistValue* C2KLogGenerator::ensureDisplay(PlistDictionary& state)
 {
-    const PlistDictionary::Entry* entry = state.entryAt(_displayPlace);
+    const PlistDictionary::Entry* entry = std::as_const(state).entryAt(_displayPlace);
     if (entry && _display.refersTo(entry->value) && entry->key == StateKey::display)
         return &entry->value;
     claimDisplay(state, templateName);

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/C2K/C2KLabels.h"
+#include "LogGenerator/C2K/C2KOutput.h"
 #include "LogGenerator/Orbel/OrbelLogGenerator.h"
 
 namespace ventrik
@@ -46,6 +47,7 @@ class C2KLogGenerator : public OrbelLogGenerator
     void useDisplay(const PlistDictionary& state);
 
     C2KLabels _labels;
+    TotalPlaces _totals;
     std::optional<ReadLayout> _lastRead;
     // The display that was made of our template; and where it and its lookup are in the state.
     WeakContainer _display;

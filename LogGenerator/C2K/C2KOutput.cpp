@@ -2,6 +2,8 @@
 
 #include "LogGenerator/Core/StateKeys.h"
 
+#include <utility>
+
 namespace ventrik
 {
 
@@ -20,10 +22,15 @@ void C2KOutput::publish(const Field& field, std::string_view text) const
     _labels.publish(field, text);
 }
 
-void C2KOutput::publish(const Field& field, const std::vector<ShownPilot>& pilots,
+void C2KOutput::publish(std::span<const Field> fields, std::string_view text) const
+{
+    _labels.publish(fields, text);
+}
+
+void C2KOutput::publish(const Field& field, std::vector<ShownPilot> pilots,
                         std::string_view textOfNone) const
 {
-    _labels.publish(field, pilots, textOfNone);
+    _labels.publish(field, std::move(pilots), textOfNone);
 }
 
 PlistDictionary* C2KOutput::extraInfo() const

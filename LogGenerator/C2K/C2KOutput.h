@@ -5,10 +5,29 @@
 #include "Platform/SystemLog.h"
 #include "PropertyList/PlistValue.h"
 
+#include <cstddef>
 #include <string_view>
+#include <vector>
 
 namespace ventrik
 {
+
+/// Where the running totals stood the last time, so that they are found without a search.
+struct TotalPlaces {
+    struct Rate {
+        // In the state.
+        std::size_t sequence = 0;
+        std::size_t sent = 0;
+        // In the extra information: the last record and the one before it.
+        std::size_t sequence1 = 0;
+        std::size_t sent1 = 0;
+        std::size_t sequence2 = 0;
+        std::size_t sent2 = 0;
+    };
+    Rate forward;
+    Rate reverse;
+    std::size_t trafficFER = 0; // in the state
+};
 
 /// Where a decoder leaves what it found: the labels of the display; and the state dictionary, for
 /// what it must know at its next packet. It owns none of them.
@@ -16,9 +35,9 @@ class C2KOutput
 {
   public:
     /// The record is the one that is being decoded; null where there is none.
-    C2KOutput(C2KLabels& labels, PlistDictionary& state, SystemLog& log,
+    C2KOutput(C2KLabels& labels, TotalPlaces& totals, PlistDictionary& state, SystemLog& log,
               const Record* record = nullptr)
-        : _labels(labels), _state(state), _log(log), _record(record)
+        : _labels(labels), _totals(totals), _state(state), _log(log), _record(record)
     {
     }
 
@@ -28,8 +47,10 @@ class C2KOutput
     void publish(std::span<const Field> fields, const LogPacket& part) const;
     /// Shows a text in the place of the field's number.
     void publish(const Field& field, std::string_view text) const;
+    /// Shows a text, a constant, in the place of each number of a table of fields.
+    void publish(std::span<const Field> fields, std::string_view text) const;
     /// Shows a group of pilots, or the text while there is none.
-    void publish(const Field& field, const std::vector<ShownPilot>& pilots,
+    void publish(const Field& field, std::vector<ShownPilot> pilots,
                  std::string_view textOfNone) const;
     /// Shows the group of pilots that `pilots()` works out from those bytes, and from nothing else.
     template <typename Pilots>
@@ -40,12 +61,14 @@ class C2KOutput
     }
 
     PlistDictionary& state() const { return _state; }
+    TotalPlaces& totals() const { return _totals; }
     /// The state's "ExtraInfo", which travels with the history; null when there is none.
     PlistDictionary* extraInfo() const;
     SystemLog& log() const { return _log; }
 
   private:
     C2KLabels& _labels;
+    TotalPlaces& _totals;
     PlistDictionary& _state;
     SystemLog& _log;
     const Record* _record;

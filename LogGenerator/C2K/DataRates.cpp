@@ -3,12 +3,11 @@
 #include "LogGenerator/C2K/C2KOutput.h"
 #include "LogGenerator/Core/StateKeys.h"
 #include "Packets/C2KRecords.h"
+#include "Packets/DecimalText.h"
 #include "Packets/LogPacket.h"
 
 #include <array>
-
-#include <fmt/compile.h>
-#include <fmt/format.h>
+#include <string>
 
 namespace ventrik
 {
@@ -49,47 +48,54 @@ constexpr Direction reverse{
     reverseRate,   StateKey::reverseSequence, StateKey::reverseSent, "RLDataSeqNum1",
     "RLDataSent1", "RLDataSeqNum2",           "RLDataSent2"};
 
-const PlistInteger* keptNumber(const PlistDictionary& state, std::string_view key)
+const PlistInteger* numberIn(const PlistValue* value)
 {
-    const PlistValue* value = state.find(key);
     return value ? value->integer() : nullptr;
 }
 
-void updateRate(const Direction& direction, std::uint32_t sequence, std::int64_t sent,
-                const C2KOutput& output)
+void keep(PlistDictionary& dictionary, std::string_view key, std::size_t& place,
+          PlistInteger number)
+{
+    if (PlistValue* kept = dictionary.find(key, place))
+        *kept = number;
+    else
+        dictionary.set(key, number);
+}
+
+std::string textOfRate(double bits, std::int32_t steps)
+{
+    std::string text;
+    appendTwoDecimals(text, bits / (steps * 1024.0));
+    return text += " kbps";
+}
+
+void updateRate(const Direction& direction, TotalPlaces::Rate& places, std::uint32_t sequence,
+                std::int64_t sent, const C2KOutput& output)
 {
     PlistDictionary& state = output.state();
     PlistDictionary* extraInfo = output.extraInfo();
-    const auto keepExtra = [&](std::string_view key, const PlistValue& value) {
+    const auto keepExtra = [&](std::string_view key, std::size_t& place, PlistInteger number) {
         if (extraInfo)
-            extraInfo->set(key, value);
+            keep(*extraInfo, key, place, number);
     };
-    const PlistInteger* previousSequence = keptNumber(state, direction.sequenceKey);
-    const PlistInteger* previousSent = keptNumber(state, direction.sentKey);
+    const auto* previousSequence = numberIn(state.find(direction.sequenceKey, places.sequence));
+    const auto* previousSent = numberIn(state.find(direction.sentKey, places.sent));
     if (previousSequence && previousSent) {
         const auto steps = static_cast<std::int32_t>(
             sequence - static_cast<std::uint32_t>(previousSequence->bits()));
         const auto added = static_cast<double>(sent - previousSent->signedBits());
         if (steps >= 1)
-            output.publish(direction.rate,
-                           fmt::format(FMT_COMPILE("{:.2f} kbps"), added / (steps * 1024.0)));
-        keepExtra(direction.sequence2Key, *previousSequence);
-        keepExtra(direction.sent2Key, *previousSent);
+            output.publish(direction.rate, textOfRate(added, steps));
+        keepExtra(direction.sequence2Key, places.sequence2, *previousSequence);
+        keepExtra(direction.sent2Key, places.sent2, *previousSent);
     } else {
         output.publish(direction.rate, "");
     }
-    keepExtra(direction.sequence1Key, sequence);
-    keepExtra(direction.sent1Key, sent);
+    keepExtra(direction.sequence1Key, places.sequence1, sequence);
+    keepExtra(direction.sent1Key, places.sent1, sent);
     // Last: the state may move what it holds.
-    state.set(direction.sequenceKey, sequence);
-    state.set(direction.sentKey, sent);
-}
-
-// The sum of the counters that stand there, two of them in eight bytes.
-std::int64_t sumOfTwo(const LogPacket& packet, std::size_t offset)
-{
-    const std::uint64_t word = packet.littleEndianWord(offset);
-    return static_cast<std::int64_t>((word & 0xFFFFFFFF) + (word >> 32));
+    keep(state, direction.sequenceKey, places.sequence, sequence);
+    keep(state, direction.sentKey, places.sent, sent);
 }
 
 std::uint32_t sequenceNumber(const LogPacket& packet, const Field& field)
@@ -101,28 +107,32 @@ std::uint32_t sequenceNumber(const LogPacket& packet, const Field& field)
 
 void decodeForwardDataRate(const LogPacket& packet, const C2KOutput& output)
 {
-    const RecordElements& kinds = C2KRecords::forwardCounters;
+    constexpr const RecordElements& kinds = C2KRecords::forwardCounters;
+    static_assert(kinds.stride == sizeof(std::uint32_t));
+    std::array<std::uint32_t, kinds.count> packets{};
+    packet.u32s(kinds.offset, packets);
     std::int64_t sent = 0;
-    for (std::size_t kind = 0; kind < kinds.count; ++kind)
-        sent += packet.u32(kinds.offset + kinds.stride * kind) * forwardBits.at(kind);
-    updateRate(forward, sequenceNumber(packet, C2KRecords::forwardPacketsUnshown.front()), sent,
-               output);
+    for (std::size_t kind = 0; kind < packets.size(); ++kind)
+        sent += packets[kind] * forwardBits[kind];
+    updateRate(forward, output.totals().forward,
+               sequenceNumber(packet, C2KRecords::forwardPacketsUnshown.front()), sent, output);
 }
 
 void decodeReverseDataRate(const LogPacket& packet, const C2KOutput& output)
 {
-    const RecordElements& sizes = C2KRecords::reverseCounters;
+    constexpr const RecordElements& sizes = C2KRecords::reverseCounters;
+    constexpr std::size_t numbersEach = sizes.stride / sizeof(std::uint32_t);
+    std::array<std::uint32_t, sizes.count * numbersEach> numbers{};
+    packet.u32s(sizes.offset, numbers);
     std::int64_t sent = 0;
     for (std::size_t i = 0; i < sizes.count; ++i) {
-        const std::size_t start = sizes.offset + sizes.stride * i;
-        constexpr auto& counters = C2KRecords::payloadCounterFields;
-        static_assert(counters.size() == 4);
-        const std::int64_t packets = sumOfTwo(packet, start + counters[0].place.offset) +
-                                     sumOfTwo(packet, start + counters[2].place.offset);
+        std::int64_t packets = 0;
+        for (std::size_t counter = 0; counter < C2KRecords::countersForPayloadSize; ++counter)
+            packets += numbers[numbersEach * i + counter];
         sent += packets * reverseBits[i % reverseBits.size()];
     }
-    updateRate(reverse, sequenceNumber(packet, C2KRecords::reversePacketsUnshown.front()), sent,
-               output);
+    updateRate(reverse, output.totals().reverse,
+               sequenceNumber(packet, C2KRecords::reversePacketsUnshown.front()), sent, output);
 }
 
 } // namespace ventrik

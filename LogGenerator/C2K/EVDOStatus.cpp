@@ -14,8 +14,7 @@ void decodeEVDOStatus(const LogPacket& packet, const C2KOutput& output)
     const bool isActive = numberOf(packet, C2KRecords::evdoDeviceState) >= accessState;
     if (isActive)
         return output.publish(C2KRecords::evdoActiveFields, packet);
-    for (const Field& field : C2KRecords::evdoActiveFields)
-        output.publish(field, "N/A");
+    output.publish(std::span(C2KRecords::evdoActiveFields), "N/A");
 }
 
 } // namespace ventrik

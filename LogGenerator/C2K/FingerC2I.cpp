@@ -3,6 +3,8 @@
 #include "LogGenerator/C2K/C2KOutput.h"
 #include "Packets/C2KRecords.h"
 
+#include <utility>
+
 namespace ventrik
 {
 
@@ -16,13 +18,14 @@ void decodeFingerC2I(const LogPacket& packet, const C2KOutput& output)
         return;
     }
     std::vector<ShownPilot> pilots;
+    pilots.reserve(elements.count);
     for (std::size_t i = 0; i < elements.count; ++i) {
         const LogPacket finger = elements.element(packet, i);
         if (numberOf(finger, C2KRecords::fingerPNOffset) != C2KRecords::unassignedFinger)
             pilots.push_back(
                 shownPilot(i, finger, C2KRecords::fingerPNOffset, C2KRecords::fingerRatio));
     }
-    output.publish(C2KRecords::fingerGroup, pilots, "(none)");
+    output.publish(C2KRecords::fingerGroup, std::move(pilots), "(none)");
 }
 
 } // namespace ventrik

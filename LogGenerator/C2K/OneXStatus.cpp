@@ -6,6 +6,7 @@
 #include "Packets/C2KRecords.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 
 namespace ventrik
@@ -20,8 +21,7 @@ void publishRadio(const LogPacket& radio, bool isInTraffic, const C2KOutput& out
     if (isInTraffic)
         return output.publish(fields, radio);
     output.publish(fields.first(C2KRecords::alwaysShownRadioFields), radio);
-    for (const Field& field : fields.subspan(C2KRecords::alwaysShownRadioFields))
-        output.publish(field, "N/A");
+    output.publish(fields.subspan(C2KRecords::alwaysShownRadioFields), "N/A");
 }
 
 // Energy over total, in dB; whatever comes out too low, or as no number, shows as -50 dB.
@@ -68,8 +68,10 @@ std::vector<ShownPilot> pilotsOf(const LogPacket& activeSet, const PilotLayout& 
 {
     const auto& [pnOffset, energy, elements] = layout;
     const std::int64_t reference = numberOf(activeSet, C2KRecords::referencePNOffset);
+    const std::size_t count = elements.completeIn(activeSet);
     std::vector<ShownPilot> pilots;
-    for (std::size_t i = 0; i < elements.completeIn(activeSet); ++i) {
+    pilots.reserve(count);
+    for (std::size_t i = 0; i < count; ++i) {
         const LogPacket pilot = elements.element(activeSet, i);
         const std::int64_t number = numberOf(pilot, pnOffset);
         pilots.push_back({i, static_cast<std::uint16_t>(number),
@@ -83,10 +85,15 @@ std::vector<ShownPilot> pilotsOf(const LogPacket& activeSet, const PilotLayout& 
 void decodeOneXStatus(const LogPacket& packet, const C2KOutput& output)
 {
     constexpr std::int64_t trafficState = 8;
-    const auto state = findSubpacket(packet, C2KRecords::statePart, output.log());
-    const auto radio = findSubpacket(packet, C2KRecords::radioPart, output.log());
-    const auto activeSet = findSubpacket(packet, C2KRecords::activeSetPart, output.log());
-    const auto fingers = findSubpacket(packet, C2KRecords::fingerPart, output.log());
+    std::array<SoughtSubpacket, 4> parts{{{C2KRecords::statePart},
+                                          {C2KRecords::radioPart},
+                                          {C2KRecords::activeSetPart},
+                                          {C2KRecords::fingerPart}}};
+    findSubpackets(packet, parts, output.log());
+    const auto& state = parts[0].found;
+    const auto& radio = parts[1].found;
+    const auto& activeSet = parts[2].found;
+    const auto& fingers = parts[3].found;
     if (!state || !radio || !activeSet || !fingers) {
         output.log().warning(
             "Log code 0x119c: missing subpacket (ss={:d},rf={:d},ai={:d},fi={:d}).",

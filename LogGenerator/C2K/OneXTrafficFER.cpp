@@ -18,9 +18,14 @@ constexpr float oldShare = 0.984375F;
 
 constexpr Field frameErasureRate{"k1xTrafficFER", {}};
 
-std::optional<float> keptRate(const PlistDictionary& state)
+PlistValue* keptValue(const C2KOutput& output)
 {
-    const PlistValue* kept = state.find(StateKey::trafficFER);
+    return output.state().find(StateKey::trafficFER, output.totals().trafficFER);
+}
+
+std::optional<float> keptRate(const C2KOutput& output)
+{
+    const PlistValue* kept = keptValue(output);
     const double* rate = kept ? kept->real() : nullptr;
     return rate ? std::optional(static_cast<float>(*rate)) : std::nullopt;
 }
@@ -42,7 +47,7 @@ void decodeOneXTrafficFER(const LogPacket& packet, const C2KOutput& output)
         return;
     }
     float rate = numberOf(*demodulation, C2KRecords::frameErasure) != 0 ? newShare : 0.0F;
-    PlistValue* kept = output.state().find(StateKey::trafficFER);
+    PlistValue* kept = keptValue(output);
     if (kept && kept->real()) {
         rate += static_cast<float>(*kept->real()) * oldShare;
         *kept = static_cast<double>(rate);
@@ -54,7 +59,7 @@ void decodeOneXTrafficFER(const LogPacket& packet, const C2KOutput& output)
 
 void endTrafficFER(const C2KOutput& output)
 {
-    const auto rate = keptRate(output.state());
+    const auto rate = keptRate(output);
     if (!rate)
         return;
     output.publish(frameErasureRate, percent(*rate) + " (old)");

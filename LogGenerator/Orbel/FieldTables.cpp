@@ -8,15 +8,8 @@ namespace ventrik
 void FieldTables::forgetAll()
 {
     _tables.clear();
+    _textTables.clear();
     _writers.clear();
-}
-
-void FieldTables::noteWriter(std::size_t slot)
-{
-    if (slot >= _writers.size())
-        _writers.resize(slot + 1);
-    if (std::exchange(_writers[slot], _visited) != _visited)
-        ++_handovers;
 }
 
 FieldTables::Table& FieldTables::tableOf(std::span<const Field> fields, FieldMemory& memory)
@@ -24,13 +17,22 @@ FieldTables::Table& FieldTables::tableOf(std::span<const Field> fields, FieldMem
     for (Table& table : _tables)
         if (table.bytes.areOf(fields))
             return table;
-    Table& table = _tables.emplace_back(Table{FieldBytes(fields)});
+    Table& table = _tables.emplace_back(fields);
     for (const Field& field : fields) {
         const std::size_t slot = memory.slotOf(field.key);
         table.hasKeyTwice |= std::ranges::find(table.slots, slot) != table.slots.end();
         table.slots.push_back(slot);
     }
     return table;
+}
+
+FieldTables::TextTable& FieldTables::tableOf(std::span<const Field> fields, std::string_view text)
+{
+    for (TextTable& table : _textTables)
+        if (table.fields.data() == fields.data() && table.fields.size() == fields.size() &&
+            table.text == text)
+            return table;
+    return _textTables.emplace_back(fields, text);
 }
 
 } // namespace ventrik

@@ -12,8 +12,9 @@ namespace ventrik
 {
 
 /// Tables of fields that show under the keys of a field memory, and the bytes that each showed
-/// last: only the fields whose bytes changed are visited again. Whoever writes a key says so; after
-/// another one wrote a key of a table, all of the table is visited.
+/// last: only the fields whose bytes changed are visited again. A table may show a text in the
+/// place of all its numbers as well. Whoever writes a key says so; after another one wrote a key of
+/// a table, all of the table is visited.
 class FieldTables
 {
   public:
@@ -28,27 +29,55 @@ class FieldTables
     void visit(std::span<const Field> fields, const LogPacket& part, FieldMemory& memory,
                const Show& show);
 
+    /// Calls `show` with each field of a table that shows the text, a constant, in the place of its
+    /// numbers, where it may not show yet.
+    template <typename Show>
+    void visit(std::span<const Field> fields, std::string_view text, const Show& show);
+
     /// The slot's key is written: by the table that is being visited, or else by a single field.
     void noteWriter(std::size_t slot);
 
   private:
-    struct Table {
+    struct Writer {
+        std::size_t handovers = 0; // after its last visit; 0: there was none yet
+    };
+    struct Table : Writer {
+        explicit Table(std::span<const Field> fields) : bytes(fields) {}
+
         FieldBytes bytes;
         FieldBytes::Words words = {};
         std::vector<std::size_t> slots = {}; // of the fields' keys
         bool hasKeyTwice = false;
-        std::size_t handovers = 0; // after its last visit; 0: there was none yet
+    };
+    struct TextTable : Writer {
+        TextTable(std::span<const Field> shown, std::string_view shownText)
+            : fields(shown), text(shownText)
+        {
+        }
+
+        std::span<const Field> fields;
+        std::string_view text;
     };
 
     Table& tableOf(std::span<const Field> fields, FieldMemory& memory);
+    TextTable& tableOf(std::span<const Field> fields, std::string_view text);
 
     std::list<Table> _tables;
-    std::vector<const Table*> _writers; // of each slot's key, the last one; null: a single field
-    const Table* _visited = nullptr;
+    std::list<TextTable> _textTables;
+    std::vector<const Writer*> _writers; // of each slot's key, the last one; null: a single field
+    const Writer* _visited = nullptr;
     // How often a key got another writer, or all was forgotten: what a table showed then may be
     // there no longer.
     std::size_t _handovers = 1;
 };
+
+inline void FieldTables::noteWriter(std::size_t slot)
+{
+    if (slot >= _writers.size())
+        _writers.resize(slot + 1);
+    if (std::exchange(_writers[slot], _visited) != _visited)
+        ++_handovers;
+}
 
 template <typename Show>
 void FieldTables::visit(std::span<const Field> fields, const LogPacket& part, FieldMemory& memory,
@@ -70,6 +99,19 @@ void FieldTables::visit(std::span<const Field> fields, const LogPacket& part, Fi
             showField(i);
         table.handovers = table.hasKeyTwice ? 0 : _handovers;
     }
+    _visited = nullptr;
+}
+
+template <typename Show>
+void FieldTables::visit(std::span<const Field> fields, std::string_view text, const Show& show)
+{
+    TextTable& table = tableOf(fields, text);
+    if (table.handovers == _handovers)
+        return;
+    _visited = &table;
+    for (const Field& field : fields)
+        show(field);
+    table.handovers = _handovers;
     _visited = nullptr;
 }
 

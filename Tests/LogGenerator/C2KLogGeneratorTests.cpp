@@ -48,13 +48,30 @@ class C2KOutputTest : public testing::Test
     {
         C2KLabels labels;
         labels.useLookup(&lookup);
-        C2KOutput(labels, state, log).publish(valueField, "v");
+        C2KOutput(labels, totals, state, log).publish(valueField, "v");
     }
 
     CapturingSystemLog log;
+    TotalPlaces totals;
     PlistDictionary state;
     PlistDictionary display;
     PlistDictionary lookup;
+};
+
+class C2KTextTableTest : public C2KOutputTest
+{
+  protected:
+    C2KTextTableTest()
+    {
+        lookup.set("k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", display}}});
+        lookup.set("l", PlistArray{PlistDictionary{{"key", "B"}, {"dict", display}}});
+        labels.useLookup(&lookup);
+    }
+    void publishText() { labels.publish(table, "N/A"); }
+    void publishNumbers(const Bytes& part) { labels.publish(table, nullptr, LogPacket(part)); }
+
+    static constexpr std::array<Field, 2> table{{{"k", u8(0)}, {"l", u8(1)}}};
+    C2KLabels labels;
 };
 
 class C2KWithoutTemplateTest : public GeneratorFixture
@@ -263,9 +280,10 @@ TEST_F(C2KProcessTemplateTest, OnePublishedValueFillsAllItsLabels)
 {
     process({{"Channel", "kChannel"}, {"Status", PlistDictionary{{"Number", "kChannel"}}}});
     PlistDictionary state;
+    TotalPlaces totals;
     C2KLabels labels;
     labels.useLookup(&lookup);
-    C2KOutput(labels, state, log).publish(channelField, "283");
+    C2KOutput(labels, totals, state, log).publish(channelField, "283");
     EXPECT_EQ(textAt(display, {"Channel"}), "283");
     EXPECT_EQ(textAt(display, {"Status", "Number"}), "283");
 }
@@ -322,6 +340,71 @@ TEST_F(C2KOutputTest, AnUnchangedValueIsNotStoredAgain)
     labels.publish(field, "N/A");
     labels.publish(field, nullptr, 6);
     EXPECT_EQ(textAt(display, {"A"}), "6");
+}
+
+TEST_F(C2KTextTableTest, ShowsTheTextInThePlaceOfEachNumber)
+{
+    publishText();
+    EXPECT_EQ(display, (PlistDictionary{{"A", "N/A"}, {"B", "N/A"}}));
+}
+
+TEST_F(C2KTextTableTest, NumbersAndTextsTakeTurns)
+{
+    for (int i = 0; i < 2; ++i) {
+        publishNumbers({5, 6});
+        EXPECT_EQ(display, (PlistDictionary{{"A", "5"}, {"B", "6"}}));
+        publishText();
+        EXPECT_EQ(display, (PlistDictionary{{"A", "N/A"}, {"B", "N/A"}}));
+    }
+}
+
+TEST_F(C2KTextTableTest, TheTextComesAgainAfterASingleField)
+{
+    publishText();
+    labels.publish(table[1], "mine");
+    publishText();
+    EXPECT_EQ(textAt(display, {"B"}), "N/A");
+}
+
+// Who wrote the same text last matters: that one's next text is another.
+TEST_F(C2KTextTableTest, TheTextComesAgainAfterASingleFieldThatHadTheSameOne)
+{
+    publishText();
+    labels.publish(table[1], "N/A");
+    publishText();
+    labels.publish(table[1], "mine");
+    publishText();
+    EXPECT_EQ(textAt(display, {"B"}), "N/A");
+}
+
+TEST_F(C2KTextTableTest, NumbersComeAgainAfterAPartOfTheirTableShowedOthers)
+{
+    const auto first = std::span(table).first(1);
+    const Bytes five{5, 6};
+    const Bytes seven{7, 6};
+    labels.publish(first, nullptr, LogPacket(five));
+    publishNumbers(five);
+    labels.publish(first, nullptr, LogPacket(seven));
+    publishNumbers(five);
+    EXPECT_EQ(textAt(display, {"A"}), "5");
+}
+
+TEST_F(C2KTextTableTest, TheTextShowsAgainInAnotherLookup)
+{
+    publishText();
+    const PlistDictionary shown;
+    const PlistDictionary other{{"k", PlistArray{PlistDictionary{{"key", "A"}, {"dict", shown}}}}};
+    labels.useLookup(&other);
+    publishText();
+    EXPECT_EQ(shown, (PlistDictionary{{"A", "N/A"}}));
+}
+
+TEST_F(C2KTextTableTest, AnUnchangedTextIsNotStoredAgain)
+{
+    publishText();
+    display.set("A", "mine");
+    publishText();
+    EXPECT_EQ(textAt(display, {"A"}), "mine");
 }
 
 TEST_F(C2KOutputTest, AnotherLookupIsFilledAnew)

@@ -315,7 +315,7 @@ std::string VentrikApp::timeLineStatus() const
         return _pauseFormatter->stringFromDate(*at);
     if (_reading)
         return _reading->status();
-    return _model && _model->isConnected() ? "Live" : connectingStatus;
+    return presentStatus();
 }
 
 // Not before the launch has returned; by then the application may have ended again.
@@ -405,9 +405,15 @@ void VentrikApp::goLive()
         _timeLine.goLive();
 }
 
+// Behind the moment stands what it leads back to.
 std::string VentrikApp::pausedStatus() const
 {
-    return _pauseFormatter->stringFromDate(*_timeLine.pausedAt()) + " · Live";
+    return _pauseFormatter->stringFromDate(*_timeLine.pausedAt()) + " · " + presentStatus();
+}
+
+std::string VentrikApp::presentStatus() const
+{
+    return _model && _model->isConnected() ? "Live" : connectingStatus;
 }
 
 // From the bottom up to the first screen above the root that has nothing left to show.

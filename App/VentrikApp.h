@@ -151,6 +151,7 @@ class VentrikApp : public NavigationStackDelegate, public VentrikPaneHost, publi
     void openPane(const std::string& path);
     void togglePause();
     std::string pausedStatus() const;
+    std::string presentStatus() const;
     std::string timeLineStatus() const;
     void openCapture();
     std::string_view technologyName() const;

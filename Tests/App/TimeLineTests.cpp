@@ -728,6 +728,18 @@ TEST_F(TimeLineWindowTest, TheBarIsNotLiveWhileTheChannelIsLost)
     EXPECT_EQ(bar.text(), "Connecting...");
 }
 
+TEST_F(TimeLineWindowTest, APauseTellsThatTheChannelIsLostMeanwhile)
+{
+    fake.resources.add("/res/LTE.plist", cellTemplate);
+    launch(900);
+    press(Qt::Key_Space);
+    ASSERT_TRUE(window->timeLine().isPaused());
+    EXPECT_THAT(statusText(top()), testing::EndsWith(" · Live"));
+    loseService();
+    fake.mainQueue.advance(4s); // the model finds out
+    EXPECT_THAT(statusText(top()), testing::EndsWith(" · Connecting..."));
+}
+
 TEST_F(TimeLineWindowTest, AClickOnACellOpensItsPaneWithTheWayBackBelowIt)
 {
     fake.resources.add("/res/LTE.plist", cellTemplate);

@@ -9,10 +9,8 @@ target_compile_options(ventrik-options INTERFACE
 if(VENTRIK_SANITIZE)
   target_compile_options(ventrik-options INTERFACE
     -fsanitize=address -fno-sanitize-recover=all -fno-omit-frame-pointer
-    # Those checks count in what is tested; in the tests they take longest of all to compile. Null
-    # pointers end a program by themselves; to look at each before its use is a seventh of the work.
-    $<$<NOT:$<BOOL:$<TARGET_PROPERTY:VENTRIK_TESTS>>>:-fsanitize=undefined>
-    $<$<NOT:$<BOOL:$<TARGET_PROPERTY:VENTRIK_TESTS>>>:-fno-sanitize=null>)
+    # Those checks count in what is tested; in the tests they take longest of all to compile.
+    $<$<NOT:$<BOOL:$<TARGET_PROPERTY:VENTRIK_TESTS>>>:-fsanitize=undefined>)
   target_link_options(ventrik-options INTERFACE -fsanitize=address,undefined)
 endif()
 
@@ -42,7 +40,7 @@ endfunction()
 function(ventrik_library name)
   add_library(${name} STATIC ${ARGN})
   target_link_libraries(${name} PUBLIC ventrik-options)
-  list(LENGTH ARGN count)
+  list(LENGTH ARGN count) # for a few files it takes longer than it saves
   if(count GREATER 8)
     ventrik_precompile(${name} <algorithm> <array> <functional> <map> <memory> <optional> <ranges>
       <span> <string> <unordered_map> <variant> <vector> <fmt/format.h>)
@@ -62,9 +60,10 @@ function(ventrik_test_options target)
 endfunction()
 
 # ventrik_test(NAME [WAITING] LIBRARIES ... SOURCES ...): a GoogleTest program whose tests ctest knows
-# one by one; those of a WAITING one wait for other processes most of the time.
+# one by one; those of a WAITING one wait for other processes most of the time, and those that match
+# ALONE, a GoogleTest filter, are timed so closely that nothing runs beside them.
 function(ventrik_test name)
-  cmake_parse_arguments(ARG "WAITING" "" "LIBRARIES;SOURCES;PROPERTIES" ${ARGN})
+  cmake_parse_arguments(ARG "WAITING" "ALONE" "LIBRARIES;SOURCES;PROPERTIES" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBRARIES})
   ventrik_test_options(${name})
@@ -72,7 +71,14 @@ function(ventrik_test name)
   # Under the sanitizers a program's start takes longer than most tests: tests share one, unless they
   # mostly wait.
   if(NOT VENTRIK_SANITIZE OR ARG_WAITING)
-    gtest_discover_tests(${name} DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 120 ${ARG_PROPERTIES})
+    set(others)
+    if(ARG_ALONE)
+      set(others TEST_FILTER "-${ARG_ALONE}")
+      gtest_discover_tests(${name} TEST_FILTER "${ARG_ALONE}" DISCOVERY_TIMEOUT 60
+        PROPERTIES TIMEOUT 120 RUN_SERIAL ON ${ARG_PROPERTIES})
+    endif()
+    gtest_discover_tests(${name} ${others} DISCOVERY_TIMEOUT 60
+      PROPERTIES TIMEOUT 120 ${ARG_PROPERTIES})
     return()
   endif()
   set(shards 4)

@@ -77,18 +77,14 @@ class LostStream : public LyingService, public testing::WithParamInterface<Fault
 // A tick notices, the channel is opened anew at once, and a tick shows what came.
 constexpr std::chrono::seconds twoTicks{5};
 
-// The longest that a message may stand still, and a second more for busy machines: more runs
-// meanwhile.
-constexpr std::chrono::seconds stalled{6};
-
 const std::vector<Fault> faults{
     {"close", twoTicks},
     {"half-close", twoTicks},
     {"bad-flags", twoTicks},
     {"bad-header", twoTicks},
     {"too-large", twoTicks},
-    {"stall-in-header", stalled + twoTicks},
-    {"stall-in-message", stalled + twoTicks},
+    {"stall-in-header", 5s + twoTicks},
+    {"stall-in-message", 5s + twoTicks},
 };
 
 std::string nameOfFault(const testing::TestParamInfo<Fault>& info)

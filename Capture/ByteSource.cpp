@@ -8,6 +8,7 @@
 #include <archive_entry.h>
 #include <fcntl.h>
 #include <fmt/format.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace ventrik
@@ -35,6 +36,8 @@ class OpenFile
 
     bool open(const std::string& path, std::string& error);
     std::size_t read(std::span<std::uint8_t> room, std::string& error);
+    /// Of a file that is not compressed and that can be read from anywhere; -1 of others.
+    int plainFile() const;
 
   private:
     static la_ssize_t readBlock(archive* handle, void* self, const void** block);
@@ -102,6 +105,16 @@ std::size_t OpenFile::read(std::span<std::uint8_t> room, std::string& error)
     return count;
 }
 
+int OpenFile::plainFile() const
+{
+    struct stat status {
+    };
+    const bool isFile = ::fstat(_descriptor, &status) == 0 && S_ISREG(status.st_mode);
+    // The last filter is the one that passes on what it gets.
+    const bool isPlain = archive_filter_count(_handle) == 1;
+    return isFile && isPlain && _descriptor != STDIN_FILENO ? _descriptor : -1;
+}
+
 std::string OpenFile::reason() const
 {
     const char* text = archive_error_string(_handle);
@@ -115,9 +128,12 @@ std::unique_ptr<ByteSource> ByteSource::open(const std::string& path, std::strin
     const auto file = std::make_shared<OpenFile>(path == "-" ? "standard input" : path);
     if (!file->open(path, error))
         return nullptr;
-    return std::make_unique<ByteSource>([file](std::span<std::uint8_t> room, std::string& reason) {
-        return file->read(room, reason);
-    });
+    auto source =
+        std::make_unique<ByteSource>([file](std::span<std::uint8_t> room, std::string& reason) {
+            return file->read(room, reason);
+        });
+    source->_plainFile = file->plainFile();
+    return source;
 }
 
 ByteSource::ByteSource(Bytes bytes, std::size_t blockSize)
@@ -167,6 +183,37 @@ void ByteSource::skip(std::size_t size)
     const std::size_t taken = std::min(size, _end - _start);
     _start += taken;
     _offset += taken;
+}
+
+std::FILE* ByteSource::stream()
+{
+    if (std::FILE* file = fileItself()) {
+        // By itself a stream asks for a page at a time.
+        _streamBuffer.resize(readSize);
+        std::setvbuf(file, _streamBuffer.data(), _IOFBF, _streamBuffer.size());
+        return file;
+    }
+    const auto read = [](void* self, char* room, std::size_t size) {
+        auto& source = *static_cast<ByteSource*>(self);
+        const std::size_t count = source.read({reinterpret_cast<std::uint8_t*>(room), size});
+        return count == 0 && !source.error().empty() ? -1 : static_cast<ssize_t>(count);
+    };
+    return fopencookie(this, "rb", {read, nullptr, nullptr, nullptr});
+}
+
+std::FILE* ByteSource::fileItself() const
+{
+    if (_plainFile < 0)
+        return nullptr;
+    const int descriptor = fcntl(_plainFile, F_DUPFD_CLOEXEC, 0);
+    if (descriptor < 0)
+        return nullptr;
+    const auto start = static_cast<off_t>(_offset);
+    std::FILE* file =
+        lseek(descriptor, start, SEEK_SET) == start ? fdopen(descriptor, "rb") : nullptr;
+    if (!file)
+        close(descriptor);
+    return file;
 }
 
 // What is left moves to the front, and the buffer stays as large as the largest that was asked for.

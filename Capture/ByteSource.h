@@ -4,10 +4,12 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
 #include <functional>
 #include <memory>
 #include <span>
 #include <string>
+#include <vector>
 
 namespace ventrik
 {
@@ -36,6 +38,11 @@ class ByteSource
     std::size_t read(std::span<std::uint8_t> room);
     /// Takes bytes that were peeked.
     void skip(std::size_t size);
+    /// What is not taken yet, as a stream for the caller, who closes it while this source lives and
+    /// takes no more here. Of a file that is not compressed it is that file itself, so that nothing
+    /// is copied on its way; `error` and `offset` then tell nothing of it. Null, with errno, where
+    /// there can be none.
+    std::FILE* stream();
     /// Of the next byte, in the uncompressed capture.
     std::uint64_t offset() const { return _offset; }
     /// Why the bytes end before their time; empty when they do not.
@@ -45,9 +52,12 @@ class ByteSource
 
   private:
     void fill(std::size_t size);
+    std::FILE* fileItself() const;
 
     Read _read;
+    int _plainFile = -1; // the reader's; none where it is compressed or no file
     Bytes _buffer;
+    std::vector<char> _streamBuffer;
     std::size_t _start = 0; // of what is not taken, in the buffer
     std::size_t _end = 0;
     std::uint64_t _offset = 0;

@@ -2,7 +2,9 @@
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <cstdio>
+#include <cstring>
 
 #include <fmt/format.h>
 #include <pcap/pcap.h>
@@ -31,14 +33,6 @@ constexpr std::array<std::array<std::uint8_t, 4>, 5> magics{{
     newerMagic,
 }};
 
-// The library reads from a stream; ours takes its bytes from the source.
-ssize_t readFromSource(void* cookie, char* room, std::size_t size)
-{
-    auto& source = *static_cast<ByteSource*>(cookie);
-    const std::size_t count = source.read({reinterpret_cast<std::uint8_t*>(room), size});
-    return count == 0 && !source.error().empty() ? -1 : static_cast<ssize_t>(count);
-}
-
 } // namespace
 
 bool PcapFile::isIn(ByteView firstBytes)
@@ -60,8 +54,11 @@ std::unique_ptr<PcapFile> PcapFile::open(std::unique_ptr<ByteSource> source, std
     std::unique_ptr<PcapFile> file(new PcapFile(std::move(source), std::move(name)));
     if (!std::ranges::equal(newerMagic, file->_source->peek(newerMagic.size())))
         file->_offset = headSize;
-    std::FILE* stream =
-        fopencookie(file->_source.get(), "rb", {readFromSource, nullptr, nullptr, nullptr});
+    std::FILE* stream = file->_source->stream();
+    if (!stream) {
+        error = fmt::format("{}: {}", file->_name, std::strerror(errno));
+        return nullptr;
+    }
     std::array<char, PCAP_ERRBUF_SIZE> reason{};
     file->_handle.reset(pcap_fopen_offline_with_tstamp_precision(stream, PCAP_TSTAMP_PRECISION_NANO,
                                                                  reason.data()));

@@ -10,6 +10,7 @@
 #include <archive_entry.h>
 #include <gmock/gmock.h>
 
+#include <cstdio>
 #include <fstream>
 
 namespace ventrik
@@ -69,6 +70,16 @@ std::vector<Bytes> messagesIn(CaptureContainer& container)
 PcapBytes threeMessages()
 {
     return PcapBytes(150).record(100, 0, {1, 2}).record(101, 0, {}).record(102, 0, {3, 4, 5});
+}
+
+/// What is in the stream from where it stands, and closes it.
+Bytes restOf(std::FILE* stream)
+{
+    Bytes rest;
+    for (int byte = std::fgetc(stream); byte != EOF; byte = std::fgetc(stream))
+        rest.push_back(static_cast<std::uint8_t>(byte));
+    std::fclose(stream);
+    return rest;
 }
 
 class CompressedCapture : public testing::TestWithParam<std::string>
@@ -182,6 +193,55 @@ TEST(ByteSource, LeavesNoFileOpen)
     EXPECT_EQ(openFileCount(), before);
 }
 
+TEST(ByteSource, AStreamGivesWhatIsNotTaken)
+{
+    const Bytes bytes = countedBytes(200000);
+    for (const std::size_t blockSize : {7U, 100000U}) {
+        ByteSource source(bytes, blockSize);
+        source.peek(100);
+        source.skip(30);
+        EXPECT_EQ(restOf(source.stream()), Bytes(bytes.begin() + 30, bytes.end())) << blockSize;
+        EXPECT_EQ(source.offset(), 200000U);
+    }
+}
+
+TEST(ByteSource, AStreamEndsInAnErrorWhereTheSourceDoes)
+{
+    ByteSource source([](std::span<std::uint8_t>, std::string& error) {
+        error = "broken";
+        return std::size_t{0};
+    });
+    std::FILE* stream = source.stream();
+    EXPECT_EQ(std::fgetc(stream), EOF);
+    EXPECT_TRUE(std::ferror(stream));
+    std::fclose(stream);
+}
+
+TEST(ByteSource, APlainFileIsItsOwnStream)
+{
+    const Bytes bytes = countedBytes(200000);
+    const TemporaryFile file("bytes");
+    writeBytes(file.path(), bytes);
+    std::string error;
+    const auto source = ByteSource::open(file.path(), error);
+    ASSERT_TRUE(source) << error;
+    source->peek(100);
+    source->skip(30);
+    std::FILE* stream = source->stream();
+    EXPECT_GE(fileno(stream), 0);
+    EXPECT_EQ(restOf(stream), Bytes(bytes.begin() + 30, bytes.end()));
+}
+
+TEST(ByteSource, AClosedStreamLeavesNoFileOpen)
+{
+    const TemporaryFile file("bytes");
+    writeBytes(file.path(), countedBytes(10));
+    const std::size_t before = openFileCount();
+    std::string error;
+    std::fclose(ByteSource::open(file.path(), error)->stream());
+    EXPECT_EQ(openFileCount(), before);
+}
+
 TEST(PcapFile, ReadsRecordsThatStraddleBlocks)
 {
     for (const std::size_t blockSize : {1U, 3U, 16U, 100U}) {
@@ -216,6 +276,19 @@ TEST_P(CompressedCapture, IsReadAsItWas)
     EXPECT_EQ(messages, (std::vector<Bytes>{{1, 2}, {}, {3, 4, 5}}));
     EXPECT_EQ(reader->error(), "");
     EXPECT_EQ(reader->technology()->name, "lte");
+}
+
+TEST_P(CompressedCapture, StreamsAsItWas)
+{
+    const Bytes bytes = countedBytes(200000);
+    const TemporaryFile file("compressed");
+    writeBytes(file.path(), compressed(GetParam(), bytes));
+    std::string error;
+    const auto source = ByteSource::open(file.path(), error);
+    ASSERT_TRUE(source) << error;
+    source->peek(100);
+    source->skip(30);
+    EXPECT_EQ(restOf(source->stream()), Bytes(bytes.begin() + 30, bytes.end()));
 }
 
 TEST_P(CompressedCapture, GivesWhatIsInFrontOfItsDamage)

@@ -42,7 +42,7 @@ void ShownFields::showIn(PlistDictionary& dictionary, std::size_t slot, const Fi
 {
     _memory.place(slot, start);
     if (_memory.shows(slot, field, raw, false))
-        return;
+        return _tables.noteWriter(slot);
     if (const auto& text = _texts.textOf(field, raw)) {
         _memory.keep(slot, field, _record, raw, false);
         valueOf(dictionary, slot, field.key).setText(*text);
@@ -54,7 +54,7 @@ void ShownFields::showNumber(PlistDictionary& dictionary, const Field& field, do
     const std::size_t slot = _memory.slotOf(field);
     const auto bits = std::bit_cast<std::int64_t>(number);
     if (_memory.shows(slot, field, bits, true))
-        return;
+        return _tables.noteWriter(slot);
     _memory.keep(slot, field, _record, bits, true);
     valueOf(dictionary, slot, field.key) = field.shown.textOfNumber(number);
 }

@@ -82,6 +82,17 @@ TEST_F(ShownFieldsTest, ATableThatOthersWereShownBesideShowsAgain)
     EXPECT_EQ(*dictionary.find("Level"), "2");
 }
 
+// The second table finds the first one's number there already, and has shown it nonetheless.
+TEST_F(ShownFieldsTest, TablesThatShareAFieldShowInTurn)
+{
+    const auto level = std::span(levels).last(1);
+    show(levels, {1, 2});
+    show(level, {1, 2});
+    show(levels, {1, 3});
+    show(level, {1, 2});
+    EXPECT_EQ(dictionary, (PlistDictionary{{"Cell", "1"}, {"Level", "2"}}));
+}
+
 TEST_F(ShownFieldsTest, ATableShowsAgainAfterASingleField)
 {
     show(levels, {1, 2});

@@ -37,11 +37,6 @@ std::shared_ptr<const PropertyListReading> PropertyListMemory::read(std::uint32_
     return reading;
 }
 
-LogPacket LogPacket::from(std::size_t offset) const
-{
-    return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));
-}
-
 void LogPacket::u32s(std::size_t offset, std::span<std::uint32_t> numbers) const
 {
     const std::size_t end = offset + numbers.size_bytes();

@@ -3,6 +3,7 @@
 #include "PropertyList/PlistValue.h"
 #include "PropertyList/PropertyListReader.h"
 
+#include <algorithm>
 #include <bit>
 #include <cstddef>
 #include <cstdint>
@@ -61,7 +62,10 @@ class LogPacket
     /// sections want the packet. They must leave its containers as they are.
     const PropertyListReading& propertyList() const;
     /// The packet from an offset on, as the place from which a repeated element counts.
-    LogPacket from(std::size_t offset) const;
+    LogPacket from(std::size_t offset) const
+    {
+        return LogPacket(_bytes.subspan(std::min(offset, _bytes.size())));
+    }
 
     std::uint8_t u8(std::size_t offset) const
     {

@@ -26,12 +26,6 @@ struct KeyHash {
     }
 };
 
-// Keys of one length mostly differ in their last character already.
-bool isSame(std::string_view a, std::string_view b)
-{
-    return a.size() == b.size() && (a.empty() || (a.back() == b.back() && a == b));
-}
-
 } // namespace
 
 std::string PlistInteger::decimal() const
@@ -142,7 +136,7 @@ struct PlistDictionary::Storage {
             return found == places.end() ? std::nullopt : std::optional(found->second);
         }
         for (std::size_t i = 0; i < entries.size(); ++i)
-            if (isSame(entries[i].key, key))
+            if (entries[i].isUnder(key))
                 return i;
         return std::nullopt;
     }
@@ -196,7 +190,7 @@ PlistValue* PlistDictionary::find(std::string_view key)
 PlistValue* PlistDictionary::find(std::string_view key, std::size_t& place)
 {
     const auto& entries = _storage->entries;
-    if (place >= entries.size() || !isSame(entries[place].key, key)) {
+    if (place >= entries.size() || !entries[place].isUnder(key)) {
         const auto found = _storage->place(key);
         if (!found)
             return nullptr;

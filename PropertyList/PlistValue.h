@@ -6,6 +6,7 @@
 #include <concepts>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <limits>
 #include <memory>
 #include <optional>
@@ -228,6 +229,14 @@ class PlistValue
 };
 
 struct PlistDictionary::Entry {
+    /// Keys of one length mostly differ in their last character already.
+    bool isUnder(std::string_view name) const
+    {
+        return key.size() == name.size() &&
+               (name.empty() || (key.back() == name.back() &&
+                                 std::memcmp(key.data(), name.data(), name.size()) == 0));
+    }
+
     std::string key;
     PlistValue value;
 };

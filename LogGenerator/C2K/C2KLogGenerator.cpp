@@ -83,7 +83,7 @@ void C2KLogGenerator::updateState(PlistDictionary& state, ByteView data)
     ensureDisplay(state);
     const PlistDictionary::Entry* entry = std::as_const(state).entryAt(_lookupPlace);
     const PlistValue* lookup =
-        entry && entry->key == StateKey::lookup ? &entry->value : state.find(StateKey::lookup);
+        entry && entry->isUnder(StateKey::lookup) ? &entry->value : state.find(StateKey::lookup);
     updateFromLog(data, lookup ? lookup->dictionary() : nullptr, state);
 }
 
@@ -154,7 +154,7 @@ std::optional<PlistValue> C2KLogGenerator::getDisplayFromState(PlistDictionary& 
 const PlistValue* C2KLogGenerator::ensureDisplay(PlistDictionary& state)
 {
     const PlistDictionary::Entry* entry = std::as_const(state).entryAt(_displayPlace);
-    if (entry && _display.refersTo(entry->value) && entry->key == StateKey::display)
+    if (entry && _display.refersTo(entry->value) && entry->isUnder(StateKey::display))
         return &entry->value;
     claimDisplay(state, templateName);
     if (const PlistValue* display = state.find(StateKey::display)) {

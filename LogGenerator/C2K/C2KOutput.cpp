@@ -35,7 +35,7 @@ void C2KOutput::publish(const Field& field, std::vector<ShownPilot> pilots,
 
 PlistDictionary* C2KOutput::extraInfo() const
 {
-    PlistValue* extraInfo = _state.find(StateKey::extraInfo);
+    PlistValue* extraInfo = _state.find(StateKey::extraInfo, _totals.extraInfo);
     return extraInfo ? extraInfo->dictionary() : nullptr;
 }
 

@@ -26,7 +26,9 @@ struct TotalPlaces {
     };
     Rate forward;
     Rate reverse;
-    std::size_t trafficFER = 0; // in the state
+    // In the state.
+    std::size_t trafficFER = 0;
+    std::size_t extraInfo = 0;
 };
 
 /// Where a decoder leaves what it found: the labels of the display; and the state dictionary, for

@@ -96,10 +96,14 @@ void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     if (packet.size() < base.minimumSize && !_table.decodesShortRecords)
         return;
     const ChosenLayout chosen = chooseLayout(base, known->layouts, packet);
-    known->last = {logCode, chosen.version, packet.size(), chosen.kind};
+    ReadLayout& last = known->last.emplace();
+    last.logCode = logCode;
+    last.version = chosen.version;
+    last.size = packet.size();
+    last.kind = chosen.kind;
     if (base.isExtension && chosen.kind == LayoutKind::NotKnown)
         return; // it has no base layout to fall back on
-    _lastRead = &*known->last;
+    _lastRead = &last;
     _current = chosen.record;
     const auto newer = std::ranges::find(known->newer, chosen.record, &ShownRecord::record);
     decode(newer == known->newer.end() ? known->shown : *newer, packet);

@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <charconv>
 #include <map>
+#include <utility>
 
 namespace ventrik
 {
@@ -93,8 +94,8 @@ std::optional<PlistValue> OrbelLogGenerator2::getDisplayFromState(PlistDictionar
 
 const PlistValue* OrbelLogGenerator2::ensureDisplay(PlistDictionary& state)
 {
-    const PlistDictionary::Entry* entry = state.entryAt(_displayPlace);
-    if (entry && _boundDisplay.refersTo(entry->value) && entry->key == StateKey::display)
+    const PlistDictionary::Entry* entry = std::as_const(state).entryAt(_displayPlace);
+    if (entry && _boundDisplay.refersTo(entry->value) && entry->isUnder(StateKey::display))
         return &entry->value;
     claimDisplay(state, displayOwner());
     const PlistValue* display = state.find(StateKey::display);

@@ -251,6 +251,17 @@ TEST(PlistDictionary, LeavesThePlaceOfAKeyThatItDoesNotHave)
     EXPECT_EQ(place, 1U);
 }
 
+TEST(PlistDictionary, AnEntryIsUnderItsWholeKeyOnly)
+{
+    const PlistDictionary dictionary{{"Level", 1}, {"", 2}};
+    const PlistDictionary::Entry& level = *dictionary.entryAt(0);
+    EXPECT_TRUE(level.isUnder("Level"));
+    for (const std::string_view other : {"Leve", "Levels", "Bevel", "LEVEL", ""})
+        EXPECT_FALSE(level.isUnder(other)) << other;
+    EXPECT_TRUE(dictionary.entryAt(1)->isUnder(""));
+    EXPECT_FALSE(dictionary.entryAt(1)->isUnder("x"));
+}
+
 TEST(PlistDictionary, HasNoEntryPastTheEnd)
 {
     PlistDictionary dictionary{{"a", 1}};

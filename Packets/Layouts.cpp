@@ -294,16 +294,16 @@ std::span<const Layout> layoutsOf(std::uint32_t logCode)
     return {first, last};
 }
 
-ChosenLayout chooseLayout(const Record& base, std::span<const Layout> layouts,
+ChosenLayout chooseLayout(const Record& base, std::span<const Layout> ofCode,
                           const LogPacket& packet)
 {
-    if (layouts.empty())
+    if (ofCode.empty())
         return {&base, LayoutKind::Base, versionOf(base, packet)};
-    const auto version = versionOf(*layouts.front().record, packet);
+    const auto version = versionOf(*ofCode.front().record, packet);
     const auto chosen = [&](const Record& record, LayoutKind kind) {
         return ChosenLayout{&record, kind, tellsVersion(record) ? version : std::nullopt};
     };
-    for (const Layout& layout : layouts)
+    for (const Layout& layout : ofCode)
         if (layout.isOf(packet, version)) {
             const bool isBase = layout.record == &base && !base.isExtension;
             return chosen(*layout.record, isBase ? LayoutKind::Base : LayoutKind::Newer);

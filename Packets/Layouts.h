@@ -61,7 +61,7 @@ struct ChosenLayout {
 };
 /// Of a code's layouts. All records of a code that tell a version tell it in one place. The packet
 /// is as long as the base record asks for.
-ChosenLayout chooseLayout(const Record& base, std::span<const Layout> layouts,
+ChosenLayout chooseLayout(const Record& base, std::span<const Layout> ofCode,
                           const LogPacket& packet);
 
 /// "base", "newer" or "not known".

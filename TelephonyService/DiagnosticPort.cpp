@@ -87,7 +87,7 @@ void DiagnosticPort::open()
     }
     _lastFault.clear();
     _log.warning("{} is open", _device);
-    _connection.emplace();
+    _connection = Connection{};
     updateMasks();
 }
 

@@ -26,6 +26,8 @@ class Scenario : public MessageSource
     /// The number of the step that is being reported, from 0.
     std::uint64_t step() const { return _step; }
 
+    using MessageSource::report; // which tells of the source
+
     /// Sends a packet at the time of this step; now and then one with the transport prefix.
     void report(PacketBuilder packet);
     void report(const RecordWriter& record);

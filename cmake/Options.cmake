@@ -4,9 +4,11 @@
 add_library(ventrik-options INTERFACE)
 target_include_directories(ventrik-options INTERFACE ${PROJECT_SOURCE_DIR})
 target_compile_options(ventrik-options INTERFACE
-  -Wall -Wextra -Wpedantic -Wshadow -Wconversion)
+  -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+  $<$<CXX_COMPILER_ID:Clang>:-Wno-sign-conversion>) # GCC's -Wconversion does not mean that
 
 if(VENTRIK_SANITIZE)
+  target_compile_definitions(ventrik-options INTERFACE VENTRIK_SANITIZED)
   target_compile_options(ventrik-options INTERFACE
     -fsanitize=address -fno-sanitize-recover=all -fno-omit-frame-pointer
     # Those checks count in what is tested; in the tests they take longest of all to compile.

@@ -57,7 +57,7 @@ void EventsModel::setEvents(const std::deque<Event>& events)
     endInsertRows();
 }
 
-const Event& EventsModel::event(int row) const
+const Event& EventsModel::eventAt(int row) const
 {
     return _events[_events.size() - 1 - static_cast<std::size_t>(row)];
 }
@@ -71,7 +71,7 @@ QVariant EventsModel::data(const QModelIndex& index, int role) const
 {
     if (!index.isValid())
         return {};
-    const Event& event = this->event(index.row());
+    const Event& event = eventAt(index.row());
     const QString kind = listText(nameOf(event.kind));
     switch (role) {
     case Qt::DisplayRole:

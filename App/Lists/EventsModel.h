@@ -16,7 +16,7 @@ class EventsModel : public QAbstractListModel
     using QAbstractListModel::QAbstractListModel;
 
     void setEvents(const std::deque<Event>& events);
-    const Event& event(int row) const;
+    const Event& eventAt(int row) const;
 
     int rowCount(const QModelIndex& parent = {}) const override;
     QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;

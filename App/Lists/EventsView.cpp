@@ -53,7 +53,7 @@ class EventLines : public QStyledItemDelegate
     void paint(QPainter* painter, const QStyleOptionViewItem& option,
                const QModelIndex& index) const override
     {
-        const Event& event = static_cast<const EventsModel*>(index.model())->event(index.row());
+        const Event& event = static_cast<const EventsModel*>(index.model())->eventAt(index.row());
         painter->save();
         drawListRow(*painter, option, listMargin);
         const QRect area = option.rect.adjusted(listMargin, 0, -listMargin, -1);
@@ -178,7 +178,7 @@ void EventsView::List::setMoment(std::optional<Clock::TimePoint> moment)
         return;
     _lines->setMoment(moment);
     int row = 0;
-    while (moment && row < _model.rowCount() - 1 && _model.event(row).time > *moment)
+    while (moment && row < _model.rowCount() - 1 && _model.eventAt(row).time > *moment)
         ++row;
     scrollTo(_model.index(row), moment ? EnsureVisible : PositionAtTop);
     viewport()->update();
@@ -248,7 +248,7 @@ QListView& EventsView::list() const
 void EventsView::open(int row) const
 {
     // The callback may bring other events.
-    const Event event = _model->event(row);
+    const Event event = _model->eventAt(row);
     if (_onEvent)
         _onEvent(event);
 }

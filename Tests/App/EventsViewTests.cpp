@@ -55,7 +55,7 @@ class EventsViewTest : public testing::Test
         QCoreApplication::processEvents();
     }
 
-    std::string textAt(int row) { return view.model().event(row).text; }
+    std::string textAt(int row) { return view.model().eventAt(row).text; }
     QPoint middleOf(int row) { return view.list().visualRect(view.model().index(row, 0)).center(); }
     /// The text of the row at the top, and how far of it is out of view.
     std::pair<std::string, int> atTop()
@@ -171,7 +171,7 @@ TEST_F(EventsViewTest, ShowsAnotherLogAnew)
 TEST_F(EventsViewTest, BringsIntoViewWhatHappenedUntilTheMomentThatIsShown)
 {
     goOn(60);
-    const auto moment = view.model().event(40).time + 500ms;
+    const auto moment = view.model().eventAt(40).time + 500ms;
     view.setMoment(moment);
     EXPECT_TRUE(view.list().viewport()->rect().contains(middleOf(40)));
     view.setMoment(std::nullopt);
@@ -181,7 +181,7 @@ TEST_F(EventsViewTest, BringsIntoViewWhatHappenedUntilTheMomentThatIsShown)
 TEST_F(EventsViewTest, WhatOneReadsStaysWhileTheMomentIsTheSame)
 {
     goOn(60);
-    const auto moment = view.model().event(40).time;
+    const auto moment = view.model().eventAt(40).time;
     view.setMoment(moment);
     view.list().scrollToTop();
     view.setMoment(moment);
@@ -202,9 +202,9 @@ TEST_F(EventsViewTest, WhatHappenedLaterIsFainter)
                 lightness = std::min(lightness, image.pixelColor(x, y).lightness());
         return lightness;
     };
-    view.setMoment(view.model().event(1).time);
+    view.setMoment(view.model().eventAt(1).time);
     EXPECT_GT(darkest(0), darkest(1) + 30);
-    view.setMoment(view.model().event(0).time);
+    view.setMoment(view.model().eventAt(0).time);
     EXPECT_EQ(darkest(0), darkest(1));
 }
 

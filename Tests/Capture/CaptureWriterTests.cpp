@@ -66,7 +66,7 @@ TEST_F(CaptureWriterTest, LeavesNoFileOpen)
 }
 
 // The sanitizers need descriptors of their own.
-#if !defined(__SANITIZE_ADDRESS__)
+#if !defined(VENTRIK_SANITIZED)
 TEST_F(CaptureWriterTest, FailsWithAReasonWhereNoMoreFilesMayBeOpen)
 {
     // One more is left: for the file that takes the name at the end.

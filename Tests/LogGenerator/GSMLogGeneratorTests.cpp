@@ -99,7 +99,7 @@ TEST_F(GSMLogGeneratorTest, AnArrayLosesItsFirstElement)
 TEST_F(GSMLogGeneratorTest, EveryArrayInsideLosesItsFirstElement)
 {
     EXPECT_EQ(processed(PlistArray{"x", PlistArray{"y", "a", "b"}}),
-              PlistValue(PlistArray{PlistArray{"a", "b"}}));
+              PlistValue(PlistArray{PlistValue(PlistArray{"a", "b"})}));
 }
 
 TEST_F(GSMLogGeneratorTest, TheFirstElementIsNotLookedAt)

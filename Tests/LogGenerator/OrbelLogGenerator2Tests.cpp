@@ -151,10 +151,10 @@ TEST_F(OrbelLogGenerator2Test, TheFirstGenerationWithoutAPacketReturnsNoneButFil
 TEST_F(OrbelLogGenerator2Test, AfterAPacketTheGenerationReturnsTheSameDisplayEachTime)
 {
     feed(PacketBuilder(0x1000).build());
-    const auto first = generator->generateLogUsingState(state);
-    const auto second = generator->generateLogUsingState(state);
-    ASSERT_TRUE(first && second);
-    EXPECT_TRUE(first->dictionary()->isSameContainer(*second->dictionary()));
+    const auto display = generator->generateLogUsingState(state);
+    const auto next = generator->generateLogUsingState(state);
+    ASSERT_TRUE(display && next);
+    EXPECT_TRUE(display->dictionary()->isSameContainer(*next->dictionary()));
 }
 
 TEST_F(OrbelLogGenerator2Test, DisplayStateHoldsThePacketsOfThePeriodAsReceived)

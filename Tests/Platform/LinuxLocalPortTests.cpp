@@ -407,7 +407,7 @@ TEST_F(LinuxLocalPortTest, RefusesAConnectionWhileNoOtherHasBeenIdleForLong)
 }
 
 // The sanitizers need descriptors of their own.
-#if !defined(__SANITIZE_ADDRESS__)
+#if !defined(VENTRIK_SANITIZED)
 TEST_F(LinuxLocalPortTest, SaysOnceThatItIsOutOfDescriptors)
 {
     const auto local = makePort();

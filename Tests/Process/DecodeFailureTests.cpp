@@ -27,17 +27,16 @@ class DecodeFailure : public DecodeFixture
                                       .record(captureStart, 1, antennaMessage(4));
         return Bytes(capture.bytes().begin(), capture.bytes().end() - 5);
     }
-    /// With the display templates that are shipped, and that much address space, in KiB.
-    Result decodeWithin(int limit, const Arguments& arguments) const
+    /// With the display templates that are shipped, and little address space.
+    Result decodeInLittleMemory(const Arguments& arguments) const
     {
+        constexpr int limit = 150'000; // KiB
         Arguments all{"-c", "ulimit -v \"$1\"; shift; exec \"$@\"", "sh", std::to_string(limit),
                       VENTRIK_PROGRAMS "/ventrik-decode"};
         all.insert(all.end(), arguments.begin(), arguments.end());
         Program program("/bin/sh", all, environment);
         return finish(program);
     }
-
-    static constexpr int addressSpace = 150'000;
 };
 
 } // namespace
@@ -168,14 +167,14 @@ TEST_F(DecodeFailure, OfATemplateThatIsMissingOrBrokenNamesIt)
 }
 
 // The sanitizers need more address space than any limit leaves.
-#if !defined(__SANITIZE_ADDRESS__)
+#if !defined(VENTRIK_SANITIZED)
 TEST_F(DecodeFailure, ForWantOfMemoryLeavesWhatWasDecodedBefore)
 {
     const PcapBytes capture = lteCapture()
                                   .record(captureStart, 0, antennaMessage(2))
                                   .record(captureStart, 1, pdpMessage(oneTextManyTimes()));
     const std::string file = writeFile("large.pcap", capture.bytes());
-    const Result result = decodeWithin(addressSpace, {file});
+    const Result result = decodeInLittleMemory({file});
     EXPECT_EQ(result.status, 1) << result.errors;
     EXPECT_THAT(result.complaints,
                 ElementsAre("ventrik-decode: " + file + ": message 1: out of memory"));
@@ -188,7 +187,7 @@ TEST_F(DecodeFailure, DoesNotComeOfALongNameOverManyValues)
     const PcapBytes capture =
         lteCapture().record(captureStart, 0, pdpMessage(longNameOverManyValues()));
     const std::string file = writeFile("long.pcap", capture.bytes());
-    const Result result = decodeWithin(addressSpace, {file});
+    const Result result = decodeInLittleMemory({file});
     EXPECT_EQ(result.status, 0) << result.errors;
     EXPECT_THAT(result.output, HasSubstr("49999: v\n"));
 }

@@ -15,10 +15,8 @@
 namespace ventrik
 {
 
-#if defined(__SANITIZE_ADDRESS__)
+#if defined(VENTRIK_SANITIZED)
 inline constexpr bool isSanitized = true;
-#elif defined(__has_feature)
-inline constexpr bool isSanitized = __has_feature(address_sanitizer);
 #else
 inline constexpr bool isSanitized = false;
 #endif

@@ -64,11 +64,11 @@ class LogChannelTest : public testing::Test
     struct PushedSource : MessageSource {
         explicit PushedSource(LogChannelTest& itsTest) : test(itsTest) {}
         ~PushedSource() override { test.receiver = {}; }
-        void start(const WantedCodes& wanted, Receiver receiver) override
+        void start(const WantedCodes& codes, Receiver itsReceiver) override
         {
             ++test.starts;
-            test.wanted = wanted;
-            test.receiver = std::move(receiver);
+            test.wanted = codes;
+            test.receiver = std::move(itsReceiver);
         }
         std::optional<TimedMessage> next() override { return std::nullopt; }
 

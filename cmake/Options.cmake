@@ -61,9 +61,9 @@ function(ventrik_test_options target)
   endif()
 endfunction()
 
-# ventrik_test(NAME [WAITING] LIBRARIES ... SOURCES ...): a GoogleTest program whose tests ctest knows
-# one by one; those of a WAITING one wait for other processes most of the time, and those that match
-# ALONE, a GoogleTest filter, are timed so closely that nothing runs beside them.
+# ventrik_test(NAME [WAITING] [ALONE FILTER] LIBRARIES ... SOURCES ...): a GoogleTest program whose
+# tests ctest knows one by one; those of a WAITING one wait for other processes most of the time, and
+# those that match ALONE, a GoogleTest filter, are timed so closely that nothing runs beside them.
 function(ventrik_test name)
   cmake_parse_arguments(ARG "WAITING" "ALONE" "LIBRARIES;SOURCES;PROPERTIES" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})

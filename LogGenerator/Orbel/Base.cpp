@@ -96,6 +96,7 @@ void Base::updateWithData(const LogPacket& packet, std::uint32_t logCode)
     if (packet.size() < base.minimumSize && !_table.decodesShortRecords)
         return;
     const ChosenLayout chosen = chooseLayout(base, known->layouts, packet);
+    // Number by number, as it was read: one block of them would wait until all have been written.
     ReadLayout& last = known->last.emplace();
     last.logCode = logCode;
     last.version = chosen.version;
